@@ -1,0 +1,32 @@
+# Shared by the scripts: install what is missing from Debian's packages, then configure and build.
+# Sourced, not run.
+
+QUILLMARK_ROOT="$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd)"
+
+# The packages every build needs; scripts add their own.
+QUILLMARK_PACKAGES=(cmake ninja-build g++ qt6-base-dev libcli11-dev nlohmann-json3-dev libgtest-dev libgmock-dev
+                    libgl-dev)
+
+ensure_packages() {
+    local missing=()
+    local package
+    for package in "$@"; do
+        dpkg-query -W -f='${Status}' "$package" 2>/dev/null | grep -q 'install ok installed' || missing+=("$package")
+    done
+    [ ${#missing[@]} -eq 0 ] && return 0
+    echo "Installing: ${missing[*]}" >&2
+    local sudo=""
+    [ "$(id -u)" -ne 0 ] && sudo="sudo"
+    $sudo apt-get update -qq
+    DEBIAN_FRONTEND=noninteractive $sudo apt-get install -y -qq --no-install-recommends "${missing[@]}" >&2
+}
+
+# configure_and_build BUILD_DIR [cmake options...]
+configure_and_build() {
+    local build_dir="$1"
+    shift
+    if [ ! -f "$build_dir/build.ninja" ]; then
+        cmake -S "$QUILLMARK_ROOT" -B "$build_dir" -G Ninja "$@" >&2
+    fi
+    cmake --build "$build_dir" >&2
+}

@@ -1,0 +1,36 @@
+#include "CliFiles.h"
+
+#include <algorithm>
+
+#include "ConsoleDialogs.h"
+#include "OpenDocument.h"
+#include "ParseProgress.h"
+#include "PartFile.h"
+#include "QmError.h"
+
+std::optional<HeaderData> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err)
+{
+    dialogs.setCurrentFile(path);
+    std::string content;
+    try {
+        content = ReadWholeFile(path);
+    } catch (const QmError& error) {
+        err << "quillmark-cli: cannot read " << path << ": " << error.description() << '\n';
+        return std::nullopt;
+    }
+    HeaderData header;
+    ParseProgress silent;
+    OpenPartFileContent(header, path, std::move(content), dialogs, silent);
+    return header;
+}
+
+int ForEachOpenedFile(const std::vector<std::string>& paths, ConsoleDialogs& dialogs, std::ostream& err,
+                      const std::function<int(HeaderData&)>& handle)
+{
+    int status = ExitStatus::Ok;
+    for (const auto& path : paths) {
+        auto header = OpenForCli(path, dialogs, err);
+        status = std::max(status, header ? handle(*header) : ExitStatus::Unreadable);
+    }
+    return status;
+}

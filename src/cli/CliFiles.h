@@ -1,0 +1,28 @@
+#pragma once
+
+#include <functional>
+#include <optional>
+#include <ostream>
+#include <string>
+#include <vector>
+
+#include "HeaderData.h"
+
+class ConsoleDialogs;
+
+// Exit statuses shared by the commands; a larger one wins when several apply.
+namespace ExitStatus {
+inline constexpr int Ok = 0;
+inline constexpr int Refused = 1;
+inline constexpr int Unreadable = 2;
+inline constexpr int SaveFailed = 3;
+} // namespace ExitStatus
+
+// Opens path as the Open command does. When the file cannot be read, says so in one line on
+// err and returns nullopt.
+std::optional<HeaderData> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err);
+
+// Runs handle on every file that opens and returns the worst status: Unreadable for a file that
+// did not open, otherwise the largest that handle returned.
+int ForEachOpenedFile(const std::vector<std::string>& paths, ConsoleDialogs& dialogs, std::ostream& err,
+                      const std::function<int(HeaderData&)>& handle);

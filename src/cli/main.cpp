@@ -1,0 +1,9 @@
+#include <iostream>
+
+#include "CliApp.h"
+
+int main(int argc, char** argv)
+{
+    std::ios::sync_with_stdio(false);
+    return RunCli(argc, argv, std::cout, std::cerr);
+}

@@ -1,0 +1,28 @@
+#include "ErrorReport.h"
+
+#include "Dialogs.h"
+
+namespace {
+
+const char* ownerWord(OwnerKind kind)
+{
+    switch (kind) {
+    case OwnerKind::Formular: return " of Formular ";
+    case OwnerKind::Modul: return " of Modul ";
+    case OwnerKind::Module: return " of Module ";
+    }
+    return " of Modul ";
+}
+
+} // namespace
+
+std::string ErrorReportText(const QmError& error, const Procedure& procedure)
+{
+    return "Error " + std::to_string(error.number()) + " (" + error.description() + ") in procedure " +
+           procedure.name + ownerWord(procedure.kind) + procedure.owner;
+}
+
+void ReportError(Dialogs& dialogs, const QmError& error, const Procedure& procedure)
+{
+    dialogs.message(StopBox(ErrorReportText(error, procedure)));
+}

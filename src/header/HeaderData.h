@@ -1,0 +1,44 @@
+#pragma once
+
+#include <string>
+#include <vector>
+
+// A list of header lines. The texts talk about entry 1 to count; the code indexes from 0.
+using StringList = std::vector<std::string>;
+
+// How the window shows the file's bytes: a file whose bytes are valid UTF-8 is edited as
+// UTF-8, any other as ISO-8859-1. The core itself only ever handles bytes.
+enum class TextEncoding { Latin1, Utf8 };
+
+// The one record of the open part file, with its document flags.
+struct HeaderData {
+    std::string FilePath;
+    std::string PartName;
+    std::string FileFolder;
+    std::string PartDescription;
+    bool NeedsWork = false;
+    std::string ParsedRealName;
+    std::string AuthorRealName;
+    std::string AuthorUserName;
+    std::string PartType;
+    std::string UpdateTag;
+    std::string License;
+    std::string Bfc;
+    std::string Category;
+    StringList Keywords;
+    StringList History;
+    StringList Comments;
+    StringList HelpLines;
+    StringList CmdLines;
+    StringList ColorLines;
+    std::string OldHeader;
+    std::string Body;
+    TextEncoding Encoding = TextEncoding::Utf8;
+
+    bool FileChanged = false;
+    bool FileLoaded = false;
+    bool Loading = false;
+};
+
+// Empties the record at the start of an open; the document flags are the caller's.
+void ResetHeaderRecord(HeaderData& header);

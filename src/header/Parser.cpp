@@ -1,0 +1,308 @@
+#include "Parser.h"
+
+#include <array>
+#include <new>
+#include <vector>
+
+#include "Dates.h"
+#include "Dialogs.h"
+#include "ErrorReport.h"
+#include "LineEnds.h"
+#include "LineReader.h"
+#include "ParseProgress.h"
+#include "PartFile.h"
+#include "Text.h"
+#include "Words.h"
+
+namespace {
+
+const Procedure IsUnixLineEndProcedure{"IsUnixLineEnd", OwnerKind::Modul, "modUNIX"};
+const Procedure GetGlobalContentProcedure{"GetGlobalContent", OwnerKind::Modul, "modQuillmark"};
+
+// The keywords of the header lines the parser knows; a two-word line with one of these carries
+// nothing and is dropped.
+constexpr std::array<std::string_view, 23> KnownKeywords = {
+    "Name:", "Author:", "CATEGORY", "!CATEGORY", "BFC", "COLOR", "Unofficial", "unofficial",
+    "UNOFFICIAL", "Original", "original", "!LDRAW_ORG", "LDRAW_ORG", "!LDRAW", "!CMDLINE",
+    "CMDLINE", "!KEYWORDS", "KEYWORDS", "!HELP", "!LICENSE", "HISTORY", "!HISTORY", "//"};
+
+template <std::size_t N>
+bool isOneOf(std::string_view word, const std::array<std::string_view, N>& forms)
+{
+    for (const auto form : forms)
+        if (word == form)
+            return true;
+    return false;
+}
+
+bool isOneOf(std::string_view word, std::initializer_list<std::string_view> forms)
+{
+    for (const auto form : forms)
+        if (word == form)
+            return true;
+    return false;
+}
+
+void appendLine(std::string& text, std::string_view line)
+{
+    if (!text.empty())
+        text += CrLf;
+    text += line;
+}
+
+class HeaderParser {
+public:
+    explicit HeaderParser(HeaderData& header) : h_(header) {}
+
+    void classify(std::string_view line, std::size_t lineNumber);
+
+private:
+    void toBody(std::string_view line) { appendLine(h_.Body, TrimBlanks(line)); }
+    void endHeader(std::string_view line)
+    {
+        headerEnded_ = true;
+        toBody(line);
+    }
+    std::string_view word(std::size_t position) const { return words_[position - 1]; }
+    std::size_t wordCount() const { return words_.size(); }
+    std::string joinedFrom(std::size_t k) const { return JoinWordsFrom(words_, k); }
+
+    void takeDescription(std::string_view line);
+    void takeKeywordLine(std::string_view line);
+    void takeAuthor();
+    void takeBfc(std::string_view line);
+    void takePartType();
+    void takeComment();
+    void takeDatedOrBody(std::string_view line);
+
+    HeaderData& h_;
+    bool headerEnded_ = false;
+    std::vector<std::string_view> words_;
+};
+
+void HeaderParser::classify(std::string_view line, std::size_t lineNumber)
+{
+    if (headerEnded_) {
+        toBody(line);
+        return;
+    }
+    if (line.empty())
+        return;
+    SplitWords(line, words_);
+    if (word(1) != "0") {
+        endHeader(line);
+        return;
+    }
+    appendLine(h_.OldHeader, line);
+    if (lineNumber == 1) {
+        takeDescription(line);
+        return;
+    }
+    if (wordCount() >= 3)
+        takeKeywordLine(line);
+    else if (wordCount() == 2 && !word(2).empty() && !isOneOf(word(2), KnownKeywords))
+        takeDatedOrBody(line);
+}
+
+void HeaderParser::takeDescription(std::string_view line)
+{
+    const auto trimmed = TrimBlanks(line);
+    h_.PartDescription = trimmed.size() < 3 ? std::string() : std::string(trimmed.substr(2));
+    h_.NeedsWork = ContainsIgnoreCase(h_.PartDescription, "need") && ContainsIgnoreCase(h_.PartDescription, "work");
+}
+
+void HeaderParser::takeKeywordLine(std::string_view line)
+{
+    const auto keyword = word(2);
+    if (keyword == "Name:")
+        h_.PartName = ToLowerAscii(word(3));
+    else if (keyword == "Author:")
+        takeAuthor();
+    else if (isOneOf(keyword, {"CATEGORY", "!CATEGORY"}))
+        h_.Category = joinedFrom(3);
+    else if (keyword == "BFC")
+        takeBfc(line);
+    else if (keyword == "COLOR")
+        h_.ColorLines.emplace_back(line);
+    else if (isOneOf(keyword, {"Unofficial", "unofficial", "UNOFFICIAL"})) {
+        if (isOneOf(word(3), {"Part", "Model", "part", "model", "element", "Element", "ELEMENT"}))
+            h_.PartType = "Unofficial_Part";
+        else if (isOneOf(word(3), {"Subpart", "subpart", "SUBPART"}))
+            h_.PartType = "Unofficial_Subpart";
+    } else if (isOneOf(keyword, {"Original", "original"})) {
+        if (wordCount() >= 4 && isOneOf(word(3), {"LDRAW", "LDraw"}) && isOneOf(word(4), {"Part", "part"}))
+            h_.PartType = "Part";
+    } else if (isOneOf(keyword, {"!LDRAW_ORG", "LDRAW_ORG", "!LDRAW"}))
+        takePartType();
+    else if (isOneOf(keyword, {"!CMDLINE", "CMDLINE"}))
+        h_.CmdLines.push_back(joinedFrom(3));
+    else if (isOneOf(keyword, {"!KEYWORDS", "KEYWORDS"}))
+        h_.Keywords.push_back(joinedFrom(3));
+    else if (keyword == "!HELP")
+        h_.HelpLines.push_back(joinedFrom(3));
+    else if (keyword == "!LICENSE")
+        h_.License = joinedFrom(3);
+    else if (isOneOf(keyword, {"HISTORY", "!HISTORY"}))
+        h_.History.push_back(joinedFrom(3));
+    else if (keyword == "//")
+        takeComment();
+    else
+        takeDatedOrBody(line);
+}
+
+// "0 Author: Jane Doe [jdoe]": the words up to the bracketed user name are the real name.
+void HeaderParser::takeAuthor()
+{
+    h_.ParsedRealName.clear();
+    for (std::size_t position = 3; position <= wordCount(); ++position) {
+        const auto current = word(position);
+        if (h_.ParsedRealName.empty()) {
+            h_.ParsedRealName = current;
+            continue;
+        }
+        if (!current.empty() && (current[0] == '[' || current[0] == '<' || current[0] == '('))
+            h_.AuthorUserName = current.size() < 3 ? std::string() : std::string(current.substr(1, current.size() - 2));
+        else
+            h_.ParsedRealName.append(" ").append(current);
+        const auto at = h_.AuthorUserName.find('@');
+        if (at != std::string::npos)
+            h_.AuthorUserName.resize(at);
+    }
+}
+
+void HeaderParser::takeBfc(std::string_view line)
+{
+    if (word(3) == "INVERTNEXT") {
+        endHeader(line);
+        return;
+    }
+    if (word(3) == "CERTIFY") {
+        if (wordCount() == 3)
+            return;
+        if (word(4) == "INVERTNEXT") {
+            endHeader(line);
+            return;
+        }
+    }
+    h_.Bfc = joinedFrom(3);
+}
+
+// "0 !LDRAW_ORG Part UPDATE 2004-01": the words before "UPDATE" are the type, the next the tag.
+void HeaderParser::takePartType()
+{
+    h_.PartType.clear();
+    for (std::size_t position = 3; position <= wordCount(); ++position) {
+        const auto current = word(position);
+        if (h_.PartType.empty()) {
+            h_.PartType = current;
+        } else if (current == "UPDATE") {
+            if (position < wordCount())
+                h_.UpdateTag = word(position + 1);
+            return;
+        } else {
+            h_.PartType.append(" ").append(current);
+        }
+    }
+}
+
+void HeaderParser::takeComment()
+{
+    if (const auto date = DateOfWord(word(3)))
+        h_.History.push_back(*date + " " + joinedFrom(4));
+    else
+        h_.Comments.push_back(joinedFrom(2));
+}
+
+// An old history line without keyword ("0 2004-03-12 [jdoe] fixed"), or a meta line the header
+// does not know, which stays in the body while the header goes on.
+void HeaderParser::takeDatedOrBody(std::string_view line)
+{
+    if (const auto date = DateOfWord(word(2)))
+        h_.History.push_back(*date + " " + joinedFrom(3));
+    else
+        toBody(line);
+}
+
+void clearParsedContent(HeaderData& header)
+{
+    header.OldHeader.clear();
+    header.Body.clear();
+    header.HelpLines.clear();
+    header.CmdLines.clear();
+    header.Keywords.clear();
+    header.Comments.clear();
+    header.History.clear();
+    header.ColorLines.clear();
+}
+
+class BusyPointer {
+public:
+    explicit BusyPointer(ParseProgress& progress) : progress_(progress) { progress_.setBusy(true); }
+    ~BusyPointer() { progress_.setBusy(false); }
+    BusyPointer(const BusyPointer&) = delete;
+    BusyPointer& operator=(const BusyPointer&) = delete;
+
+private:
+    ParseProgress& progress_;
+};
+
+} // namespace
+
+std::string ProgressCaption(std::size_t linesRead)
+{
+    return "Parsing file. Line " + std::to_string(linesRead) + ". Please wait...";
+}
+
+void ParseHeaderText(HeaderData& header, std::string_view text, ParseProgress& progress)
+{
+    clearParsedContent(header);
+    header.Encoding = EncodingOf(text);
+    BusyPointer busy(progress);
+    HeaderParser parser(header);
+    LineReader reader(text);
+    std::size_t linesRead = 0;
+    while (!reader.atEnd()) {
+        if (linesRead % 10 == 0) {
+            progress.lineProgress(linesRead);
+            progress.processEvents();
+        }
+        const auto line = reader.nextLine();
+        ++linesRead;
+        parser.classify(line, linesRead);
+    }
+}
+
+void ParsePartFileContent(HeaderData& header, std::string content, Dialogs& dialogs, ParseProgress& progress)
+{
+    if (content.empty())
+        ReportError(dialogs, InputPastEndOfFileError(), IsUnixLineEndProcedure);
+    if (IsUnixLineEnd(content)) {
+        content = LfToCrLf(content);
+        content += CrLf;
+    }
+    ParseHeaderText(header, content, progress);
+}
+
+void GetGlobalContent(HeaderData& header, Dialogs& dialogs, ParseProgress& progress)
+{
+    if (header.FilePath.empty())
+        return;
+    progress.processEvents();
+    std::string content;
+    try {
+        content = ReadWholeFile(header.FilePath);
+    } catch (const QmError& error) {
+        ReportError(dialogs, error, IsUnixLineEndProcedure);
+        const bool missing = error.number() == ErrorNumber::FileNotFound || error.number() == ErrorNumber::PathNotFound;
+        if (missing)
+            dialogs.message({"File " + header.FilePath + " not found!", "Error", Buttons::Ok, Icon::Exclamation, Answer::Ok});
+        else
+            ReportError(dialogs, error, GetGlobalContentProcedure);
+        return;
+    }
+    try {
+        ParsePartFileContent(header, std::move(content), dialogs, progress);
+    } catch (const std::bad_alloc&) {
+        ReportError(dialogs, QmError(7, "Out of memory"), GetGlobalContentProcedure);
+    }
+}

@@ -1,0 +1,50 @@
+#include "QmError.h"
+
+#include <cerrno>
+#include <sys/stat.h>
+
+namespace {
+
+bool folderOfPathExists(const std::string& path)
+{
+    const auto slash = path.rfind('/');
+    const std::string folder = slash == std::string::npos ? "." : (slash == 0 ? "/" : path.substr(0, slash));
+    struct stat info {};
+    return ::stat(folder.c_str(), &info) == 0 && S_ISDIR(info.st_mode);
+}
+
+} // namespace
+
+QmError::QmError(int number, std::string description)
+    : std::runtime_error(description), number_(number), description_(std::move(description))
+{
+}
+
+QmError InvalidCallError() { return {ErrorNumber::InvalidCall, "Invalid procedure call or argument"}; }
+
+QmError InputPastEndOfFileError() { return {ErrorNumber::InputPastEndOfFile, "Input past end of file"}; }
+
+QmError OsError(int errnoValue, const std::string& path)
+{
+    switch (errnoValue) {
+    case ENOENT:
+        if (folderOfPathExists(path))
+            return {ErrorNumber::FileNotFound, "File not found"};
+        return {ErrorNumber::PathNotFound, "Path not found"};
+    case ENOTDIR:
+        return {ErrorNumber::PathNotFound, "Path not found"};
+    case EEXIST:
+        return {ErrorNumber::FileAlreadyExists, "File already exists"};
+    case EACCES:
+    case EPERM:
+    case EROFS:
+        return {ErrorNumber::PermissionDenied, "Permission denied"};
+    case ENOSPC:
+    case EDQUOT:
+        return {ErrorNumber::DiskFull, "Disk full"};
+    case EIO:
+        return {ErrorNumber::DeviceIoError, "Device I/O error"};
+    default:
+        return {ErrorNumber::PathFileAccessError, "Path/File access error"};
+    }
+}

@@ -1,0 +1,36 @@
+#pragma once
+
+#include <stdexcept>
+#include <string>
+
+// A failure with the classic error number and description that the error reports show.
+class QmError : public std::runtime_error {
+public:
+    QmError(int number, std::string description);
+
+    int number() const { return number_; }
+    const std::string& description() const { return description_; }
+
+private:
+    int number_;
+    std::string description_;
+};
+
+namespace ErrorNumber {
+inline constexpr int InvalidCall = 5;
+inline constexpr int SubscriptOutOfRange = 9;
+inline constexpr int FileNotFound = 53;
+inline constexpr int DeviceIoError = 57;
+inline constexpr int FileAlreadyExists = 58;
+inline constexpr int DiskFull = 61;
+inline constexpr int InputPastEndOfFile = 62;
+inline constexpr int PermissionDenied = 70;
+inline constexpr int PathFileAccessError = 75;
+inline constexpr int PathNotFound = 76;
+} // namespace ErrorNumber
+
+QmError InvalidCallError();
+QmError InputPastEndOfFileError();
+
+// Maps an OS error (errno) met while working on path to the classic number and description.
+QmError OsError(int errnoValue, const std::string& path);

@@ -1,0 +1,124 @@
+#include "Text.h"
+
+#include <algorithm>
+
+namespace {
+
+char lowerAscii(char c) { return (c >= 'A' && c <= 'Z') ? static_cast<char>(c - 'A' + 'a') : c; }
+char upperAscii(char c) { return (c >= 'a' && c <= 'z') ? static_cast<char>(c - 'a' + 'A') : c; }
+
+bool equalIgnoreCaseAt(std::string_view text, std::size_t pos, std::string_view needle)
+{
+    for (std::size_t i = 0; i < needle.size(); ++i)
+        if (lowerAscii(text[pos + i]) != lowerAscii(needle[i]))
+            return false;
+    return true;
+}
+
+// Length of the UTF-8 sequence starting at s[i], or 0 when it is not a valid one.
+std::size_t utf8SequenceLength(std::string_view s, std::size_t i)
+{
+    const auto lead = static_cast<unsigned char>(s[i]);
+    if (lead < 0x80)
+        return 1;
+    std::size_t length = 0;
+    unsigned min = 0;
+    unsigned codePoint = 0;
+    if ((lead & 0xE0) == 0xC0) { length = 2; min = 0x80; codePoint = lead & 0x1F; }
+    else if ((lead & 0xF0) == 0xE0) { length = 3; min = 0x800; codePoint = lead & 0x0F; }
+    else if ((lead & 0xF8) == 0xF0) { length = 4; min = 0x10000; codePoint = lead & 0x07; }
+    else return 0;
+    if (i + length > s.size())
+        return 0;
+    for (std::size_t k = 1; k < length; ++k) {
+        const auto next = static_cast<unsigned char>(s[i + k]);
+        if ((next & 0xC0) != 0x80)
+            return 0;
+        codePoint = (codePoint << 6) | (next & 0x3F);
+    }
+    const bool surrogate = codePoint >= 0xD800 && codePoint <= 0xDFFF;
+    if (codePoint < min || codePoint > 0x10FFFF || surrogate)
+        return 0;
+    return length;
+}
+
+} // namespace
+
+std::string_view TrimBlanks(std::string_view text)
+{
+    const auto first = text.find_first_not_of(' ');
+    if (first == std::string_view::npos)
+        return {};
+    const auto last = text.find_last_not_of(' ');
+    return text.substr(first, last - first + 1);
+}
+
+std::string ToLowerAscii(std::string_view text)
+{
+    std::string result(text);
+    std::transform(result.begin(), result.end(), result.begin(), lowerAscii);
+    return result;
+}
+
+std::string ToUpperAscii(std::string_view text)
+{
+    std::string result(text);
+    std::transform(result.begin(), result.end(), result.begin(), upperAscii);
+    return result;
+}
+
+std::size_t FindIgnoreCase(std::string_view text, std::string_view needle, std::size_t from)
+{
+    if (needle.size() > text.size())
+        return std::string_view::npos;
+    for (std::size_t pos = from; pos + needle.size() <= text.size(); ++pos)
+        if (equalIgnoreCaseAt(text, pos, needle))
+            return pos;
+    return std::string_view::npos;
+}
+
+bool ContainsIgnoreCase(std::string_view text, std::string_view needle)
+{
+    return FindIgnoreCase(text, needle) != std::string_view::npos;
+}
+
+bool IsValidUtf8(std::string_view bytes)
+{
+    for (std::size_t i = 0; i < bytes.size();) {
+        const auto length = utf8SequenceLength(bytes, i);
+        if (length == 0)
+            return false;
+        i += length;
+    }
+    return true;
+}
+
+TextEncoding EncodingOf(std::string_view bytes)
+{
+    return IsValidUtf8(bytes) ? TextEncoding::Utf8 : TextEncoding::Latin1;
+}
+
+std::size_t CharacterCount(std::string_view text, TextEncoding encoding)
+{
+    if (encoding == TextEncoding::Latin1 || !IsValidUtf8(text))
+        return text.size();
+    return static_cast<std::size_t>(std::count_if(text.begin(), text.end(), [](char c) {
+        return (static_cast<unsigned char>(c) & 0xC0) != 0x80;
+    }));
+}
+
+std::string Latin1ToUtf8(std::string_view bytes)
+{
+    std::string result;
+    result.reserve(bytes.size());
+    for (const char c : bytes) {
+        const auto code = static_cast<unsigned char>(c);
+        if (code < 0x80) {
+            result += c;
+        } else {
+            result += static_cast<char>(0xC0 | (code >> 6));
+            result += static_cast<char>(0x80 | (code & 0x3F));
+        }
+    }
+    return result;
+}

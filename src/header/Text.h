@@ -1,0 +1,29 @@
+#pragma once
+
+#include <cstddef>
+#include <string>
+#include <string_view>
+
+#include "HeaderData.h"
+
+// Text is bytes: "blank" is the space character alone, and case changes touch ASCII letters only.
+
+inline constexpr std::string_view CrLf = "\r\n";
+
+std::string_view TrimBlanks(std::string_view text);
+std::string ToLowerAscii(std::string_view text);
+std::string ToUpperAscii(std::string_view text);
+
+// Position of the first occurrence of needle at or after from, comparing ASCII letters
+// without regard to case; npos when there is none.
+std::size_t FindIgnoreCase(std::string_view text, std::string_view needle, std::size_t from = 0);
+bool ContainsIgnoreCase(std::string_view text, std::string_view needle);
+
+bool IsValidUtf8(std::string_view bytes);
+TextEncoding EncodingOf(std::string_view bytes);
+
+// The number of characters the window shows for text: code points in UTF-8, else bytes.
+std::size_t CharacterCount(std::string_view text, TextEncoding encoding);
+
+// Each byte as the ISO-8859-1 character of that code, encoded as UTF-8.
+std::string Latin1ToUtf8(std::string_view bytes);

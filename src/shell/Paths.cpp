@@ -1,0 +1,30 @@
+#include "Paths.h"
+
+#include "ErrorReport.h"
+#include "SplitText.h"
+#include "Text.h"
+
+std::string DateiNurName(const std::string& path, Dialogs& dialogs)
+{
+    const auto pieces = SplitText(TrimBlanks(path), "/");
+    if (pieces.empty()) {
+        ReportError(dialogs, QmError(ErrorNumber::SubscriptOutOfRange, "Subscript out of range"),
+                    {"DateiNurName", OwnerKind::Modul, "modFunctions"});
+        return {};
+    }
+    return pieces.back();
+}
+
+std::string DateiNurPfad(const std::string& path)
+{
+    const auto pieces = SplitText(TrimBlanks(path), "/");
+    std::string folder;
+    for (std::size_t i = 0; i + 1 < pieces.size(); ++i) {
+        if (i > 0)
+            folder += '/';
+        folder += pieces[i];
+    }
+    if (folder.empty() && pieces.size() > 1)
+        return "/";
+    return folder;
+}

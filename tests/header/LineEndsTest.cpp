@@ -1,0 +1,153 @@
+#include <gtest/gtest.h>
+
+#include <sys/stat.h>
+
+#include "LineEnds.h"
+#include "LineReader.h"
+#include "ParseProgress.h"
+#include "Parser.h"
+#include "ScriptedDialogs.h"
+#include "TempDir.h"
+
+namespace {
+
+std::vector<std::string> readLines(std::string_view text)
+{
+    std::vector<std::string> lines;
+    LineReader reader(text);
+    while (!reader.atEnd())
+        lines.emplace_back(reader.nextLine());
+    return lines;
+}
+
+using Lines = std::vector<std::string>;
+
+TEST(LineReader, EndsLinesAtCrLfAndLoneCrOnly)
+{
+    EXPECT_EQ(readLines("a\r\nb\rc"), (Lines{"a", "b", "c"}));
+    EXPECT_EQ(readLines("a\nb\r\n"), (Lines{"a\nb"}));
+    EXPECT_EQ(readLines("a\r\n\r\n"), (Lines{"a", ""}));
+    EXPECT_EQ(readLines("a\r\r\n"), (Lines{"a", ""}));
+    EXPECT_EQ(readLines(""), Lines{});
+    EXPECT_EQ(readLines("\r\n"), (Lines{""}));
+    EXPECT_EQ(readLines(std::string("a\0b\r\n", 5)), (Lines{std::string("a\0b", 3)}));
+}
+
+TEST(LineEnds, UnixFileIsRecognisedByItsFirstLine)
+{
+    EXPECT_TRUE(IsUnixLineEnd("0 a\n0 b\n"));
+    EXPECT_FALSE(IsUnixLineEnd("0 a\r\n0 b\n"));
+    EXPECT_TRUE(IsUnixLineEnd("0 a\n0 b\r\n"));
+    EXPECT_FALSE(IsUnixLineEnd("0 a"));
+    EXPECT_FALSE(IsUnixLineEnd(""));
+}
+
+TEST(LineEnds, LfToCrLfLeavesExistingCrLfAlone)
+{
+    EXPECT_EQ(LfToCrLf("a\nb\r\nc\n"), "a\r\nb\r\nc\r\n");
+    EXPECT_EQ(LfToCrLf("\n\n"), "\r\n\r\n");
+    EXPECT_EQ(LfToCrLf("a\rb"), "a\rb");
+}
+
+TEST(ReplaceText, ReplacesLeftToRightWithoutOverlap)
+{
+    EXPECT_EQ(ReplaceText("abc", "", "x", 1, 10, false), "abc");
+    EXPECT_EQ(ReplaceText("xABy", "ab", "x", 1, 10, true), "xxy");
+    EXPECT_EQ(ReplaceText("xABy", "ab", "x", 1, 10, false), "xABy");
+    EXPECT_EQ(ReplaceText("aaaa", "aa", "b", 1, 10, false), "bb");
+    EXPECT_EQ(ReplaceText("aaa", "a", "aa", 1, 10, false), "aaaaaa");
+    EXPECT_EQ(ReplaceText("a-a-a", "a", "b", 2, 10, false), "a-b-b");
+    EXPECT_EQ(ReplaceText("a-a-a", "a", "b", 1, 2, false), "b-b-a");
+    EXPECT_EQ(ReplaceAll("0 WRITE Hello 10 WRITE", "0 WRITE", "0"), "0 Hello 10");
+}
+
+class PartFileParse : public ::testing::Test {
+protected:
+    HeaderData open(const std::string& bytes)
+    {
+        header.FilePath = dir.write("part.dat", bytes);
+        GetGlobalContent(header, dialogs, progress);
+        return header;
+    }
+    TempDir dir;
+    HeaderData header;
+    ScriptedDialogs dialogs;
+    ParseProgress progress;
+};
+
+TEST_F(PartFileParse, LfOnlyFileIsConvertedInMemoryOnly)
+{
+    const std::string bytes = "0 Brick\n0 Name: a.dat\n";
+    const auto h = open(bytes);
+    EXPECT_EQ(h.OldHeader, "0 Brick\r\n0 Name: a.dat");
+    EXPECT_EQ(h.PartName, "a.dat");
+    EXPECT_EQ(ReadBytes(header.FilePath), bytes);
+}
+
+TEST_F(PartFileParse, ReadOnlyLfOnlyFileOpens)
+{
+    header.FilePath = dir.write("ro.dat", "0 Brick\n0 Name: ro.dat\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat\n");
+    ::chmod(header.FilePath.c_str(), 0444);
+    GetGlobalContent(header, dialogs, progress);
+    EXPECT_EQ(header.PartDescription, "Brick");
+    // The conversion appends one CR LF, which reads as one more empty line at the end.
+    EXPECT_EQ(header.Body, "1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat\r\n");
+}
+
+TEST_F(PartFileParse, MixedFileWithCrLfFirstLineKeepsLoneLfInsideLines)
+{
+    const auto h = open("0 Brick\r\n0 // Inner\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat\r\n");
+    EXPECT_EQ(h.Comments, (StringList{"// Inner\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat"}));
+}
+
+TEST_F(PartFileParse, MixedFileWithLfFirstLineIsConvertedWithoutExtraLines)
+{
+    const auto h = open("0 Brick\n0 Name: a.dat\r\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat\r\n2 24 0 0 0 1 1 1\n");
+    EXPECT_EQ(h.Body, "1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat\r\n2 24 0 0 0 1 1 1\r\n");
+}
+
+TEST_F(PartFileParse, NoFinalLineEndAndLoneCr)
+{
+    EXPECT_EQ(open("0 Brick\r0 Name: b.dat\r1 x").Body, "1 x");
+    EXPECT_EQ(header.PartName, "b.dat");
+}
+
+TEST_F(PartFileParse, EmptyFileGivesEmptyRecordAndTheLineEndCheckReport)
+{
+    dialogs.expectMessage(Answer::Ok);
+    const auto h = open("");
+    EXPECT_EQ(h.OldHeader, "");
+    ASSERT_EQ(dialogs.messages.size(), 1u);
+    EXPECT_EQ(dialogs.messages[0].text, "Error 62 (Input past end of file) in procedure IsUnixLineEnd of Modul modUNIX");
+}
+
+TEST_F(PartFileParse, FileOfLineEndsOnly)
+{
+    auto h = open("\r\n\r\n\r");
+    EXPECT_EQ(h.PartDescription, "");
+    EXPECT_EQ(h.Body, "");
+    h = open("\n\n");
+    EXPECT_EQ(h.OldHeader, "");
+    EXPECT_EQ(h.Body, "");
+}
+
+TEST_F(PartFileParse, MissingFileIsReportedTwice)
+{
+    header.FilePath = dir.file("missing.dat");
+    dialogs.expectMessage(Answer::Ok);
+    dialogs.expectMessage(Answer::Ok);
+    GetGlobalContent(header, dialogs, progress);
+    ASSERT_EQ(dialogs.messages.size(), 2u);
+    EXPECT_EQ(dialogs.messages[0].text, "Error 53 (File not found) in procedure IsUnixLineEnd of Modul modUNIX");
+    EXPECT_EQ(dialogs.messages[1].text, "File " + header.FilePath + " not found!");
+    EXPECT_EQ(dialogs.messages[1].title, "Error");
+    EXPECT_EQ(dialogs.messages[1].icon, Icon::Exclamation);
+}
+
+TEST_F(PartFileParse, EmptyPathDoesNothing)
+{
+    GetGlobalContent(header, dialogs, progress);
+    EXPECT_TRUE(dialogs.messages.empty());
+}
+
+} // namespace

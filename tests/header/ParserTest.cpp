@@ -1,0 +1,236 @@
+#include <gtest/gtest.h>
+
+#include "ParseProgress.h"
+#include "Parser.h"
+#include "ScriptedDialogs.h"
+
+namespace {
+
+// Parses lines joined by CR LF, as a CR LF part file holds them.
+HeaderData parseLines(std::initializer_list<std::string> lines)
+{
+    std::string text;
+    for (const auto& line : lines)
+        text += line + "\r\n";
+    HeaderData header;
+    ScriptedDialogs dialogs;
+    ParseProgress progress;
+    ParsePartFileContent(header, text, dialogs, progress);
+    return header;
+}
+
+TEST(ParserDescription, FirstLineWithoutItsZeroIsTheDescription)
+{
+    EXPECT_EQ(parseLines({"0 Brick 2 x 4"}).PartDescription, "Brick 2 x 4");
+    EXPECT_EQ(parseLines({"0  Brick"}).PartDescription, " Brick");
+    EXPECT_EQ(parseLines({"0"}).PartDescription, "");
+    EXPECT_EQ(parseLines({"0 "}).PartDescription, "");
+    EXPECT_EQ(parseLines({"0 Name: 3001.dat"}).PartDescription, "Name: 3001.dat");
+}
+
+TEST(ParserDescription, EmptyFirstLineMeansNoDescription)
+{
+    const auto h = parseLines({"", "0 Brick 2 x 4"});
+    EXPECT_EQ(h.PartDescription, "");
+    EXPECT_EQ(h.Body, "0 Brick 2 x 4");
+}
+
+TEST(ParserDescription, NeedsWorkInAnyCaseAndOrder)
+{
+    EXPECT_TRUE(parseLines({"0 Brick (Needs Work)"}).NeedsWork);
+    EXPECT_TRUE(parseLines({"0 Brick needswork"}).NeedsWork);
+    EXPECT_TRUE(parseLines({"0 Brick work needed"}).NeedsWork);
+    EXPECT_FALSE(parseLines({"0 Brick needs care"}).NeedsWork);
+    EXPECT_FALSE(parseLines({"1 16 0 0 0 1 0 0 0 1 0 0 0 1 needs work.dat"}).NeedsWork);
+}
+
+TEST(ParserRows, NameIsWordThreeLowerCased)
+{
+    EXPECT_EQ(parseLines({"0 d", "0 Name: 3001.DAT"}).PartName, "3001.dat");
+    EXPECT_EQ(parseLines({"0 d", "0 Name: my part.dat"}).PartName, "my");
+}
+
+TEST(ParserRows, CategoryKeepsAllItsWords)
+{
+    EXPECT_EQ(parseLines({"0 d", "0 !CATEGORY Minifig Accessory"}).Category, "Minifig Accessory");
+    EXPECT_EQ(parseLines({"0 d", "0 CATEGORY Brick"}).Category, "Brick");
+}
+
+TEST(ParserRows, AuthorNameAndUserName)
+{
+    auto h = parseLines({"0 d", "0 Author: Jane Doe [jdoe]"});
+    EXPECT_EQ(h.ParsedRealName, "Jane Doe");
+    EXPECT_EQ(h.AuthorUserName, "jdoe");
+    h = parseLines({"0 d", "0 Author: Jane <jane@example.org>"});
+    EXPECT_EQ(h.AuthorUserName, "jane");
+    h = parseLines({"0 d", "0 Author: Jane [Doe Smith]"});
+    EXPECT_EQ(h.ParsedRealName, "Jane Smith]");
+    EXPECT_EQ(h.AuthorUserName, "Do");
+    h = parseLines({"0 d", "0 Author: [jdoe] Jane"});
+    EXPECT_EQ(h.ParsedRealName, "[jdoe] Jane");
+    h = parseLines({"0 d", "0 Author: Jane [x]"});
+    EXPECT_EQ(h.AuthorUserName, "x");
+    h = parseLines({"0 d", "0 Author: Jane []"});
+    EXPECT_EQ(h.AuthorUserName, "");
+}
+
+TEST(ParserRows, BfcStatements)
+{
+    EXPECT_EQ(parseLines({"0 d", "0 BFC CERTIFY CCW"}).Bfc, "CERTIFY CCW");
+    EXPECT_EQ(parseLines({"0 d", "0 BFC CERTIFY"}).Bfc, "");
+    EXPECT_EQ(parseLines({"0 d", "0 BFC CERTIFY CCW", "0 BFC NOCLIP"}).Bfc, "NOCLIP");
+    EXPECT_EQ(parseLines({"0 d", "0 BFC CERTIFY  CCW"}).Bfc, "CERTIFY  CCW");
+    EXPECT_EQ(parseLines({"0 d", "0 BFC NOCERTIFY"}).Bfc, "NOCERTIFY");
+}
+
+TEST(ParserRows, InvertNextEndsTheHeader)
+{
+    for (const std::string invert : {"0 BFC INVERTNEXT", "0 BFC CERTIFY INVERTNEXT"}) {
+        const auto h = parseLines({"0 d", invert, "0 !KEYWORDS x", "1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat"});
+        EXPECT_TRUE(h.Keywords.empty());
+        EXPECT_EQ(h.Body, invert + "\r\n0 !KEYWORDS x\r\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat");
+        EXPECT_EQ(h.OldHeader, "0 d\r\n" + invert);
+    }
+}
+
+TEST(ParserRows, PartTypeAndUpdateTag)
+{
+    auto h = parseLines({"0 d", "0 !LDRAW_ORG Part UPDATE 2004-01"});
+    EXPECT_EQ(h.PartType, "Part");
+    EXPECT_EQ(h.UpdateTag, "2004-01");
+    EXPECT_EQ(parseLines({"0 d", "0 !LDRAW_ORG Part EXTRA"}).PartType, "Part EXTRA");
+    EXPECT_EQ(parseLines({"0 d", "0 LDRAW_ORG Part Alias UPDATE 2003-02 x"}).PartType, "Part Alias");
+    h = parseLines({"0 d", "0 !LDRAW_ORG Part UPDATE"});
+    EXPECT_EQ(h.PartType, "Part");
+    EXPECT_EQ(h.UpdateTag, "");
+    EXPECT_EQ(parseLines({"0 d", "0 Unofficial Element"}).PartType, "Unofficial_Part");
+    EXPECT_EQ(parseLines({"0 d", "0 UNOFFICIAL subpart"}).PartType, "Unofficial_Subpart");
+    EXPECT_EQ(parseLines({"0 d", "0 Unofficial PART"}).PartType, "");
+    EXPECT_EQ(parseLines({"0 d", "0 Original LDraw Part"}).PartType, "Part");
+    EXPECT_EQ(parseLines({"0 d", "0 Original LDraw"}).PartType, "");
+}
+
+TEST(ParserRows, ListLinesKeepTheirWordsJoined)
+{
+    const auto h = parseLines({"0 d", "0 !KEYWORDS a,  b", "0 KEYWORDS c", "0 !HELP  x", "0 !CMDLINE -c4",
+                               "0 !LICENSE Redistributable under CCAL version 2.0 : see CAreadme.txt",
+                               "0 !HISTORY 12.3.2004 text", "0 COLOR 4  red"});
+    EXPECT_EQ(h.Keywords, (StringList{"a,  b", "c"}));
+    EXPECT_EQ(h.HelpLines, (StringList{"x"}));
+    EXPECT_EQ(h.CmdLines, (StringList{"-c4"}));
+    EXPECT_EQ(h.License, "Redistributable under CCAL version 2.0 : see CAreadme.txt");
+    EXPECT_EQ(h.History, (StringList{"12.3.2004 text"}));
+    EXPECT_EQ(h.ColorLines, (StringList{"0 COLOR 4  red"}));
+}
+
+TEST(ParserRows, CommentsAndDatedLines)
+{
+    const auto h = parseLines({"0 d", "0 // 2004-03-12 [jdoe] fixed", "0 // fixed it", "0 //fixed it",
+                               "0 2004-3-2 [jdoe] old style", "0 // 2004-03-12"});
+    EXPECT_EQ(h.History, (StringList{"2004-03-12 [jdoe] fixed", "2004-03-02 [jdoe] old style", "2004-03-12 "}));
+    EXPECT_EQ(h.Comments, (StringList{"// fixed it"}));
+    EXPECT_EQ(h.Body, "0 //fixed it");
+}
+
+TEST(ParserRows, FormsThatAreNotKeywordsStayInTheBody)
+{
+    const auto h = parseLines({"0 d", "0 HELP me", "0 Category Brick", "0 !COLOR x y", "0 ROTATION CENTER 0 0 0",
+                               "0 !CATEGORY Brick"});
+    EXPECT_EQ(h.Body, "0 HELP me\r\n0 Category Brick\r\n0 !COLOR x y\r\n0 ROTATION CENTER 0 0 0");
+    EXPECT_EQ(h.Category, "Brick");
+}
+
+TEST(ParserDates, OnlyRealDaysInYearMonthDayForm)
+{
+    const auto history = [](const std::string& word) { return parseLines({"0 d", "0 " + word + " x"}).History; };
+    EXPECT_EQ(history("2004-02-29"), (StringList{"2004-02-29 x"}));
+    EXPECT_TRUE(history("2003-02-29").empty());
+    EXPECT_TRUE(history("1900-02-29").empty());
+    EXPECT_EQ(history("2000-2-29"), (StringList{"2000-02-29 x"}));
+    EXPECT_TRUE(history("2004-13-01").empty());
+    EXPECT_TRUE(history("04-03-12").empty());
+    EXPECT_TRUE(history("2004-003-12").empty());
+    EXPECT_TRUE(history("12.3.2004").empty());
+    EXPECT_TRUE(history("0000-01-01").empty());
+    EXPECT_TRUE(history("2002-2-28:").empty());
+}
+
+TEST(ParserTwoWordLines, UnknownWordGoesToTheBodyKnownKeywordIsDropped)
+{
+    const auto h = parseLines({"0 d", "0 STEP", "0 Torso", "0 //", "0 Name:", "0 !KEYWORDS ", "0", "0 2004-03-12",
+                               "1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat", "0 STEP"});
+    EXPECT_EQ(h.Body, "0 STEP\r\n0 Torso\r\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat\r\n0 STEP");
+    EXPECT_EQ(h.History, (StringList{"2004-03-12 "}));
+    EXPECT_TRUE(h.Keywords.empty());
+    EXPECT_EQ(h.PartName, "");
+}
+
+TEST(ParserBlanks, EmptyWordsAndLeadingBlanks)
+{
+    // Two blanks after the 0 give an empty word 2: no keyword matches, and no date.
+    auto h = parseLines({"0 d", "0  Name: x"});
+    EXPECT_EQ(h.PartName, "");
+    EXPECT_EQ(h.Body, "0  Name: x");
+    h = parseLines({"0 d", " 0 // text", "0 !KEYWORDS late"});
+    EXPECT_EQ(h.Body, "0 // text\r\n0 !KEYWORDS late");
+    EXPECT_TRUE(h.Keywords.empty());
+    h = parseLines({"0 d", "0\tBFC CERTIFY CCW"});
+    EXPECT_EQ(h.Bfc, "");
+    EXPECT_EQ(h.Body, "0\tBFC CERTIFY CCW");
+}
+
+TEST(ParserEndOfHeader, BodyTrimsLinesAndKeepsInnerEmptyLines)
+{
+    const auto h = parseLines({"0 d", "", "0 FOO bar", "   1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat   ", "", "2 24 0 0 0 1 1 1"});
+    EXPECT_EQ(h.Body, "0 FOO bar\r\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat\r\n\r\n2 24 0 0 0 1 1 1");
+    EXPECT_EQ(h.OldHeader, "0 d\r\n0 FOO bar");
+}
+
+TEST(ParserEndOfHeader, EmptyLinesBeforeAnyBodyAddNothing)
+{
+    const auto h = parseLines({"1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat"});
+    EXPECT_EQ(h.Body, "1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat");
+    EXPECT_EQ(h.PartDescription, "");
+    HeaderData blankBody;
+    ScriptedDialogs dialogs;
+    ParseProgress progress;
+    ParsePartFileContent(blankBody, "0 d\r\n   \r\n", dialogs, progress);
+    EXPECT_EQ(blankBody.Body, "");
+}
+
+TEST(ParserRecord, ASecondParseStartsFromEmptyLists)
+{
+    HeaderData h;
+    ScriptedDialogs dialogs;
+    ParseProgress progress;
+    ParsePartFileContent(h, "0 a\r\n0 !KEYWORDS k\r\n0 // c\r\n1 x\r\n", dialogs, progress);
+    ParsePartFileContent(h, "0 b\r\n", dialogs, progress);
+    EXPECT_TRUE(h.Keywords.empty());
+    EXPECT_TRUE(h.Comments.empty());
+    EXPECT_EQ(h.Body, "");
+    EXPECT_EQ(h.OldHeader, "0 b");
+}
+
+class RecordingProgress : public ParseProgress {
+public:
+    void lineProgress(std::size_t linesRead) override { captions.push_back(ProgressCaption(linesRead)); }
+    void setBusy(bool busy) override { busyChanges.push_back(busy); }
+    std::vector<std::string> captions;
+    std::vector<bool> busyChanges;
+};
+
+TEST(ParserProgress, EveryTenthLineAndBusyAroundTheParse)
+{
+    std::string text;
+    for (int i = 0; i < 21; ++i)
+        text += "0 line\r\n";
+    HeaderData header;
+    RecordingProgress progress;
+    ParseHeaderText(header, text, progress);
+    EXPECT_EQ(progress.captions, (std::vector<std::string>{"Parsing file. Line 0. Please wait...",
+                                                           "Parsing file. Line 10. Please wait...",
+                                                           "Parsing file. Line 20. Please wait..."}));
+    EXPECT_EQ(progress.busyChanges, (std::vector<bool>{true, false}));
+}
+
+} // namespace

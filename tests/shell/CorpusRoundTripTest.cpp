@@ -1,0 +1,109 @@
+#include <gtest/gtest.h>
+
+#include "Composer.h"
+#include "Corpus.h"
+#include "Dialogs.h"
+#include "LineEnds.h"
+#include "LineReader.h"
+#include "OpenDocument.h"
+#include "ParseProgress.h"
+#include "PartFile.h"
+#include "Text.h"
+#include "Words.h"
+
+namespace {
+
+// Real files raise information boxes (TABs in a description, an empty file); they are answered OK.
+class AnsweringDialogs : public Dialogs {
+public:
+    Answer message(const MessageBox&) override { return Answer::Ok; }
+    std::string input(const std::string&, const std::string&, const std::string&) override { return {}; }
+    std::optional<std::string> openFile(const OpenFileRequest&) override { return std::nullopt; }
+};
+
+std::string savedBytes(const std::string& path, const std::string& content)
+{
+    HeaderData header;
+    AnsweringDialogs dialogs;
+    ParseProgress progress;
+    OpenPartFileContent(header, path, content, dialogs, progress);
+    return ComposeHeader(header) + header.Body + "\r\n";
+}
+
+// What a second save may still change: a blank at a line's end, empty lines, and the letter case
+// of a name taken from the file name.
+std::vector<std::string> settledForm(const std::string& bytes)
+{
+    std::vector<std::string> lines;
+    LineReader reader(bytes);
+    while (!reader.atEnd()) {
+        auto line = std::string(reader.nextLine());
+        line.erase(line.find_last_not_of(' ') + 1);
+        if (line.rfind("0 Name: ", 0) == 0)
+            line = ToLowerAscii(line);
+        if (!line.empty())
+            lines.push_back(line);
+    }
+    return lines;
+}
+
+std::vector<std::string> nonEmptyLinesAfterTheHeader(std::string content)
+{
+    if (IsUnixLineEnd(content))
+        content = LfToCrLf(content);
+    std::vector<std::string> lines;
+    std::vector<std::string_view> words;
+    bool headerEnded = false;
+    LineReader reader(content);
+    while (!reader.atEnd()) {
+        const auto line = reader.nextLine();
+        SplitWords(line, words);
+        const bool invertNext = words.size() >= 3 && words[0] == "0" && words[1] == "BFC" &&
+                                (words[2] == "INVERTNEXT" || (words[2] == "CERTIFY" && words.size() >= 4 && words[3] == "INVERTNEXT"));
+        if (!line.empty() && (words[0] != "0" || invertNext))
+            headerEnded = true;
+        const auto trimmed = TrimBlanks(line);
+        if (headerEnded && !trimmed.empty())
+            lines.emplace_back(trimmed);
+    }
+    return lines;
+}
+
+bool containsInOrder(const std::string& body, const std::vector<std::string>& wanted)
+{
+    std::size_t next = 0;
+    LineReader reader(body);
+    while (!reader.atEnd() && next < wanted.size())
+        if (reader.nextLine() == wanted[next])
+            ++next;
+    return next == wanted.size();
+}
+
+TEST(Corpus, SavingSettlesAfterOneSave)
+{
+    const auto files = CorpusPartFiles();
+    if (files.empty())
+        GTEST_SKIP() << "no corpus folder beside the project";
+    for (const auto& file : files) {
+        const auto once = savedBytes(file.string(), ReadWholeFile(file.string()));
+        const auto twice = savedBytes(file.string(), once);
+        EXPECT_EQ(settledForm(once), settledForm(twice)) << file;
+    }
+}
+
+TEST(Corpus, NothingOfTheBodyIsLost)
+{
+    const auto files = CorpusPartFiles();
+    if (files.empty())
+        GTEST_SKIP() << "no corpus folder beside the project";
+    for (const auto& file : files) {
+        const auto content = ReadWholeFile(file.string());
+        HeaderData header;
+        AnsweringDialogs dialogs;
+        ParseProgress progress;
+        OpenPartFileContent(header, file.string(), content, dialogs, progress);
+        EXPECT_TRUE(containsInOrder(header.Body, nonEmptyLinesAfterTheHeader(content))) << file;
+    }
+}
+
+} // namespace

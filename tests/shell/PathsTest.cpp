@@ -1,0 +1,60 @@
+#include <gtest/gtest.h>
+
+#include "CommandLine.h"
+#include "Paths.h"
+#include "ScriptedDialogs.h"
+#include "SplitText.h"
+
+namespace {
+
+using Pieces = std::vector<std::string>;
+
+TEST(SplitText, PiecesBetweenSeparators)
+{
+    EXPECT_EQ(SplitText("a/b//c/", "/"), (Pieces{"a", "b", "", "c", ""}));
+    EXPECT_EQ(SplitText("", "/"), Pieces{});
+    EXPECT_EQ(SplitText("abc", ""), (Pieces{"abc"}));
+    EXPECT_EQ(SplitText("a/b/c", "/", 0), Pieces{});
+    EXPECT_EQ(SplitText("a/b/c", "/", 1), (Pieces{"a/b/c"}));
+    EXPECT_EQ(SplitText("a/b/c", "/", 2), (Pieces{"a", "b/c"}));
+    EXPECT_EQ(SplitText("aXbxc", "x", -1, CompareMode::IgnoreCase), (Pieces{"a", "b", "c"}));
+    EXPECT_EQ(SplitText("a\r\nb\r\n", "\r\n"), (Pieces{"a", "b", ""}));
+}
+
+TEST(PathHelpers, NameAndFolder)
+{
+    ScriptedDialogs dialogs;
+    EXPECT_EQ(DateiNurName("/home/ann/parts/3001.dat", dialogs), "3001.dat");
+    EXPECT_EQ(DateiNurName("  3001.dat ", dialogs), "3001.dat");
+    EXPECT_EQ(DateiNurName("parts/", dialogs), "");
+    EXPECT_EQ(DateiNurName("a\\b.dat", dialogs), "a\\b.dat");
+    EXPECT_EQ(DateiNurPfad("/home/ann/parts/3001.dat"), "/home/ann/parts");
+    EXPECT_EQ(DateiNurPfad("/3001.dat"), "/");
+    EXPECT_EQ(DateiNurPfad("3001.dat"), "");
+    EXPECT_EQ(DateiNurPfad("parts/s/3001s01.dat"), "parts/s");
+    EXPECT_TRUE(dialogs.messages.empty());
+}
+
+TEST(PathHelpers, BlankPathHasNoNameAndIsReported)
+{
+    ScriptedDialogs dialogs;
+    dialogs.expectMessage(Answer::Ok);
+    EXPECT_EQ(DateiNurName(" ", dialogs), "");
+    ASSERT_EQ(dialogs.messages.size(), 1u);
+    EXPECT_EQ(dialogs.messages[0].text, "Error 9 (Subscript out of range) in procedure DateiNurName of Modul modFunctions");
+    EXPECT_EQ(dialogs.messages[0].title, "Quillmark");
+    EXPECT_EQ(DateiNurPfad(""), "");
+}
+
+TEST(CommandLine, BlanksSeparateUnlessTheLineHoldsAQuote)
+{
+    EXPECT_EQ(SplitCommandLine(""), (Pieces{""}));
+    EXPECT_EQ(SplitCommandLine("/parts/3001.dat"), (Pieces{"", "/parts/3001.dat"}));
+    EXPECT_EQ(SplitCommandLine("/My Parts/3001.dat", 1), (Pieces{"", "/My"}));
+    EXPECT_EQ(SplitCommandLine("\"/My Parts/3001.dat\"", 1), (Pieces{"", "/My Parts/3001.dat"}));
+    EXPECT_EQ(SplitCommandLine("\"/a b.dat\"\"/c.dat\"", 1), (Pieces{"", "/a b.dat"}));
+    EXPECT_EQ(SplitCommandLine(" \"/a.dat\"", 1), (Pieces{"", " "}));
+    EXPECT_EQ(SplitCommandLine("a  b\tc"), (Pieces{"", "a", "b\tc"}));
+}
+
+} // namespace
