@@ -11,17 +11,16 @@
 std::optional<HeaderData> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err)
 {
     dialogs.setCurrentFile(path);
-    std::string content;
     try {
-        content = ReadWholeFile(path);
+        const FileBytes content(path);
+        HeaderData header;
+        ParseProgress silent;
+        OpenPartFileContent(header, path, content.view(), dialogs, silent);
+        return header;
     } catch (const QmError& error) {
         err << "quillmark-cli: cannot read " << path << ": " << error.description() << '\n';
         return std::nullopt;
     }
-    HeaderData header;
-    ParseProgress silent;
-    OpenPartFileContent(header, path, std::move(content), dialogs, silent);
-    return header;
 }
 
 int ForEachOpenedFile(const std::vector<std::string>& paths, ConsoleDialogs& dialogs, std::ostream& err,

@@ -11,6 +11,7 @@ public:
 
     bool atEnd() const { return position_ >= text_.size(); }
     std::string_view nextLine();
+    std::size_t remainingBytes() const { return text_.size() - position_; }
 
 private:
     std::string_view text_;

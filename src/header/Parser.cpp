@@ -2,6 +2,7 @@
 
 #include <array>
 #include <new>
+#include <optional>
 #include <vector>
 
 #include "Dates.h"
@@ -11,6 +12,7 @@
 #include "LineReader.h"
 #include "ParseProgress.h"
 #include "PartFile.h"
+#include "LargeBuffer.h"
 #include "Text.h"
 #include "Words.h"
 
@@ -55,6 +57,7 @@ public:
     explicit HeaderParser(HeaderData& header) : h_(header) {}
 
     void classify(std::string_view line, std::size_t lineNumber);
+    bool headerEnded() const { return headerEnded_; }
 
 private:
     void toBody(std::string_view line) { appendLine(h_.Body, TrimBlanks(line)); }
@@ -82,10 +85,6 @@ private:
 
 void HeaderParser::classify(std::string_view line, std::size_t lineNumber)
 {
-    if (headerEnded_) {
-        toBody(line);
-        return;
-    }
     if (line.empty())
         return;
     SplitWords(line, words_);
@@ -235,6 +234,55 @@ void clearParsedContent(HeaderData& header)
     header.ColorLines.clear();
 }
 
+// Adds the lines after the end of the header to the body. Most of them need no trimming and end
+// with CR LF, so runs of such lines are copied in one piece instead of line by line.
+class BodyCollector {
+public:
+    // The body cannot grow beyond the rest of the text: make room once instead of step by step.
+    BodyCollector(std::string& body, std::size_t restOfText) : body_(body)
+    {
+        body_.reserve(body_.size() + restOfText + 2);
+        AdviseLargeBuffer(body_.data(), body_.capacity());
+    }
+    ~BodyCollector() { flush(); }
+    BodyCollector(const BodyCollector&) = delete;
+    BodyCollector& operator=(const BodyCollector&) = delete;
+
+    void add(std::string_view line)
+    {
+        if (fitsRun(line)) {
+            if (runStart_ == nullptr)
+                runStart_ = line.data();
+            runEnd_ = line.data() + line.size();
+            return;
+        }
+        flush();
+        appendLine(body_, TrimBlanks(line));
+    }
+
+private:
+    // A line joins the run when it needs no trimming, follows the run directly after a CR LF,
+    // and, when empty, has text before it (an empty line adds nothing to an empty body).
+    bool fitsRun(std::string_view line) const
+    {
+        if (line.empty() ? (runStart_ == nullptr && body_.empty()) : (line.front() == ' ' || line.back() == ' '))
+            return false;
+        return runStart_ == nullptr || (line.data() == runEnd_ + 2 && runEnd_[0] == '\r' && runEnd_[1] == '\n');
+    }
+
+    void flush()
+    {
+        if (runStart_ == nullptr)
+            return;
+        appendLine(body_, std::string_view(runStart_, static_cast<std::size_t>(runEnd_ - runStart_)));
+        runStart_ = runEnd_ = nullptr;
+    }
+
+    std::string& body_;
+    const char* runStart_ = nullptr;
+    const char* runEnd_ = nullptr;
+};
+
 class BusyPointer {
 public:
     explicit BusyPointer(ParseProgress& progress) : progress_(progress) { progress_.setBusy(true); }
@@ -258,29 +306,37 @@ void ParseHeaderText(HeaderData& header, std::string_view text, ParseProgress& p
     clearParsedContent(header);
     header.Encoding = EncodingOf(text);
     BusyPointer busy(progress);
-    HeaderParser parser(header);
     LineReader reader(text);
     std::size_t linesRead = 0;
-    while (!reader.atEnd()) {
+    const auto nextLine = [&]() {
         if (linesRead % 10 == 0) {
             progress.lineProgress(linesRead);
             progress.processEvents();
         }
-        const auto line = reader.nextLine();
         ++linesRead;
+        return reader.nextLine();
+    };
+    HeaderParser parser(header);
+    while (!reader.atEnd() && !parser.headerEnded()) {
+        const auto line = nextLine();
         parser.classify(line, linesRead);
     }
+    BodyCollector body(header.Body, reader.remainingBytes());
+    while (!reader.atEnd())
+        body.add(nextLine());
 }
 
-void ParsePartFileContent(HeaderData& header, std::string content, Dialogs& dialogs, ParseProgress& progress)
+void ParsePartFileContent(HeaderData& header, std::string_view content, Dialogs& dialogs, ParseProgress& progress)
 {
     if (content.empty())
         ReportError(dialogs, InputPastEndOfFileError(), IsUnixLineEndProcedure);
-    if (IsUnixLineEnd(content)) {
-        content = LfToCrLf(content);
-        content += CrLf;
+    if (!IsUnixLineEnd(content)) {
+        ParseHeaderText(header, content, progress);
+        return;
     }
-    ParseHeaderText(header, content, progress);
+    auto converted = LfToCrLf(content);
+    converted += CrLf;
+    ParseHeaderText(header, converted, progress);
 }
 
 void GetGlobalContent(HeaderData& header, Dialogs& dialogs, ParseProgress& progress)
@@ -288,9 +344,9 @@ void GetGlobalContent(HeaderData& header, Dialogs& dialogs, ParseProgress& progr
     if (header.FilePath.empty())
         return;
     progress.processEvents();
-    std::string content;
+    std::optional<FileBytes> content;
     try {
-        content = ReadWholeFile(header.FilePath);
+        content.emplace(header.FilePath);
     } catch (const QmError& error) {
         ReportError(dialogs, error, IsUnixLineEndProcedure);
         const bool missing = error.number() == ErrorNumber::FileNotFound || error.number() == ErrorNumber::PathNotFound;
@@ -301,7 +357,7 @@ void GetGlobalContent(HeaderData& header, Dialogs& dialogs, ParseProgress& progr
         return;
     }
     try {
-        ParsePartFileContent(header, std::move(content), dialogs, progress);
+        ParsePartFileContent(header, content->view(), dialogs, progress);
     } catch (const std::bad_alloc&) {
         ReportError(dialogs, QmError(7, "Out of memory"), GetGlobalContentProcedure);
     }

@@ -15,7 +15,7 @@ void ParseHeaderText(HeaderData& header, std::string_view text, ParseProgress& p
 // The content of the part file as read: the line-end check (an empty file is reported as the
 // check always has), the conversion of an LF-only file in memory, then the parse. The file on
 // disk is never touched.
-void ParsePartFileContent(HeaderData& header, std::string content, Dialogs& dialogs, ParseProgress& progress);
+void ParsePartFileContent(HeaderData& header, std::string_view content, Dialogs& dialogs, ParseProgress& progress);
 
 // Reads and parses the file named by FilePath; does nothing when FilePath is empty. Failures are
 // reported through dialogs, and the record keeps what the lines before the failure gave it.

@@ -1,6 +1,8 @@
 #include "Text.h"
 
 #include <algorithm>
+#include <cstdint>
+#include <cstring>
 
 namespace {
 
@@ -85,6 +87,15 @@ bool ContainsIgnoreCase(std::string_view text, std::string_view needle)
 bool IsValidUtf8(std::string_view bytes)
 {
     for (std::size_t i = 0; i < bytes.size();) {
+        // Part files are mostly ASCII: skip eight such bytes at a time.
+        std::uint64_t chunk = 0;
+        if (i + sizeof chunk <= bytes.size()) {
+            std::memcpy(&chunk, bytes.data() + i, sizeof chunk);
+            if ((chunk & 0x8080808080808080ULL) == 0) {
+                i += sizeof chunk;
+                continue;
+            }
+        }
         const auto length = utf8SequenceLength(bytes, i);
         if (length == 0)
             return false;

@@ -1,6 +1,7 @@
 #pragma once
 
 #include <string>
+#include <string_view>
 
 #include "HeaderData.h"
 
@@ -17,5 +18,5 @@ bool FinishOpenedRecord(HeaderData& header, Dialogs& dialogs);
 
 // Opens already read part-file content the way the Open command opens a file, without a window:
 // reset, take the path, parse, finish. Used by the command-line tool.
-void OpenPartFileContent(HeaderData& header, const std::string& path, std::string content, Dialogs& dialogs,
+void OpenPartFileContent(HeaderData& header, const std::string& path, std::string_view content, Dialogs& dialogs,
                          ParseProgress& progress);

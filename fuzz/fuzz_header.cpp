@@ -1,0 +1,36 @@
+// libFuzzer target: any bytes are a part file. Reading, parsing and composing must never crash,
+// and composing the parsed record must never throw.
+#include <cstddef>
+#include <cstdint>
+#include <string_view>
+
+#include "Composer.h"
+#include "DescriptionTabs.h"
+#include "Dialogs.h"
+#include "ParseProgress.h"
+#include "Parser.h"
+
+namespace {
+
+class SilentDialogs : public Dialogs {
+public:
+    Answer message(const MessageBox&) override { return Answer::Ok; }
+    std::string input(const std::string&, const std::string&, const std::string&) override { return {}; }
+    std::optional<std::string> openFile(const OpenFileRequest&) override { return std::nullopt; }
+};
+
+} // namespace
+
+extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size)
+{
+    HeaderData header;
+    SilentDialogs dialogs;
+    ParseProgress progress;
+    ParsePartFileContent(header, std::string_view(reinterpret_cast<const char*>(data), size), dialogs, progress);
+    header.AuthorRealName = header.ParsedRealName;
+    RemoveDescriptionTabs(header, dialogs);
+    const auto text = ComposeHeader(header);
+    if (text.size() < 4)
+        __builtin_trap();
+    return 0;
+}

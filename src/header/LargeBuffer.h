@@ -1,0 +1,8 @@
+#pragma once
+
+#include <cstddef>
+
+// Tells the system that a freshly allocated buffer of many megabytes will be filled at once, so
+// that it backs it with large pages: faulting in a 50 MB body page by page costs more than
+// parsing it. Small buffers and systems without the advice are left as they are.
+void AdviseLargeBuffer(void* buffer, std::size_t size);
