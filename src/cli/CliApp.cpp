@@ -3,6 +3,7 @@
 #include <CLI/CLI.hpp>
 
 #include "ConsoleDialogs.h"
+#include "CheckCommands.h"
 #include "PrintCommands.h"
 
 int RunCli(int argc, const char* const* argv, std::ostream& out, std::ostream& err)
@@ -21,6 +22,26 @@ int RunCli(int argc, const char* const* argv, std::ostream& out, std::ostream& e
         "print", "Write to standard output exactly the bytes that saving FILE right after opening it would write.");
     print->add_option("FILE", printFile, "Part file to read")->required();
 
+    std::vector<std::string> checkFiles;
+    bool checkJson = false;
+    auto* check = app.add_subcommand(
+        "check", "Run every save check on each FILE without writing: refusals, a missing user name, and the "
+                 "fix-ups a save would offer. Exit status 1 when any file would be refused, 2 when one cannot be read.");
+    check->add_flag("--json", checkJson, "One JSON object per file and line");
+    check->add_option("FILE", checkFiles, "Part files to check")->required();
+
+    std::vector<std::string> saveFiles;
+    bool noBackup = false;
+    SaveOptions saveOptions;
+    auto* save = app.add_subcommand(
+        "save", "Re-save each FILE as the editor's Save does: checked, optionally fixed, with a dated backup. "
+                "Exit status 1 when a file was skipped, 2 when one cannot be read, 3 when a save failed.");
+    save->add_flag("--no-backup", noBackup, "Do not keep the old file under a dated backup name");
+    save->add_flag("--fix", saveOptions.fix, "Apply all four body and colour fix-ups");
+    save->add_flag("--allow-missing-username", saveOptions.allowMissingUserName,
+                   "Save files whose author line has no user name");
+    save->add_option("FILE", saveFiles, "Part files to save")->required();
+
     try {
         app.parse(argc, argv);
     } catch (const CLI::ParseError& error) {
@@ -30,5 +51,11 @@ int RunCli(int argc, const char* const* argv, std::ostream& out, std::ostream& e
     ConsoleDialogs dialogs(err);
     if (*fields)
         return RunFields(fieldsFiles, dialogs, out, err);
+    if (*check)
+        return RunCheck(checkFiles, checkJson, dialogs, out, err);
+    if (*save) {
+        saveOptions.backup = !noBackup;
+        return RunSave(saveFiles, saveOptions, out, err);
+    }
     return RunPrint(printFile, dialogs, out, err);
 }

@@ -16,6 +16,8 @@ public:
     explicit ConsoleDialogs(std::ostream& err, Answerer answerer = {});
 
     void setCurrentFile(const std::string& path) { currentFile_ = path; }
+    // The text of the last box shown, answered or not.
+    const std::string& lastMessage() const { return lastMessage_; }
 
     Answer message(const MessageBox& box) override;
     std::string input(const std::string& prompt, const std::string& title, const std::string& defaultText) override;
@@ -25,6 +27,7 @@ private:
     std::ostream& err_;
     Answerer answerer_;
     std::string currentFile_;
+    std::string lastMessage_;
 };
 
 // A message on one line: its CR LF become "; ".

@@ -1,28 +1,13 @@
 #include <gtest/gtest.h>
 
 #include <nlohmann/json.hpp>
+#include <algorithm>
 #include <sstream>
 
-#include "CliApp.h"
+#include "CliRun.h"
 #include "TempDir.h"
 
 namespace {
-
-struct CliRun {
-    int status;
-    std::string out, err;
-};
-
-CliRun runCli(std::vector<std::string> args)
-{
-    args.insert(args.begin(), "quillmark-cli");
-    std::vector<const char*> argv;
-    for (const auto& arg : args)
-        argv.push_back(arg.c_str());
-    std::ostringstream out, err;
-    const int status = RunCli(static_cast<int>(argv.size()), argv.data(), out, err);
-    return {status, out.str(), err.str()};
-}
 
 const std::string SamplePart = "0 Brick\t2 x 4\r\n0 Name: 3001.dat\r\n0 Author: Sam Sample [ssample]\r\n"
                                "0 BFC CERTIFY CCW\r\n0 !KEYWORDS a, b\r\n0 Caf\xe9\r\n"
@@ -32,7 +17,7 @@ TEST(CliFields, OneJsonLinePerFileWithTheRecordAsOpened)
 {
     TempDir dir;
     const auto path = dir.write("3001.dat", SamplePart);
-    const auto run = runCli({"fields", path, path});
+    const auto run = RunCliWith({"fields", path, path});
     EXPECT_EQ(run.status, 0);
     std::istringstream lines(run.out);
     std::string line;
@@ -58,7 +43,7 @@ TEST(CliFields, UnreadableFileIsNamedOnStandardErrorAndTheOthersStillRun)
 {
     TempDir dir;
     const auto good = dir.write("good.dat", "0 Good\r\n");
-    const auto run = runCli({"fields", dir.file("missing.dat"), good});
+    const auto run = RunCliWith({"fields", dir.file("missing.dat"), good});
     EXPECT_EQ(run.status, 2);
     EXPECT_EQ(std::count(run.out.begin(), run.out.end(), '\n'), 1);
     EXPECT_NE(run.out.find("\"Good\""), std::string::npos);
@@ -69,7 +54,7 @@ TEST(CliFields, UnreadableFileIsNamedOnStandardErrorAndTheOthersStillRun)
 TEST(CliPrint, WritesTheComposedHeaderTheBodyAndOneCrLf)
 {
     TempDir dir;
-    const auto run = runCli({"print", dir.write("3001.dat", SamplePart)});
+    const auto run = RunCliWith({"print", dir.write("3001.dat", SamplePart)});
     EXPECT_EQ(run.status, 0);
     EXPECT_EQ(run.out, "0 Brick2 x 4\r\n0 Name: 3001.dat\r\n0 Author: Sam Sample [ssample]\r\n\r\n"
                        "0 BFC CERTIFY CCW\r\n\r\n0 !KEYWORDS a, b\r\n\r\n"
@@ -78,7 +63,7 @@ TEST(CliPrint, WritesTheComposedHeaderTheBodyAndOneCrLf)
 
 TEST(CliPrint, MissingFileGivesStatusTwoAndNoOutput)
 {
-    const auto run = runCli({"print", "/nonexistent/folder/x.dat"});
+    const auto run = RunCliWith({"print", "/nonexistent/folder/x.dat"});
     EXPECT_EQ(run.status, 2);
     EXPECT_EQ(run.out, "");
     EXPECT_NE(run.err.find("/nonexistent/folder/x.dat"), std::string::npos);
@@ -86,7 +71,7 @@ TEST(CliPrint, MissingFileGivesStatusTwoAndNoOutput)
 
 TEST(CliHelp, ExplainsEachCommand)
 {
-    const auto run = runCli({"--help"});
+    const auto run = RunCliWith({"--help"});
     EXPECT_EQ(run.status, 0);
     EXPECT_NE(run.out.find("fields"), std::string::npos);
     EXPECT_NE(run.out.find("print"), std::string::npos);

@@ -23,8 +23,13 @@ TempDir::~TempDir()
 std::string TempDir::write(const std::string& name, const std::string& bytes) const
 {
     const auto full = file(name);
-    std::ofstream(full, std::ios::binary) << bytes;
+    writeTo(full, bytes);
     return full;
+}
+
+void TempDir::writeTo(const std::string& path, const std::string& bytes)
+{
+    std::ofstream(path, std::ios::binary) << bytes;
 }
 
 std::string ReadBytes(const std::string& path)

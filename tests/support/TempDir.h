@@ -15,6 +15,7 @@ public:
     std::string file(const std::string& name) const { return (path_ / name).string(); }
     // Writes bytes to name in the folder and returns its full path.
     std::string write(const std::string& name, const std::string& bytes) const;
+    static void writeTo(const std::string& path, const std::string& bytes);
 
 private:
     std::filesystem::path path_;

@@ -1,0 +1,53 @@
+#pragma once
+
+#include <functional>
+#include <string>
+#include <vector>
+
+#include "HeaderData.h"
+
+class Clock;
+class Dialogs;
+
+inline constexpr std::size_t DescriptionLimit = 64;
+
+// A stop text as the box shows it: the sentence, CR LF, "Saving the file is not possible".
+std::string RefusalText(const std::string& sentence);
+
+struct FixUpOffers {
+    bool certifyInvertNext = false, rotation = false, write = false, color = false;
+};
+
+// Every check at once, for tools that list what a save would say.
+struct SaveFindings {
+    std::vector<std::string> refusals; // the stop texts, in the order the save checks them
+    bool missingUserName = false;
+    FixUpOffers fixups;
+};
+SaveFindings EvaluateSaveChecks(const HeaderData& header);
+
+enum class SaveOutcome {
+    Saved,
+    DescriptionTooLong, // refused; the caller shows the description with its characters after the 64th selected
+    Refused,            // another check stopped the save
+    Declined,           // the user did not want to save without a user name
+    Failed,             // writing failed, and was reported
+};
+
+// What the save needs from whoever holds the header: the composed text to write, and a way to
+// compose it again after a fix-up changed the header.
+struct SaveContext {
+    Dialogs& dialogs;
+    const Clock& clock;
+    bool makeBackup;
+    std::function<std::string()> newHeader;
+    std::function<void()> recompose;
+};
+
+struct SaveResult {
+    SaveOutcome outcome;
+    std::string backupPath; // when saved with a backup
+};
+
+// The checks in their fixed order, the fix-up questions, then FileSave.
+SaveResult CheckHeaderAndSave(HeaderData& header, const SaveContext& context);

@@ -1,0 +1,187 @@
+#include <gtest/gtest.h>
+
+#include "Composer.h"
+#include "FixedClock.h"
+#include "SaveChecks.h"
+#include "ScriptedDialogs.h"
+#include "TempDir.h"
+
+namespace {
+
+const std::string NotPossible = "\r\nSaving the file is not possible";
+
+class SaveChecks : public ::testing::Test {
+protected:
+    SaveChecks()
+    {
+        h.FilePath = dir.write("3001.dat", "old\r\n");
+        h.PartDescription = "Brick 2 x 4";
+        h.AuthorRealName = "Jane Doe";
+        h.AuthorUserName = "jdoe";
+        h.Bfc = "CERTIFY CCW";
+        h.License = "Licensed under CC BY 4.0 : see CAreadme.txt";
+        h.PartType = "Part";
+        h.Body = "1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat";
+        h.FileChanged = true;
+    }
+
+    SaveResult save()
+    {
+        return CheckHeaderAndSave(h, {dialogs, clock, false, [this] { return ComposeHeader(h); },
+                                      [this] { ++recomposed; }});
+    }
+    std::string saved() const { return ReadBytes(h.FilePath); }
+    void expectOnlyStop(const std::string& sentence)
+    {
+        ASSERT_EQ(dialogs.messages.size(), 1u);
+        EXPECT_EQ(dialogs.messages[0].text, sentence + NotPossible);
+        EXPECT_EQ(dialogs.messages[0].title, "Quillmark");
+        EXPECT_EQ(dialogs.messages[0].buttons, Buttons::Ok);
+        EXPECT_EQ(dialogs.messages[0].icon, Icon::None);
+        EXPECT_EQ(saved(), "old\r\n");
+        EXPECT_TRUE(h.FileChanged);
+    }
+
+    TempDir dir;
+    HeaderData h;
+    ScriptedDialogs dialogs;
+    FixedClock clock;
+    int recomposed = 0;
+};
+
+TEST_F(SaveChecks, CompleteHeaderIsSavedWithoutAQuestion)
+{
+    EXPECT_EQ(save().outcome, SaveOutcome::Saved);
+    EXPECT_EQ(saved(), ComposeHeader(h) + h.Body + "\r\n");
+    EXPECT_FALSE(h.FileChanged);
+    EXPECT_TRUE(dialogs.messages.empty());
+}
+
+TEST_F(SaveChecks, DescriptionOfSixtyFiveCharactersIsRefused)
+{
+    h.PartDescription = std::string(64, 'x');
+    EXPECT_EQ(save().outcome, SaveOutcome::Saved);
+    h.PartDescription = std::string(65, 'x');
+    dialogs.expectMessage(Answer::Ok);
+    EXPECT_EQ(save().outcome, SaveOutcome::DescriptionTooLong);
+    ASSERT_EQ(dialogs.messages.size(), 1u);
+    EXPECT_EQ(dialogs.messages[0].text, "Length of the part description is limited to 64 character!" + NotPossible);
+}
+
+TEST_F(SaveChecks, DescriptionLengthCountsCharactersOfAUtf8File)
+{
+    h.Encoding = TextEncoding::Utf8;
+    std::string umlauts;
+    for (int i = 0; i < 64; ++i)
+        umlauts += "\xc3\xb6";
+    h.PartDescription = umlauts;
+    EXPECT_EQ(save().outcome, SaveOutcome::Saved);
+    h.Encoding = TextEncoding::Latin1;
+    h.PartDescription = std::string(65, '\xf6');
+    dialogs.expectMessage(Answer::Ok);
+    EXPECT_EQ(save().outcome, SaveOutcome::DescriptionTooLong);
+}
+
+TEST_F(SaveChecks, FirstFailingCheckDecides)
+{
+    h.AuthorRealName.clear();
+    h.Bfc.clear();
+    dialogs.expectMessage(Answer::Ok);
+    EXPECT_EQ(save().outcome, SaveOutcome::Refused);
+    expectOnlyStop("You need to mention the Author!");
+}
+
+TEST_F(SaveChecks, EachLaterCheckHasItsSentence)
+{
+    const std::pair<std::function<void(HeaderData&)>, std::string> cases[] = {
+        {[](HeaderData& x) { x.Bfc.clear(); }, "You need to set the BFC type!"},
+        {[](HeaderData& x) { x.License.clear(); }, "You need to set the Liscense type!"},
+        {[](HeaderData& x) { x.PartType.clear(); }, "You need to set the Part type!"},
+        {[](HeaderData& x) { x.NeedsWork = true; }, "Parts with 'needs work' in title needs a proper comment!"},
+    };
+    for (const auto& [breakHeader, sentence] : cases) {
+        HeaderData good = h;
+        breakHeader(h);
+        dialogs = ScriptedDialogs();
+        dialogs.expectMessage(Answer::Ok);
+        EXPECT_EQ(save().outcome, SaveOutcome::Refused);
+        expectOnlyStop(sentence);
+        h = good;
+    }
+    h.NeedsWork = true;
+    h.Comments = {"// still rough"};
+    EXPECT_EQ(save().outcome, SaveOutcome::Saved);
+}
+
+TEST_F(SaveChecks, MissingUserNameQuestion)
+{
+    h.AuthorUserName.clear();
+    dialogs.expectMessage(Answer::No);
+    EXPECT_EQ(save().outcome, SaveOutcome::Declined);
+    EXPECT_EQ(saved(), "old\r\n");
+    ASSERT_EQ(dialogs.messages.size(), 1u);
+    const auto& box = dialogs.messages[0];
+    EXPECT_EQ(box.text, "You have not set your username. Do you want to save anyway?");
+    EXPECT_EQ(box.title, "Missing Username");
+    EXPECT_EQ(box.buttons, Buttons::YesNo);
+    EXPECT_EQ(box.icon, Icon::Question);
+    EXPECT_EQ(box.defaultButton, Answer::Yes);
+
+    h.Bfc.clear();
+    dialogs.expectMessage(Answer::Yes);
+    dialogs.expectMessage(Answer::Ok);
+    EXPECT_EQ(save().outcome, SaveOutcome::Refused);
+    EXPECT_EQ(dialogs.messages.back().text, "You need to set the BFC type!" + NotPossible);
+}
+
+TEST_F(SaveChecks, FixUpQuestionsInOrderAndYesCorrectsExactCaseOnly)
+{
+    h.Body = "0 BFC CERTIFY INVERTNEXT\r\n0 bfc certify invertnext\r\n0 ROTATION CENTER 0 0 0\r\n"
+             "0 // see 0 ROTATION 1 0 0 90\r\n0 WRITE Hello\r\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat";
+    h.ColorLines = {"0 COLOR 4 red"};
+    for (int i = 0; i < 4; ++i)
+        dialogs.expectMessage(Answer::Yes);
+    EXPECT_EQ(save().outcome, SaveOutcome::Saved);
+    ASSERT_EQ(dialogs.messages.size(), 4u);
+    EXPECT_EQ(dialogs.messages[0].title, "BFC CERTIFY INVERTNEXT");
+    EXPECT_EQ(dialogs.messages[0].text, "Should this be corrected?");
+    EXPECT_EQ(dialogs.messages[1].title, "ROTATION in file");
+    EXPECT_EQ(dialogs.messages[1].text, "Should the \"0 ROTATION\" entries being deleted?");
+    EXPECT_EQ(dialogs.messages[2].title, "ROTATION in file");
+    EXPECT_EQ(dialogs.messages[2].text, "Should the \"0 WRITE\" entries being deleted?");
+    EXPECT_EQ(dialogs.messages[3].title, "COLOR Entry");
+    EXPECT_EQ(dialogs.messages[3].text, "Should the COLOR Entry be deleted?");
+    EXPECT_EQ(h.Body, "0 BFC INVERTNEXT\r\n0 bfc certify invertnext\r\n0 // see 0 ROTATION 1 0 0 90\r\n"
+                      "0 Hello\r\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat");
+    EXPECT_TRUE(h.ColorLines.empty());
+    EXPECT_EQ(recomposed, 1);
+    EXPECT_EQ(saved().find("COLOR"), std::string::npos);
+}
+
+TEST_F(SaveChecks, NoToEveryFixUpStillSaves)
+{
+    h.Body = "0 rotation x \r\n0 write y ";
+    h.ColorLines = {"0 COLOR 4 red"};
+    for (int i = 0; i < 3; ++i)
+        dialogs.expectMessage(Answer::No);
+    EXPECT_EQ(save().outcome, SaveOutcome::Saved);
+    EXPECT_EQ(dialogs.messages.size(), 3u);
+    EXPECT_EQ(h.Body, "0 rotation x \r\n0 write y ");
+    EXPECT_NE(saved().find("0 COLOR 4 red"), std::string::npos);
+}
+
+TEST_F(SaveChecks, EvaluateListsEveryFinding)
+{
+    h.AuthorRealName.clear();
+    h.AuthorUserName.clear();
+    h.License.clear();
+    h.Body = "0 BFC CERTIFY INVERTNEXT";
+    const auto findings = EvaluateSaveChecks(h);
+    EXPECT_EQ(findings.refusals, (std::vector<std::string>{"You need to mention the Author!" + NotPossible,
+                                                          "You need to set the Liscense type!" + NotPossible}));
+    EXPECT_TRUE(findings.missingUserName);
+    EXPECT_TRUE(findings.fixups.certifyInvertNext);
+    EXPECT_FALSE(findings.fixups.rotation || findings.fixups.write || findings.fixups.color);
+}
+
+} // namespace
