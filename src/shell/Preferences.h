@@ -1,0 +1,38 @@
+#pragma once
+
+#include <string>
+
+class SettingsStore;
+
+// The author's own defaults, kept beside the record for the run.
+struct Preferences {
+    std::string DefaultRealName;
+    std::string DefaultUserName;
+    std::string DefaultLicense;
+    bool MakeBackup = true;
+};
+
+// Refreshes the three default texts from the store; a value that is blank after trimming is empty.
+void LadeDefaults(Preferences& preferences, const SettingsStore& store);
+
+// The stored "Backup" choice: "True" or "Wahr" after trimming means on, a missing key too.
+bool StoredBackupChoice(const SettingsStore& store);
+
+// What the preferences window shows and saves.
+struct PreferencesForm {
+    std::string realName;
+    std::string userName;
+    std::string license; // the stored licence; the window selects the last entry equal to it
+    bool backup = true;
+};
+
+// Opening the window: the stored values (blank ones shown empty), and at once the stored backup
+// choice into MakeBackup and a stored licence into DefaultLicense.
+PreferencesForm OpenPreferencesForm(Preferences& preferences, const SettingsStore& store);
+
+// Saving the window: the texts trimmed, "Backup" as "True" or "False", and MakeBackup.
+void SavePreferencesForm(const PreferencesForm& form, Preferences& preferences, SettingsStore& store);
+
+// The folder the Open dialog starts in: "LastPath", or the program's folder on the first run.
+std::string StartFolder(const SettingsStore& store, const std::string& programFolder);
+void StoreLastPath(SettingsStore& store, const std::string& folder);

@@ -1,0 +1,88 @@
+#include <gtest/gtest.h>
+
+#include "QmError.h"
+#include "ScriptedDialogs.h"
+#include "StandardLists.h"
+#include "TempDir.h"
+
+namespace {
+
+TEST(ListFiles, OneEntryPerLineExactlyAsRead)
+{
+    TempDir dir;
+    EXPECT_EQ(ReadListFile(dir.write("a.txt", "Brick\r\n  Plate\r\n\r\n")), (StringList{"Brick", "  Plate", ""}));
+    EXPECT_EQ(ReadListFile(dir.write("b.txt", "x\ry\r\nz")), (StringList{"x", "y", "z"}));
+    EXPECT_EQ(ReadListFile(dir.write("c.txt", "x\ny\n")), (StringList{"x\ny\n"}));
+    EXPECT_EQ(ReadListFile(dir.write("d.txt", "x\r\nx\r\n")), (StringList{"x", "x"}));
+    EXPECT_EQ(ReadListFile(dir.write("e.txt", "")), StringList{});
+}
+
+TEST(ListFiles, LoadersReadTheProgramFolder)
+{
+    TempDir dir;
+    dir.write("category.txt", "<none>\r\nBrick\r\n");
+    dir.write("parttype.txt", "Part\r\n");
+    dir.write("bfc.txt", "CERTIFY CCW\r\n");
+    dir.write("licenses.txt", "L1\r\nL2\r\n");
+    ScriptedDialogs dialogs;
+    StandardLists lists;
+    LoadStandardLists(lists, dir.path().string(), dialogs);
+    EXPECT_EQ(EntriesOf(lists, ListKind::Category), (StringList{"<none>", "Brick"}));
+    EXPECT_EQ(lists.Categories.Item(2).Description, "Brick");
+    EXPECT_EQ(lists.PartTypes, (StringList{"Part"}));
+    EXPECT_EQ(lists.BfcStatements, (StringList{"CERTIFY CCW"}));
+    EXPECT_EQ(lists.Licenses, (StringList{"L1", "L2"}));
+}
+
+TEST(ListFiles, MissingFileIsReportedAndGivesAnEmptyList)
+{
+    TempDir dir;
+    dir.write("category.txt", "Brick\r\n");
+    ScriptedDialogs dialogs;
+    for (int i = 0; i < 3; ++i)
+        dialogs.expectMessage(Answer::Ok);
+    StandardLists lists;
+    LoadStandardLists(lists, dir.path().string(), dialogs);
+    EXPECT_TRUE(lists.PartTypes.empty());
+    EXPECT_EQ(lists.Categories.Count(), 1u);
+    ASSERT_EQ(dialogs.messages.size(), 3u);
+    EXPECT_EQ(dialogs.messages[0].text, "Error 53 (File not found) in procedure LoadPartTypes of Modul modCategory");
+    EXPECT_EQ(dialogs.messages[1].text, "Error 53 (File not found) in procedure LoadBFC of Modul modCategory");
+    EXPECT_EQ(dialogs.messages[2].text, "Error 53 (File not found) in procedure LoadLicense of Modul modCategory");
+}
+
+TEST(ListFiles, WriterPutsCrLfAfterEveryEntry)
+{
+    TempDir dir;
+    const auto path = dir.file("bfc.txt");
+    WriteListFile(path, {"A", "", "  b"});
+    EXPECT_EQ(ReadBytes(path), "A\r\n\r\n  b\r\n");
+    WriteListFile(path, {});
+    EXPECT_EQ(ReadBytes(path), "");
+}
+
+TEST(DefaultListFiles, StandBesideTheExecutables)
+{
+    ScriptedDialogs dialogs;
+    StandardLists lists;
+    LoadStandardLists(lists, QUILLMARK_PROGRAM_FOLDER, dialogs);
+    EXPECT_EQ(lists.Categories.Count(), 100u);
+    EXPECT_EQ(lists.Categories.Item(1).Description, "<none>");
+    EXPECT_EQ(lists.PartTypes.size(), 20u);
+    EXPECT_EQ(lists.BfcStatements, (StringList{"CERTIFY CCW", "CERTIFY CW", "NOCERTIFY"}));
+    EXPECT_EQ(lists.Licenses.size(), 5u);
+}
+
+TEST(Categories, PositionsAndKeys)
+{
+    colCategory categories;
+    categories.Add("", "Brick");
+    categories.Add("k", "Plate", "plate");
+    EXPECT_EQ(categories.Count(), 2u);
+    EXPECT_EQ(categories.Item("plate").Description, "Plate");
+    categories.Remove(1);
+    EXPECT_EQ(categories.Item(1).Description, "Plate");
+    EXPECT_THROW(categories.Item(2), QmError);
+}
+
+} // namespace
