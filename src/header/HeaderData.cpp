@@ -3,6 +3,7 @@
 void ResetHeaderRecord(HeaderData& header)
 {
     HeaderData empty;
+    empty.FileFolder = header.FileFolder; // the Open dialog still starts there
     empty.FileChanged = header.FileChanged;
     empty.FileLoaded = header.FileLoaded;
     empty.Loading = header.Loading;

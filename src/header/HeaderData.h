@@ -40,5 +40,5 @@ struct HeaderData {
     bool Loading = false;
 };
 
-// Empties the record at the start of an open; the document flags are the caller's.
+// Empties the record at the start of an open; the document flags and FileFolder stay.
 void ResetHeaderRecord(HeaderData& header);

@@ -1,0 +1,85 @@
+#include "frmList.h"
+
+#include <QGroupBox>
+#include <QKeyEvent>
+#include <QLineEdit>
+#include <QListWidget>
+#include <QPushButton>
+
+#include "FileText.h"
+#include "TwipLayout.h"
+
+frmList::frmList(ListKind kind, const StringList& entries, const std::string& programFolder, Dialogs& dialogs,
+                 QWidget* parent)
+    : QDialog(parent), editor_(kind, entries, programFolder, dialogs)
+{
+    setObjectName("frmList");
+    setWindowTitle(QString("List") + InfoOf(kind).captionSuffix);
+    setModal(true);
+    setFixedSize(Pixels(6645), Pixels(4155));
+    Frame1 = PlaceChild<QGroupBox>(this, "Frame1", 120, 840, 4935, 3255);
+    Frame1->setTitle("Current Values");
+    lsValues = PlaceChild<QListWidget>(Frame1, "lsValues", 120, 240, 4695, 2790);
+    cmdChange = PlaceChild<QPushButton>(this, "cmdChange", 5160, 480, 1335, 375);
+    cmdChange->setText("Update");
+    cmdAdd = PlaceChild<QPushButton>(this, "cmdAdd", 5160, 1200, 1335, 375);
+    cmdAdd->setText("Add");
+    cmdClose = PlaceChild<QPushButton>(this, "cmdClose", 5160, 2160, 1335, 375);
+    cmdClose->setText("Close");
+    cmdClose->setDefault(true);
+    txUpdate = PlaceChild<QLineEdit>(this, "txUpdate", 240, 480, 4695, 285);
+    cmdDelete = PlaceChild<QPushButton>(this, "cmdDelete", 5160, 1680, 1335, 375);
+    cmdDelete->setText("Delete");
+    QWidget::setTabOrder(Frame1, lsValues);
+    QWidget::setTabOrder(lsValues, cmdChange);
+    QWidget::setTabOrder(cmdChange, cmdAdd);
+    QWidget::setTabOrder(cmdAdd, cmdClose);
+    QWidget::setTabOrder(cmdClose, txUpdate);
+    QWidget::setTabOrder(txUpdate, cmdDelete);
+
+    connect(lsValues, &QListWidget::itemClicked, this, [this] {
+        editor_.select(static_cast<std::size_t>(lsValues->currentRow()));
+        txUpdate->setText(ListEntryToWidget(editor_.updateText()));
+    });
+    connect(txUpdate, &QLineEdit::textEdited, this, [this](const QString& text) { editor_.setUpdateText(text.toStdString()); });
+    connect(cmdAdd, &QPushButton::clicked, this, [this] {
+        editor_.add();
+        showEntries();
+    });
+    connect(cmdDelete, &QPushButton::clicked, this, [this] {
+        editor_.deleteSelected();
+        showEntries();
+    });
+    connect(cmdChange, &QPushButton::clicked, this, [this] {
+        editor_.updateSelected();
+        showEntries();
+    });
+    connect(cmdClose, &QPushButton::clicked, this, &frmList::cmdClose_Click);
+    showEntries();
+}
+
+void frmList::showEntries()
+{
+    lsValues->clear();
+    for (const auto& entry : editor_.entries())
+        lsValues->addItem(ListEntryToWidget(entry));
+    if (const auto row = editor_.selected())
+        lsValues->setCurrentRow(static_cast<int>(*row));
+    txUpdate->setText(ListEntryToWidget(editor_.updateText()));
+}
+
+void frmList::cmdClose_Click()
+{
+    if (editor_.close())
+        accept();
+}
+
+void frmList::keyPressEvent(QKeyEvent* event)
+{
+    // Escape presses Close, which asks about unsaved changes; the window's own close box does not.
+    if (event->key() == Qt::Key_Escape) {
+        cmdClose->click();
+        return;
+    }
+    QDialog::keyPressEvent(event);
+}

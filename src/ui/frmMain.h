@@ -1,0 +1,167 @@
+#pragma once
+
+#include <QMainWindow>
+#include <array>
+#include <functional>
+#include <memory>
+
+#include "AppState.h"
+#include "ErrorReport.h"
+#include "SaveChecks.h"
+
+class QAction;
+class QComboBox;
+class QFrame;
+class QLabel;
+class QLineEdit;
+class QListWidget;
+class QPlainTextEdit;
+class QPushButton;
+class WindowProgress;
+
+// The main window: every field of the header in its own control, the new header beside the old
+// one, the three line lists, the status line and the menus. Controls carry their names as
+// objectName; members of a control array are named with their index ("Label2_0", "MRecentFile_3").
+class frmMain : public QMainWindow {
+    Q_OBJECT
+
+public:
+    frmMain(AppState& app, Services& services, QWidget* parent = nullptr);
+    ~frmMain() override;
+
+    // Start-up from the window's side: lists, recent files, caption, greeting, and the file named
+    // by the first argument, which is opened once the window shows.
+    void StartUp(const QStringList& arguments);
+
+    void MDateiOeffnen_Click();
+    void MDateiSpeichern_Click();
+    void OpenFile(const std::string& path);
+    void MInfo_Click();
+    void MRecentFile_Click(int index);
+    void MEditCategory_Click();
+    void MEditPartTyps_Click();
+    void MEditBFCStatement_Click();
+    void MEditLicense_Click();
+    void MEinstellDefault_Click();
+    void cmdSetPreferences_Click();
+
+    // Recomposes the new header from the record, refreshes the length display, marks the change.
+    void MakeNewHeader();
+    void EnableControls();
+
+    // The composed header exactly as saving writes it (the widget shows it with its own line ends).
+    const std::string& newHeaderText() const { return newHeaderText_; }
+    bool openInProgress() const { return app_.Header.Loading; }
+
+protected:
+    void closeEvent(QCloseEvent* event) override;
+    void dragEnterEvent(QDragEnterEvent* event) override;
+    void dropEvent(QDropEvent* event) override;
+    bool eventFilter(QObject* watched, QEvent* event) override;
+
+private:
+    // Building the window.
+    void createControls();
+    void createMenus();
+    void setTabOrder();
+    void connectHandlers();
+    QLabel* label(const char* name, const char* caption, int left, int top, int width, int height);
+    QPushButton* button(const char* name, const char* caption, int left, int top, int width, int height);
+    QComboBox* fieldCombo(const char* name, int left, int top, int width, int height);
+    QPlainTextEdit* headerBox(const char* name, int left, int top, int width, int height);
+
+    // Opening.
+    bool saveChangesBeforeOpen();
+    void openChosenFile(const std::function<void()>& takeFile, bool removeTabs);
+    void clearWindow();
+    void fillComboBoxes();
+    void fillCombo(QComboBox& combo, ListKind kind);
+    void abandonOpen(const std::exception& error, const Procedure& procedure);
+    void fillWindowFromRecord();
+    void SelectComboItem(QComboBox& combo, const std::string& text);
+    void showCaption();
+    void showRecentFiles();
+    void finishCloseRequestedDuringOpen();
+
+    // Saving.
+    SaveResult checkHeaderAndSave();
+    void showDescriptionTooLong();
+
+    // Field editing.
+    void updateTextField(QLineEdit& box, std::string& field);
+    void updateComboField(QComboBox& combo, std::string& field);
+    void moveFocusOnEnter(QObject* watched);
+    void showLength();
+
+    // Line lists.
+    void FillKeywordList();
+    void FillCommentList();
+    void FillHistoryList();
+    void addLine(StringList& list, const char* prompt, const char* title, const std::string& defaultText);
+    void fillLineList(QListWidget& box, const StringList& list);
+    void editLine(StringList& list, QListWidget& box, const char* prompt, const char* title);
+    void deleteLine(StringList& list, QListWidget& box);
+    void refillLists();
+
+    void editStandardList(ListKind kind, QComboBox& combo, const char* handler);
+    std::optional<std::string> toFile(const std::string& utf8);
+
+    AppState& app_;
+    Services& services_;
+    std::string baseTitle_;
+    std::string newHeaderText_;
+    bool closeRequestedDuringOpen_ = false;
+
+    // The controls, by the names the program has always used.
+    QLabel* Label1;
+    QLineEdit* txPartDescription;
+    QLabel* lblLength;
+    std::array<QLabel*, 4> Label2;
+    QLineEdit* txFileName;
+    QLabel* Label4;
+    QLineEdit* txAuthorRealName;
+    QLabel* Label3;
+    QLineEdit* txAuthorUserName;
+    QComboBox* cbPartTypes;
+    QComboBox* cbLicenses;
+    QPushButton* cmdSetPreferences;
+    QLabel* Label6;
+    QComboBox* cbBFCStatement;
+    QLabel* Label8;
+    QComboBox* cbCategory;
+    QLabel* Label9;
+    QListWidget* lsKeyWords;
+    QPushButton* cmdEdit;
+    QPushButton* cmdAdd;
+    QPushButton* cmdDelete;
+    QLabel* Label11;
+    QListWidget* lsComments;
+    QLabel* Label10;
+    QListWidget* lsHistory;
+    QPushButton* cmdHistoryEdit;
+    QPushButton* cmdHistoryAdd;
+    QPushButton* cmdHistoryDelete;
+    QPushButton* cmdCommentsEdit;
+    QPushButton* cmdCommentsAdd;
+    QPushButton* cmdCommentsDelete;
+    QLabel* Label7;
+    QPlainTextEdit* txNewHeader;
+    QLabel* Label5;
+    QPlainTextEdit* txOldHeader;
+    QLabel* lblStatuszeile;
+    QFrame* Line1;
+    QFrame* Line2;
+
+    QAction* MDateiOeffnen;
+    QAction* MDateiSpeichern;
+    QAction* MDateiBeenden;
+    std::array<QAction*, 11> MRecentFile;
+    QAction* MEditCategory;
+    QAction* MEditPartTyps;
+    QAction* MEditBFCStatement;
+    QAction* MEditLicense;
+    QAction* MEinstellDefault;
+    QAction* MInfo;
+
+    std::unique_ptr<WindowProgress> progress_;
+};

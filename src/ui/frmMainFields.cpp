@@ -1,0 +1,145 @@
+// The single-value header fields: every edit goes into the record at once and recomposes.
+#include <QComboBox>
+#include <QKeyEvent>
+#include <QLabel>
+#include <QLineEdit>
+#include <QListWidget>
+#include <QPlainTextEdit>
+#include <QPushButton>
+
+#include "Composer.h"
+#include "Dialogs.h"
+#include "FileText.h"
+#include "LineLists.h"
+#include "SaveChecks.h"
+#include "frmMain.h"
+
+namespace {
+
+// The widget shows line ends its own way; the saved text is kept beside it.
+QString shownHeader(const std::string& text, TextEncoding encoding)
+{
+    auto shown = ToWidget(text, encoding);
+    shown.replace("\r\n", "\n");
+    return shown;
+}
+
+// Focus that moves to another control of the window, not to a message box or another window.
+bool leftForAnotherControl(QEvent* event)
+{
+    if (event->type() != QEvent::FocusOut)
+        return false;
+    const auto reason = static_cast<QFocusEvent*>(event)->reason();
+    return reason != Qt::ActiveWindowFocusReason && reason != Qt::PopupFocusReason;
+}
+
+} // namespace
+
+void frmMain::connectHandlers()
+{
+    const std::pair<QComboBox*, std::string HeaderData::*> combos[] = {{cbPartTypes, &HeaderData::PartType},
+                                                                      {cbLicenses, &HeaderData::License},
+                                                                      {cbBFCStatement, &HeaderData::Bfc},
+                                                                      {cbCategory, &HeaderData::Category}};
+    for (const auto& [combo, field] : combos)
+        connect(combo, &QComboBox::currentIndexChanged, this, [this, combo = combo, field = field](int index) {
+            if (index >= 0)
+                updateComboField(*combo, app_.Header.*field);
+        });
+    connect(cmdAdd, &QPushButton::clicked, this, [this] {
+        addLine(app_.Header.Keywords, "Please enter your Keyword with comma separated.", "Keywords", "");
+    });
+    connect(cmdEdit, &QPushButton::clicked, this, [this] {
+        editLine(app_.Header.Keywords, *lsKeyWords, "Please change your Keywords like you wish.", "Keywords");
+    });
+    connect(cmdDelete, &QPushButton::clicked, this, [this] { deleteLine(app_.Header.Keywords, *lsKeyWords); });
+    connect(cmdCommentsAdd, &QPushButton::clicked, this,
+            [this] { addLine(app_.Header.Comments, "Please enter your Comment", "Comment", ""); });
+    connect(cmdCommentsEdit, &QPushButton::clicked, this,
+            [this] { editLine(app_.Header.Comments, *lsComments, "Please enter Comments", "Comments"); });
+    connect(cmdCommentsDelete, &QPushButton::clicked, this, [this] { deleteLine(app_.Header.Comments, *lsComments); });
+    connect(cmdHistoryAdd, &QPushButton::clicked, this, [this] {
+        addLine(app_.Header.History, HistoryPrompt, "History",
+                HistoryStub(services_.clock.now(), app_.Prefs.DefaultUserName));
+    });
+    connect(cmdHistoryEdit, &QPushButton::clicked, this,
+            [this] { editLine(app_.Header.History, *lsHistory, HistoryPrompt, "History"); });
+    connect(cmdHistoryDelete, &QPushButton::clicked, this, [this] { deleteLine(app_.Header.History, *lsHistory); });
+    connect(lsKeyWords, &QListWidget::itemDoubleClicked, cmdEdit, [this] { cmdEdit->click(); });
+    connect(lsComments, &QListWidget::itemDoubleClicked, cmdCommentsEdit, [this] { cmdCommentsEdit->click(); });
+    connect(lsHistory, &QListWidget::itemDoubleClicked, cmdHistoryEdit, [this] { cmdHistoryEdit->click(); });
+    connect(cmdSetPreferences, &QPushButton::clicked, this, &frmMain::cmdSetPreferences_Click);
+}
+
+bool frmMain::eventFilter(QObject* watched, QEvent* event)
+{
+    const std::pair<QLineEdit*, std::string HeaderData::*> boxes[] = {
+        {txPartDescription, &HeaderData::PartDescription},
+        {txAuthorRealName, &HeaderData::AuthorRealName},
+        {txAuthorUserName, &HeaderData::AuthorUserName}};
+    if (event->type() == QEvent::KeyPress) {
+        const auto key = static_cast<QKeyEvent*>(event)->key();
+        if (key == Qt::Key_Return || key == Qt::Key_Enter)
+            moveFocusOnEnter(watched); // the key still reaches the control
+    }
+    if (event->type() == QEvent::KeyRelease || leftForAnotherControl(event))
+        for (const auto& [box, field] : boxes)
+            if (watched == box && box->isEnabled())
+                updateTextField(*box, app_.Header.*field);
+    return QMainWindow::eventFilter(watched, event);
+}
+
+void frmMain::moveFocusOnEnter(QObject* watched)
+{
+    const std::pair<QWidget*, QWidget*> chain[] = {
+        {txPartDescription, txAuthorRealName}, {txAuthorRealName, txAuthorUserName}, {txAuthorUserName, cbPartTypes},
+        {cbPartTypes, cbLicenses},             {cbLicenses, cbBFCStatement},         {cbBFCStatement, cbCategory},
+        {cbCategory, lsKeyWords}};
+    for (const auto& [from, to] : chain)
+        if (watched == from)
+            to->setFocus(Qt::TabFocusReason);
+}
+
+void frmMain::updateTextField(QLineEdit& box, std::string& field)
+{
+    const auto bytes = FromWidget(box.text(), app_.Header.Encoding);
+    if (!bytes) {
+        box.setText(ToWidget(field, app_.Header.Encoding));
+        services_.dialogs.message({UnencodableMessage(), ProgramTitle, Buttons::Ok, Icon::Exclamation, Answer::Ok});
+        return;
+    }
+    field = *bytes;
+    MakeNewHeader();
+}
+
+void frmMain::updateComboField(QComboBox& combo, std::string& field)
+{
+    if (const auto bytes = toFile(combo.currentText().toStdString()))
+        field = *bytes;
+    MakeNewHeader();
+}
+
+void frmMain::MakeNewHeader()
+{
+    newHeaderText_ = ComposeHeader(app_.Header);
+    txNewHeader->setPlainText(shownHeader(newHeaderText_, app_.Header.Encoding));
+    if (!app_.Header.Loading)
+        app_.Header.FileChanged = true;
+    showLength();
+}
+
+void frmMain::showLength()
+{
+    const auto length = txPartDescription->text().toUcs4().size();
+    lblLength->setText(QString("Length: %1").arg(length));
+    const bool tooLong = static_cast<std::size_t>(length) > DescriptionLimit;
+    lblLength->setStyleSheet(tooLong ? "background-color: rgb(255, 0, 0);" : "background-color: rgb(0, 255, 0);");
+}
+
+std::optional<std::string> frmMain::toFile(const std::string& utf8)
+{
+    auto bytes = FromUtf8(utf8, app_.Header.Encoding);
+    if (!bytes)
+        services_.dialogs.message({UnencodableMessage(), ProgramTitle, Buttons::Ok, Icon::Exclamation, Answer::Ok});
+    return bytes;
+}

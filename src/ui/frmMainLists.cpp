@@ -1,0 +1,58 @@
+// The keyword, comment and history lists with their Add, Edit and Delete buttons.
+#include <QListWidget>
+
+#include "Dialogs.h"
+#include "FileText.h"
+#include "LineLists.h"
+#include "frmMain.h"
+
+void frmMain::fillLineList(QListWidget& box, const StringList& list)
+{
+    box.clear();
+    for (const auto& entry : list)
+        box.addItem(ToWidget(entry, app_.Header.Encoding));
+}
+
+void frmMain::FillKeywordList() { fillLineList(*lsKeyWords, app_.Header.Keywords); }
+void frmMain::FillCommentList() { fillLineList(*lsComments, app_.Header.Comments); }
+void frmMain::FillHistoryList() { fillLineList(*lsHistory, app_.Header.History); }
+
+void frmMain::refillLists()
+{
+    FillKeywordList();
+    FillCommentList();
+    FillHistoryList();
+}
+
+void frmMain::addLine(StringList& list, const char* prompt, const char* title, const std::string& defaultText)
+{
+    const auto typed = services_.dialogs.input(prompt, title, defaultText);
+    if (const auto bytes = toFile(typed))
+        AddLineEntry(list, *bytes);
+    refillLists();
+    MakeNewHeader();
+}
+
+void frmMain::editLine(StringList& list, QListWidget& box, const char* prompt, const char* title)
+{
+    const int row = box.currentRow();
+    if (row < 0 || box.selectedItems().isEmpty())
+        return;
+    const auto old = ToUtf8(list[static_cast<std::size_t>(row)], app_.Header.Encoding);
+    const auto typed = services_.dialogs.input(prompt, title, old);
+    if (const auto bytes = toFile(typed))
+        EditLineEntry(list, static_cast<std::size_t>(row), *bytes);
+    refillLists();
+    box.setCurrentRow(row);
+    MakeNewHeader();
+}
+
+void frmMain::deleteLine(StringList& list, QListWidget& box)
+{
+    const int row = box.currentRow();
+    if (row < 0 || box.selectedItems().isEmpty())
+        return;
+    DeleteLineEntry(list, static_cast<std::size_t>(row));
+    refillLists();
+    MakeNewHeader();
+}

@@ -1,0 +1,33 @@
+#pragma once
+
+#include <QDialog>
+
+#include "Preferences.h"
+
+class QCheckBox;
+class QComboBox;
+class QLabel;
+class QLineEdit;
+class QPushButton;
+
+// The preferences window: the author's names, default licence and backup choice.
+class frmOption : public QDialog {
+    Q_OBJECT
+
+public:
+    frmOption(const PreferencesForm& form, const QStringList& sortedLicenses, QWidget* parent = nullptr);
+
+    // What the window holds now, for saving.
+    PreferencesForm form() const;
+
+private:
+    QLabel* Label1;
+    QLineEdit* txRealName;
+    QLabel* Label2_0;
+    QLineEdit* txUserName;
+    QPushButton* cmdSave;
+    QPushButton* cmdCancel;
+    QComboBox* cbLicenses;
+    QLabel* Label2_3;
+    QCheckBox* chkBackup;
+};

@@ -1,0 +1,412 @@
+#include <QAction>
+#include <QComboBox>
+#include <QLabel>
+#include <QLineEdit>
+#include <QListWidget>
+#include <QPlainTextEdit>
+#include <QPushButton>
+#include <QKeyEvent>
+#include <QTest>
+
+#include "CliRun.h"
+#include "WindowFixture.h"
+
+namespace {
+
+// Types characters that QTest's ASCII key table does not know.
+void typeText(QWidget* widget, const QString& text)
+{
+    for (const QChar c : text) {
+        QKeyEvent press(QEvent::KeyPress, Qt::Key_unknown, Qt::NoModifier, QString(c));
+        QKeyEvent release(QEvent::KeyRelease, Qt::Key_unknown, Qt::NoModifier, QString(c));
+        QApplication::sendEvent(widget, &press);
+        QApplication::sendEvent(widget, &release);
+    }
+}
+
+TEST_F(WindowTest, StartsWithTheGreetingAndDisabledControls)
+{
+    startUp();
+    EXPECT_EQ(caption(), "Quillmark 1.0.0");
+    EXPECT_EQ(text("lblStatuszeile"), "Welcome to Quillmark programm.");
+    for (const char* name : {"txPartDescription", "txFileName", "txAuthorRealName", "cbPartTypes", "cmdAdd",
+                             "cmdHistoryEdit", "cmdCommentsDelete", "cmdSetPreferences", "txNewHeader"})
+        EXPECT_FALSE(child<QWidget>(name)->isEnabled()) << name;
+    EXPECT_TRUE(child<QWidget>("lsKeyWords")->isEnabled());
+    EXPECT_FALSE(child<QAction>("MDateiSpeichern")->isEnabled());
+    EXPECT_FALSE(child<QAction>("MRecentFile_0")->isVisible());
+    EXPECT_EQ(child<QComboBox>("cbBFCStatement")->count(), 3);
+    EXPECT_EQ(child<QComboBox>("cbBFCStatement")->currentIndex(), -1);
+    EXPECT_EQ(app.Header.FileFolder, app.ProgramFolder);
+}
+
+TEST_F(WindowTest, OpensTheFileNamedOnTheCommandLine)
+{
+    const auto path = part("3001.dat", GoodPart);
+    startUp({QString::fromStdString(path)});
+    EXPECT_EQ(caption(), "Quillmark 1.0.0 [3001.dat]");
+    EXPECT_EQ(text("txPartDescription"), "Brick  2 x 4");
+    EXPECT_EQ(text("txAuthorRealName"), "Sam Sample");
+    EXPECT_EQ(text("txAuthorUserName"), "ssample");
+    EXPECT_EQ(child<QComboBox>("cbPartTypes")->currentText(), "Part");
+    EXPECT_EQ(child<QComboBox>("cbCategory")->currentText(), "Brick");
+    EXPECT_EQ(child<QListWidget>("lsKeyWords")->item(0)->text(), "brick, stud");
+    EXPECT_EQ(text("lblStatuszeile"), "");
+    EXPECT_FALSE(app.Header.FileChanged);
+    EXPECT_FALSE(app.Header.Loading);
+    EXPECT_TRUE(child<QWidget>("txPartDescription")->isEnabled());
+    EXPECT_FALSE(child<QWidget>("txFileName")->isEnabled());
+    EXPECT_EQ(store.read(DefaultGroup, "LastPath", ""), work.path().string());
+    EXPECT_TRUE(child<QAction>("MRecentFile_1")->isVisible());
+    EXPECT_EQ(child<QAction>("MRecentFile_1")->text().toStdString(), path);
+    // The header kept for saving is the composed one, byte for byte.
+    const auto printed = RunCliWith({"print", path}).out;
+    EXPECT_EQ(window->newHeaderText() + app.Header.Body + "\r\n", printed);
+    EXPECT_NE(child<QPlainTextEdit>("txOldHeader")->toPlainText().toStdString().find("0 !KEYWORDS brick, stud"),
+              std::string::npos);
+}
+
+TEST_F(WindowTest, CancelledOpenDialogChangesNothing)
+{
+    startUp({QString::fromStdString(part("3001.dat", GoodPart))});
+    dialogs.expectOpenFile(std::nullopt);
+    window->MDateiOeffnen_Click();
+    ASSERT_EQ(dialogs.fileDialogsShown.size(), 1u);
+    const auto& request = dialogs.fileDialogsShown[0];
+    EXPECT_EQ(request.title, "Load DAT-File");
+    EXPECT_EQ(request.filter, "LDraw DAT-File (*.dat)");
+    EXPECT_EQ(request.defaultSuffix, "dat");
+    EXPECT_EQ(request.startFolder, work.path().string());
+    EXPECT_EQ(caption(), "Quillmark 1.0.0 [3001.dat]");
+    EXPECT_EQ(text("txPartDescription"), "Brick  2 x 4");
+    EXPECT_EQ(app.Header.PartDescription, "Brick  2 x 4");
+}
+
+TEST_F(WindowTest, OpenDialogOpensTheChosenFile)
+{
+    startUp();
+    const auto path = part("other.dat", "0 Other part\r\n0 Name: other.dat\r\n");
+    dialogs.expectOpenFile(path);
+    window->MDateiOeffnen_Click();
+    EXPECT_EQ(caption(), "Quillmark 1.0.0 [other.dat]");
+    EXPECT_EQ(text("txPartDescription"), "Other part");
+    EXPECT_EQ(store.read(DefaultGroup, "LastPath", ""), work.path().string());
+}
+
+TEST_F(WindowTest, RecentFileRoadLeavesLastPathAlone)
+{
+    startUp();
+    window->OpenFile(part("3001.dat", GoodPart));
+    EXPECT_EQ(caption(), "Quillmark 1.0.0 [3001.dat]");
+    EXPECT_FALSE(store.read(DefaultGroup, "LastPath").has_value());
+    EXPECT_EQ(text("txAuthorRealName"), "Sam Sample");
+}
+
+TEST_F(WindowTest, ValuesMissingFromTheListsStayUnselectedButTheHeaderIsComposed)
+{
+    startUp();
+    openThroughPendingFile(part("odd.dat", "0 Odd\r\n0 Author: A [a]\r\n0 !LDRAW_ORG Strange\r\n0 !LICENSE Mine\r\n"
+                                           "0 BFC CW\r\n0 !CATEGORY Nothing\r\n"));
+    for (const char* combo : {"cbPartTypes", "cbLicenses", "cbBFCStatement", "cbCategory"})
+        EXPECT_EQ(child<QComboBox>(combo)->currentIndex(), -1) << combo;
+    EXPECT_NE(window->newHeaderText().find("0 !LDRAW_ORG Strange\r\n"), std::string::npos);
+    EXPECT_NE(child<QPlainTextEdit>("txNewHeader")->toPlainText().toStdString().find("0 !LICENSE Mine"), std::string::npos);
+    EXPECT_FALSE(app.Header.FileChanged);
+}
+
+TEST_F(WindowTest, DuplicateListEntryEndsWithTheLaterSelected)
+{
+    programFolder.write("bfc.txt", "CERTIFY CCW\r\nCERTIFY CCW\r\nNOCERTIFY\r\n");
+    startUp();
+    openThroughPendingFile(part("3001.dat", GoodPart));
+    EXPECT_EQ(child<QComboBox>("cbBFCStatement")->currentIndex(), 1);
+}
+
+TEST_F(WindowTest, TypingRecomposesAndMarksTheFileChanged)
+{
+    startUp();
+    openThroughPendingFile(part("3001.dat", GoodPart));
+    auto* description = child<QLineEdit>("txPartDescription");
+    description->setFocus();
+    description->setCursorPosition(description->text().size());
+    QTest::keyClicks(description, " Extra");
+    EXPECT_EQ(app.Header.PartDescription, "Brick  2 x 4 Extra");
+    EXPECT_TRUE(app.Header.FileChanged);
+    EXPECT_EQ(window->newHeaderText().rfind("0 Brick  2 x 4 Extra\r\n", 0), 0u);
+    EXPECT_EQ(text("lblLength"), "Length: 18");
+    QTest::keyClicks(description, std::string(50, 'x').c_str());
+    EXPECT_EQ(text("lblLength"), "Length: 68");
+    EXPECT_NE(child<QLabel>("lblLength")->styleSheet().indexOf("255, 0, 0"), -1);
+}
+
+TEST_F(WindowTest, PassingThroughABoxMarksTheFileChanged)
+{
+    startUp();
+    openThroughPendingFile(part("3001.dat", GoodPart));
+    auto* userName = child<QLineEdit>("txAuthorUserName");
+    userName->setFocus();
+    QTest::mouseClick(child<QLineEdit>("txAuthorRealName"), Qt::LeftButton);
+    child<QLineEdit>("txAuthorRealName")->setFocus(Qt::MouseFocusReason);
+    EXPECT_TRUE(app.Header.FileChanged);
+}
+
+TEST_F(WindowTest, EnterMovesTheFocusAlongTheFields)
+{
+    startUp();
+    openThroughPendingFile(part("3001.dat", GoodPart));
+    window->activateWindow();
+    const std::pair<const char*, const char*> chain[] = {{"txPartDescription", "txAuthorRealName"},
+                                                         {"txAuthorRealName", "txAuthorUserName"},
+                                                         {"txAuthorUserName", "cbPartTypes"},
+                                                         {"cbCategory", "lsKeyWords"}};
+    for (const auto& [from, to] : chain) {
+        auto* control = child<QWidget>(from);
+        control->setFocus();
+        QTest::keyClick(control, Qt::Key_Return);
+        EXPECT_EQ(QApplication::focusWidget(), child<QWidget>(to)) << from;
+    }
+}
+
+TEST_F(WindowTest, ChoosingAComboEntryWritesItsField)
+{
+    startUp();
+    openThroughPendingFile(part("3001.dat", GoodPart));
+    auto* bfc = child<QComboBox>("cbBFCStatement");
+    bfc->setCurrentIndex(bfc->findText("NOCERTIFY"));
+    EXPECT_EQ(app.Header.Bfc, "NOCERTIFY");
+    EXPECT_NE(window->newHeaderText().find("0 BFC NOCERTIFY\r\n"), std::string::npos);
+    EXPECT_TRUE(app.Header.FileChanged);
+    auto* category = child<QComboBox>("cbCategory");
+    category->setCurrentIndex(category->findText("<none>"));
+    EXPECT_EQ(window->newHeaderText().find("!CATEGORY"), std::string::npos);
+}
+
+class LineListTest : public WindowTest {
+protected:
+    void SetUp() override
+    {
+        startUp();
+        openThroughPendingFile(part("h.dat", "0 H\r\n0 !HISTORY X\r\n0 !HISTORY Y\r\n0 !HISTORY X\r\n"));
+        history = child<QListWidget>("lsHistory");
+    }
+    std::vector<std::string> rows() const
+    {
+        std::vector<std::string> shown;
+        for (int i = 0; i < history->count(); ++i)
+            shown.push_back(history->item(i)->text().toStdString());
+        return shown;
+    }
+    QListWidget* history = nullptr;
+};
+
+TEST_F(LineListTest, EditChangesTheSelectedRowOnly)
+{
+    history->setCurrentRow(2);
+    dialogs.expectInput("  Z ");
+    child<QPushButton>("cmdHistoryEdit")->click();
+    EXPECT_EQ(app.Header.History, (StringList{"X", "Y", "Z"}));
+    EXPECT_EQ(rows(), (std::vector<std::string>{"X", "Y", "Z"}));
+    EXPECT_EQ(dialogs.inputsShown[0].defaultText, "X");
+    EXPECT_EQ(dialogs.inputsShown[0].title, "History");
+    EXPECT_EQ(dialogs.inputsShown[0].prompt,
+              "Please enter !History string in the following format:\r\n'YYYY-MM-DD [Username] what's new/changed'");
+    EXPECT_TRUE(app.Header.FileChanged);
+}
+
+TEST_F(LineListTest, DeleteRemovesTheSelectedRowsEntry)
+{
+    history->setCurrentRow(2);
+    child<QPushButton>("cmdHistoryDelete")->click();
+    EXPECT_EQ(app.Header.History, (StringList{"X", "Y"}));
+    EXPECT_EQ(rows(), (std::vector<std::string>{"X", "Y"}));
+    EXPECT_NE(window->newHeaderText().find("0 !HISTORY X\r\n0 !HISTORY Y\r\n\r\n"), std::string::npos);
+}
+
+TEST_F(LineListTest, NothingSelectedMeansNothingHappens)
+{
+    history->clearSelection();
+    history->setCurrentRow(-1);
+    child<QPushButton>("cmdHistoryEdit")->click();
+    child<QPushButton>("cmdHistoryDelete")->click();
+    EXPECT_FALSE(app.Header.FileChanged);
+}
+
+TEST_F(LineListTest, HistoryAddOffersTodaysStub)
+{
+    app.Prefs.DefaultUserName = "jdoe";
+    clock.set({2008, 3, 5, 10, 0, 0});
+    dialogs.expectInput("2008-03-05 [jdoe] ");
+    child<QPushButton>("cmdHistoryAdd")->click();
+    EXPECT_EQ(dialogs.inputsShown[0].defaultText, "2008-03-05 [jdoe] ");
+    EXPECT_EQ(app.Header.History.back(), "2008-03-05 [jdoe]");
+}
+
+TEST_F(LineListTest, KeywordsAndCommentsAddAsOneEntryEach)
+{
+    dialogs.expectInput("a, b, c");
+    child<QPushButton>("cmdAdd")->click();
+    dialogs.expectInput("   ");
+    child<QPushButton>("cmdCommentsAdd")->click();
+    EXPECT_EQ(app.Header.Keywords, (StringList{"a, b, c"}));
+    EXPECT_TRUE(app.Header.Comments.empty());
+    EXPECT_EQ(dialogs.inputsShown[0].prompt, "Please enter your Keyword with comma separated.");
+    EXPECT_EQ(dialogs.inputsShown[1].title, "Comment");
+    EXPECT_TRUE(app.Header.FileChanged);
+}
+
+TEST_F(WindowTest, SaveRefusesALongDescriptionAndSelectsItsTail)
+{
+    startUp();
+    const auto path = part("3001.dat", GoodPart);
+    openThroughPendingFile(path);
+    auto* description = child<QLineEdit>("txPartDescription");
+    description->setText(QString(70, 'd'));
+    description->setFocus();
+    QTest::keyClick(description, Qt::Key_End);
+    dialogs.expectMessage(Answer::Ok);
+    window->MDateiSpeichern_Click();
+    EXPECT_EQ(dialogs.messages.back().text,
+              "Length of the part description is limited to 64 character!\r\nSaving the file is not possible");
+    EXPECT_EQ(description->selectionStart(), 64);
+    EXPECT_EQ(description->selectedText().size(), 6);
+    EXPECT_EQ(text("lblLength"), "Length: 70");
+    EXPECT_EQ(ReadBytes(path), GoodPart);
+}
+
+TEST_F(WindowTest, SaveWritesTheComposedHeaderAndBackup)
+{
+    startUp();
+    const auto path = part("3001.dat", GoodPart);
+    openThroughPendingFile(path);
+    auto* bfc = child<QComboBox>("cbBFCStatement");
+    bfc->setCurrentIndex(bfc->findText("CERTIFY CW"));
+    window->MDateiSpeichern_Click();
+    EXPECT_FALSE(app.Header.FileChanged);
+    EXPECT_EQ(ReadBytes(path), window->newHeaderText() + app.Header.Body + "\r\n");
+    EXPECT_EQ(ReadBytes(work.file("3001_Backup_2008-08-10_14-05-09.dat")), GoodPart);
+}
+
+TEST_F(WindowTest, CloseQuestionsThreeAnswers)
+{
+    startUp();
+    const auto path = part("3001.dat", GoodPart);
+    openThroughPendingFile(path);
+    window->show();
+    app.Header.FileChanged = true;
+    dialogs.expectMessage(Answer::Cancel);
+    EXPECT_FALSE(window->close());
+    EXPECT_EQ(dialogs.messages.back().title, "File Changed");
+    EXPECT_EQ(dialogs.messages.back().text, "Do you want to save the changes to the file?");
+    EXPECT_EQ(dialogs.messages.back().buttons, Buttons::YesNoCancel);
+
+    // Yes saves without the checks: a header without BFC statement is written as it is.
+    app.Header.Bfc.clear();
+    window->MakeNewHeader();
+    dialogs.expectMessage(Answer::Yes);
+    EXPECT_TRUE(window->close());
+    EXPECT_EQ(ReadBytes(path).find("BFC"), std::string::npos);
+
+    window->show();
+    app.Header.FileChanged = true;
+    dialogs.expectMessage(Answer::No);
+    EXPECT_TRUE(window->close());
+}
+
+TEST_F(WindowTest, CloseQuestionsYesKeepsTheWindowWhenTheSaveFails)
+{
+    startUp();
+    const auto path = part("3001.dat", GoodPart);
+    openThroughPendingFile(path);
+    window->show();
+    app.Header.FileChanged = true;
+    std::filesystem::remove(path); // with backups on, a missing file cannot be saved
+    dialogs.expectMessage(Answer::Yes);
+    dialogs.expectMessage(Answer::Ok);
+    EXPECT_FALSE(window->close());
+    EXPECT_EQ(dialogs.messages.back().text, "Error 53 (File not found) in procedure FileSave of Module modQuillmark");
+    EXPECT_TRUE(app.Header.FileChanged);
+}
+
+TEST_F(WindowTest, RefusedSaveStopsTheOpenAndKeepsTheEdits)
+{
+    startUp();
+    openThroughPendingFile(part("3001.dat", GoodPart));
+    child<QLineEdit>("txAuthorRealName")->setText("");
+    app.Header.AuthorRealName.clear();
+    app.Header.FileChanged = true;
+    dialogs.expectMessage(Answer::Ok);
+    openThroughPendingFile(part("other.dat", "0 Other\r\n"));
+    EXPECT_EQ(dialogs.messages.back().text, "You need to mention the Author!\r\nSaving the file is not possible");
+    EXPECT_EQ(caption(), "Quillmark 1.0.0 [3001.dat]");
+    EXPECT_EQ(text("txPartDescription"), "Brick  2 x 4");
+    EXPECT_TRUE(app.Header.FileChanged);
+}
+
+TEST_F(WindowTest, RecentRoadAsksFirstAndItsNoDiscards)
+{
+    startUp();
+    openThroughPendingFile(part("3001.dat", GoodPart));
+    app.Header.FileChanged = true;
+    const auto other = part("other.dat", "0 Other\r\n");
+    dialogs.expectMessage(Answer::Cancel);
+    window->OpenFile(other);
+    EXPECT_EQ(dialogs.messages.back().title, "Current File has changed");
+    EXPECT_EQ(caption(), "Quillmark 1.0.0 [3001.dat]");
+    dialogs.expectMessage(Answer::No);
+    window->OpenFile(other);
+    EXPECT_EQ(caption(), "Quillmark 1.0.0 [other.dat]");
+    EXPECT_FALSE(app.Header.FileChanged);
+}
+
+TEST_F(WindowTest, TabsInTheDescriptionAreRemovedOnOpen)
+{
+    startUp();
+    dialogs.expectMessage(Answer::Ok);
+    openThroughPendingFile(part("tab.dat", "0 Brick\t2 x 4\r\n"));
+    EXPECT_EQ(text("txPartDescription"), "Brick2 x 4");
+    EXPECT_EQ(window->newHeaderText().rfind("0 Brick2 x 4\r\n", 0), 0u);
+    EXPECT_FALSE(app.Header.FileChanged);
+}
+
+TEST_F(WindowTest, Latin1FileRefusesCharactersItCannotHold)
+{
+    startUp();
+    const auto path = part("latin.dat", "0 Cran creus\xe9\r\n0 Author: A [a]\r\n");
+    openThroughPendingFile(path);
+    EXPECT_EQ(text("txPartDescription"), "Cran creus\u00e9");
+    auto* description = child<QLineEdit>("txPartDescription");
+    description->setFocus();
+    description->setCursorPosition(description->text().size());
+    dialogs.expectMessage(Answer::Ok);
+    typeText(description, QString::fromUtf8("\u20ac"));
+    EXPECT_EQ(app.Header.PartDescription, "Cran creus\xe9");
+    EXPECT_EQ(description->text().toStdString(), "Cran creus\u00e9");
+    QTest::keyClicks(description, "!");
+    EXPECT_EQ(app.Header.PartDescription, "Cran creus\xe9!");
+}
+
+TEST_F(WindowTest, AboutBoxNamesTheVersion)
+{
+    startUp();
+    dialogs.expectMessage(Answer::Ok);
+    window->MInfo_Click();
+    const auto& box = dialogs.messages.back();
+    EXPECT_EQ(box.text.rfind("Quillmark Version: 1.0.0\r\nCopyright ", 0), 0u);
+    EXPECT_EQ(box.icon, Icon::Information);
+    EXPECT_EQ(box.title, "Quillmark");
+}
+
+TEST_F(WindowTest, MillionLineFileOpens)
+{
+    std::string big = "0 Big\r\n0 Author: A [a]\r\n";
+    big.reserve(30'000'000);
+    for (int i = 0; i < 1'000'000; ++i)
+        big += "4 16 1 2 3 4 5 6 7 8 9 10 11 12\r\n";
+    startUp();
+    openThroughPendingFile(part("big.dat", big));
+    EXPECT_EQ(text("txPartDescription"), "Big");
+    EXPECT_EQ(app.Header.Body.size(), big.size() - 24 - 2);
+    EXPECT_FALSE(app.Header.Loading);
+}
+
+} // namespace

@@ -1,0 +1,61 @@
+#include "WindowFixture.h"
+
+#include <QLabel>
+#include <QLineEdit>
+#include <filesystem>
+
+const std::string GoodPart = "0 Brick  2 x 4\r\n0 Name: 3001.dat\r\n0 Author: Sam Sample [ssample]\r\n"
+                             "0 !LDRAW_ORG Part UPDATE 2004-01\r\n"
+                             "0 !LICENSE Licensed under CC BY 4.0 : see CAreadme.txt\r\n\r\n"
+                             "0 BFC CERTIFY CCW\r\n\r\n0 !CATEGORY Brick\r\n0 !KEYWORDS brick, stud\r\n\r\n"
+                             "0 !HISTORY 2004-01-01 [ssample] made\r\n0 // a comment\r\n\r\n"
+                             "1 16 0 0 0 1 0 0 0 1 0 0 0 1 stud.dat\r\n";
+
+WindowTest::WindowTest()
+{
+    for (const char* list : {"category.txt", "parttype.txt", "bfc.txt", "licenses.txt"})
+        std::filesystem::copy_file(std::filesystem::path(QUILLMARK_PROGRAM_FOLDER) / list, programFolder.path() / list);
+    app.ProgramFolder = programFolder.path().string();
+}
+
+WindowTest::~WindowTest()
+{
+    if (window) {
+        app.Header.FileChanged = false; // no close question when the test is over
+        window->close();
+    }
+    EXPECT_TRUE(dialogs.scriptUsedUp()) << "a scripted answer was not used";
+}
+
+void WindowTest::startUp(const QStringList& arguments)
+{
+    window = std::make_unique<frmMain>(app, services);
+    window->StartUp(arguments);
+}
+
+void WindowTest::openThroughPendingFile(const std::string& path)
+{
+    app.PendingFile = path;
+    window->MDateiOeffnen_Click();
+}
+
+std::string WindowTest::text(const char* name) const
+{
+    if (auto* box = window->findChild<QLineEdit*>(name))
+        return box->text().toStdString();
+    if (auto* label = window->findChild<QLabel*>(name))
+        return label->text().toStdString();
+    ADD_FAILURE() << "no text control " << name;
+    return {};
+}
+
+void WindowTest::pollForDialog(std::function<bool(QWidget*)> act)
+{
+    auto* timer = new QTimer(window.get());
+    timer->setInterval(10);
+    QObject::connect(timer, &QTimer::timeout, timer, [timer, act] {
+        if (auto* modal = QApplication::activeModalWidget(); modal && act(modal))
+            timer->deleteLater();
+    });
+    timer->start();
+}

@@ -1,0 +1,64 @@
+#pragma once
+
+#include <QApplication>
+#include <QTimer>
+#include <functional>
+#include <gtest/gtest.h>
+#include <memory>
+
+#include "AppState.h"
+#include "FixedClock.h"
+#include "IniSettingsStore.h"
+#include "ScriptedDialogs.h"
+#include "TempDir.h"
+#include "frmMain.h"
+
+// The real main window over a program folder with the default list files, a settings file and
+// part files of its own, talking to the user through scripted dialogs.
+class WindowTest : public ::testing::Test {
+protected:
+    WindowTest();
+    ~WindowTest() override;
+
+    void startUp(const QStringList& arguments = {});
+    // Writes a part file into the work folder and returns its path.
+    std::string part(const std::string& name, const std::string& bytes) const { return work.write(name, bytes); }
+    void openThroughPendingFile(const std::string& path);
+
+    template <typename T>
+    T* child(const char* name) const
+    {
+        auto* found = window->findChild<T*>(name);
+        EXPECT_NE(found, nullptr) << name;
+        return found;
+    }
+    std::string caption() const { return window->windowTitle().toStdString(); }
+    std::string text(const char* name) const;
+    // Runs act on the next modal dialog of type T once it shows, while the caller's exec() waits.
+    template <typename T>
+    void whenDialogShows(std::function<void(T&)> act)
+    {
+        pollForDialog([act](QWidget* modal) {
+            auto* dialog = qobject_cast<T*>(modal);
+            if (dialog == nullptr)
+                return false;
+            act(*dialog);
+            return true;
+        });
+    }
+
+    TempDir programFolder;
+    TempDir work;
+    IniSettingsStore store{work.file("Quillmark.ini")};
+    ScriptedDialogs dialogs;
+    FixedClock clock;
+    Services services{store, dialogs, clock};
+    AppState app;
+    std::unique_ptr<frmMain> window;
+
+private:
+    void pollForDialog(std::function<bool(QWidget*)> act);
+};
+
+// A small, complete part file.
+extern const std::string GoodPart;
