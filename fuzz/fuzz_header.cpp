@@ -10,21 +10,10 @@
 #include "ParseProgress.h"
 #include "Parser.h"
 
-namespace {
-
-class SilentDialogs : public Dialogs {
-public:
-    Answer message(const MessageBox&) override { return Answer::Ok; }
-    std::string input(const std::string&, const std::string&, const std::string&) override { return {}; }
-    std::optional<std::string> openFile(const OpenFileRequest&) override { return std::nullopt; }
-};
-
-} // namespace
-
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size)
 {
     HeaderData header;
-    SilentDialogs dialogs;
+    DefaultAnswers dialogs;
     ParseProgress progress;
     ParsePartFileContent(header, std::string_view(reinterpret_cast<const char*>(data), size), dialogs, progress);
     header.AuthorRealName = header.ParsedRealName;

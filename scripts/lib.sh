@@ -25,8 +25,6 @@ ensure_packages() {
 configure_and_build() {
     local build_dir="$1"
     shift
-    if [ ! -f "$build_dir/build.ninja" ]; then
-        cmake -S "$QUILLMARK_ROOT" -B "$build_dir" -G Ninja "$@" >&2
-    fi
+    cmake -S "$QUILLMARK_ROOT" -B "$build_dir" -G Ninja "$@" >&2
     cmake --build "$build_dir" >&2
 }

@@ -1,5 +1,7 @@
 // Quillmark: the window program.
 #include <QApplication>
+
+#include "EventLoop.h"
 #include <QFont>
 
 #include "AppState.h"
@@ -10,6 +12,7 @@
 
 int main(int argc, char** argv)
 {
+    UseLeanEventLoop();
     QApplication application(argc, argv); // takes Qt's own options (-platform, -style, ...) out of argv
     // The windows were drawn for a small dialog font; larger ones would not fit their fixed places.
     QFont font = QApplication::font();

@@ -43,3 +43,12 @@ public:
 MessageBox StopBox(std::string text);
 MessageBox InformationBox(std::string text);
 MessageBox QuestionBox(std::string text, std::string title);
+
+// Answers every box with its default button and cancels every input and file dialog: for runs
+// where nobody is there to ask, such as measuring and fuzzing.
+class DefaultAnswers : public Dialogs {
+public:
+    Answer message(const MessageBox& box) override { return box.defaultButton; }
+    std::string input(const std::string&, const std::string&, const std::string&) override { return {}; }
+    std::optional<std::string> openFile(const OpenFileRequest&) override { return std::nullopt; }
+};

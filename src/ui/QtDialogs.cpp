@@ -72,6 +72,8 @@ std::string QtDialogs::input(const std::string& prompt, const std::string& title
 std::optional<std::string> QtDialogs::openFile(const OpenFileRequest& request)
 {
     QFileDialog dialog(parent_, text(request.title), text(request.startFolder), text(request.filter));
+    // Qt's own dialog works with every event loop and desktop.
+    dialog.setOption(QFileDialog::DontUseNativeDialog);
     dialog.setFileMode(QFileDialog::ExistingFile);
     dialog.setAcceptMode(QFileDialog::AcceptOpen);
     dialog.setDefaultSuffix(text(request.defaultSuffix));

@@ -13,18 +13,11 @@
 
 namespace {
 
-// Real files raise information boxes (TABs in a description, an empty file); they are answered OK.
-class AnsweringDialogs : public Dialogs {
-public:
-    Answer message(const MessageBox&) override { return Answer::Ok; }
-    std::string input(const std::string&, const std::string&, const std::string&) override { return {}; }
-    std::optional<std::string> openFile(const OpenFileRequest&) override { return std::nullopt; }
-};
 
 std::string savedBytes(const std::string& path, const std::string& content)
 {
     HeaderData header;
-    AnsweringDialogs dialogs;
+    DefaultAnswers dialogs;
     ParseProgress progress;
     OpenPartFileContent(header, path, content, dialogs, progress);
     return ComposeHeader(header) + header.Body + "\r\n";
@@ -99,7 +92,7 @@ TEST(Corpus, NothingOfTheBodyIsLost)
     for (const auto& file : files) {
         const auto content = ReadWholeFile(file.string());
         HeaderData header;
-        AnsweringDialogs dialogs;
+        DefaultAnswers dialogs;
         ParseProgress progress;
         OpenPartFileContent(header, file.string(), content, dialogs, progress);
         EXPECT_TRUE(containsInOrder(header.Body, nonEmptyLinesAfterTheHeader(content))) << file;

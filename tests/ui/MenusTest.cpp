@@ -1,1 +1,274 @@
+#include <QAction>
+#include <QCheckBox>
+#include <QComboBox>
+#include <QDropEvent>
+#include <QLineEdit>
+#include <QListWidget>
+#include <QMimeData>
+#include <QPushButton>
+#include <filesystem>
+
+#include "StandardLists.h"
 #include "WindowFixture.h"
+#include "frmList.h"
+#include "frmOption.h"
+
+namespace {
+
+QStringList rowsOf(QListWidget& list)
+{
+    QStringList rows;
+    for (int i = 0; i < list.count(); ++i)
+        rows << list.item(i)->text();
+    return rows;
+}
+
+void clickRow(QListWidget& list, const QString& text)
+{
+    const auto items = list.findItems(text, Qt::MatchExactly);
+    ASSERT_FALSE(items.isEmpty()) << text.toStdString();
+    list.setCurrentItem(items.first());
+    emit list.itemClicked(items.first());
+}
+
+class ListMenuTest : public WindowTest {
+protected:
+    void SetUp() override
+    {
+        startUp();
+        openThroughPendingFile(part("3001.dat", GoodPart));
+    }
+    std::string listFile(ListKind kind) const { return ReadBytes(ListFilePath(app.ProgramFolder, kind)); }
+};
+
+TEST_F(ListMenuTest, CategoryWarningsNoOpensNothing)
+{
+    const auto before = listFile(ListKind::Category);
+    dialogs.expectMessage(Answer::No);
+    window->MEditCategory_Click();
+    const auto& box = dialogs.messages.back();
+    EXPECT_EQ(box.title, "Category Change");
+    EXPECT_EQ(box.icon, Icon::Exclamation);
+    EXPECT_EQ(box.defaultButton, Answer::No);
+    EXPECT_EQ(box.text, "To change the category can result in an non LDraw conform part. Please change the category "
+                        "only if there is an official statement from LSC.\r\nDo you want to proceed?");
+    EXPECT_EQ(listFile(ListKind::Category), before);
+    EXPECT_EQ(child<QComboBox>("cbCategory")->currentText(), "Brick");
+}
+
+TEST_F(ListMenuTest, AddingACategoryWritesTheFileAndRefillsTheList)
+{
+    dialogs.expectMessage(Answer::Yes);
+    dialogs.expectInput("  technic BEAM ");
+    dialogs.expectMessage(Answer::Yes);
+    QString title;
+    whenDialogShows<frmList>([&](frmList& dialog) {
+        title = dialog.windowTitle();
+        dialog.findChild<QPushButton*>("cmdAdd")->click();
+        EXPECT_TRUE(rowsOf(*dialog.findChild<QListWidget*>("lsValues")).contains("Technic Beam"));
+        dialog.findChild<QPushButton*>("cmdClose")->click();
+    });
+    window->MEditCategory_Click();
+    EXPECT_EQ(title, "List Category");
+    EXPECT_EQ(dialogs.messages.back().title, "Changed Categories");
+    EXPECT_NE(listFile(ListKind::Category).find("Technic\r\nTechnic Beam\r\nTile\r\n"), std::string::npos);
+    auto* combo = child<QComboBox>("cbCategory");
+    EXPECT_NE(combo->findText("Technic Beam"), -1);
+    EXPECT_EQ(combo->currentIndex(), -1);
+    EXPECT_EQ(app.Header.Category, "Brick");
+}
+
+TEST_F(ListMenuTest, NoneIsNeverDeletedAndNoKeepsTheFile)
+{
+    const auto before = listFile(ListKind::Category);
+    dialogs.expectMessage(Answer::Yes);
+    dialogs.expectMessage(Answer::Ok);
+    dialogs.expectMessage(Answer::No);
+    whenDialogShows<frmList>([&](frmList& dialog) {
+        auto* values = dialog.findChild<QListWidget*>("lsValues");
+        clickRow(*values, "<none>");
+        dialog.findChild<QPushButton*>("cmdDelete")->click();
+        clickRow(*values, "Znap");
+        EXPECT_EQ(dialog.findChild<QLineEdit*>("txUpdate")->text(), "Znap");
+        dialog.findChild<QPushButton*>("cmdDelete")->click();
+        EXPECT_FALSE(rowsOf(*values).contains("Znap"));
+        dialog.findChild<QPushButton*>("cmdClose")->click();
+    });
+    window->MEditCategory_Click();
+    EXPECT_EQ(dialogs.messages[1].text, "The entry '<none>' is not allowd to delete.");
+    EXPECT_EQ(listFile(ListKind::Category), before);
+}
+
+TEST_F(ListMenuTest, LicenceDeletionIsSavedAndTheRecordKeepsItsLicence)
+{
+    dialogs.expectMessage(Answer::Yes);
+    whenDialogShows<frmList>([&](frmList& dialog) {
+        EXPECT_EQ(dialog.windowTitle(), "List License Types");
+        clickRow(*dialog.findChild<QListWidget*>("lsValues"), "Marked with CC0 1.0 : see CAreadme.txt");
+        dialog.findChild<QPushButton*>("cmdDelete")->click();
+        dialog.findChild<QPushButton*>("cmdClose")->click();
+    });
+    window->MEditLicense_Click();
+    EXPECT_EQ(listFile(ListKind::License).find("CC0"), std::string::npos);
+    EXPECT_EQ(child<QComboBox>("cbLicenses")->count(), 4);
+    EXPECT_EQ(app.Header.License, "Licensed under CC BY 4.0 : see CAreadme.txt");
+}
+
+TEST_F(ListMenuTest, UpdateReplacesTheSelectedBfcStatement)
+{
+    dialogs.expectMessage(Answer::Yes);
+    whenDialogShows<frmList>([&](frmList& dialog) {
+        clickRow(*dialog.findChild<QListWidget*>("lsValues"), "NOCERTIFY");
+        auto* update = dialog.findChild<QLineEdit*>("txUpdate");
+        update->setText("");
+        emit update->textEdited("certify ccw noclip");
+        dialog.findChild<QPushButton*>("cmdChange")->click();
+        dialog.findChild<QPushButton*>("cmdClose")->click();
+    });
+    window->MEditBFCStatement_Click();
+    EXPECT_EQ(listFile(ListKind::Bfc), "CERTIFY CCW\r\nCERTIFY CCW NOCLIP\r\nCERTIFY CW\r\n");
+}
+
+TEST_F(ListMenuTest, UnchangedPartTypeListClosesWithoutQuestion)
+{
+    whenDialogShows<frmList>([&](frmList& dialog) { dialog.findChild<QPushButton*>("cmdClose")->click(); });
+    window->MEditPartTyps_Click();
+    EXPECT_EQ(child<QComboBox>("cbPartTypes")->currentIndex(), -1);
+    EXPECT_EQ(app.Header.PartType, "Part");
+}
+
+TEST_F(WindowTest, PreferencesWindowWithAnEmptyStore)
+{
+    startUp();
+    whenDialogShows<frmOption>([&](frmOption& dialog) {
+        EXPECT_EQ(dialog.windowTitle(), "Preferences");
+        EXPECT_EQ(dialog.findChild<QLineEdit*>("txRealName")->text(), "");
+        EXPECT_EQ(dialog.findChild<QComboBox*>("cbLicenses")->currentIndex(), -1);
+        EXPECT_TRUE(dialog.findChild<QCheckBox*>("chkBackup")->isChecked());
+        dialog.findChild<QLineEdit*>("txRealName")->setText("  Jane Doe ");
+        dialog.findChild<QPushButton*>("cmdSave")->click();
+    });
+    window->MEinstellDefault_Click();
+    EXPECT_EQ(store.read(DefaultGroup, "RealName", ""), "Jane Doe");
+    EXPECT_EQ(store.read(DefaultGroup, "Liscense", "?"), "");
+    EXPECT_EQ(store.read(DefaultGroup, "Backup", ""), "True");
+}
+
+TEST_F(WindowTest, PreferencesWindowAppliesTheStoredBackupChoiceEvenWhenCancelled)
+{
+    store.write(DefaultGroup, "Backup", "False");
+    store.write(DefaultGroup, "UserName", "jdoe");
+    store.write(DefaultGroup, "Liscense", "Marked with CC0 1.0 : see CAreadme.txt");
+    startUp();
+    EXPECT_FALSE(app.Prefs.MakeBackup) << "start-up reads the stored choice";
+    app.Prefs.MakeBackup = true;
+    whenDialogShows<frmOption>([&](frmOption& dialog) {
+        EXPECT_EQ(dialog.findChild<QLineEdit*>("txUserName")->text(), "jdoe");
+        EXPECT_EQ(dialog.findChild<QComboBox*>("cbLicenses")->currentText(), "Marked with CC0 1.0 : see CAreadme.txt");
+        EXPECT_FALSE(dialog.findChild<QCheckBox*>("chkBackup")->isChecked());
+        dialog.findChild<QPushButton*>("cmdCancel")->click();
+    });
+    window->MEinstellDefault_Click();
+    EXPECT_FALSE(app.Prefs.MakeBackup);
+    EXPECT_EQ(app.Prefs.DefaultLicense, "Marked with CC0 1.0 : see CAreadme.txt");
+}
+
+TEST_F(WindowTest, SetPreferencesPutsTheDefaultsIntoTheHeader)
+{
+    store.write(DefaultGroup, "RealName", "Jane Doe");
+    store.write(DefaultGroup, "UserName", "jdoe");
+    store.write(DefaultGroup, "Liscense", "Marked with CC0 1.0 : see CAreadme.txt");
+    startUp();
+    openThroughPendingFile(part("3001.dat", GoodPart));
+    dialogs.expectMessage(Answer::Yes);
+    window->cmdSetPreferences_Click();
+    EXPECT_EQ(dialogs.messages.back().title, "Default Values");
+    EXPECT_EQ(app.Header.AuthorRealName, "Jane Doe");
+    EXPECT_EQ(app.Header.AuthorUserName, "jdoe");
+    EXPECT_EQ(app.Header.License, "Marked with CC0 1.0 : see CAreadme.txt");
+    EXPECT_EQ(child<QComboBox>("cbLicenses")->currentText(), "Marked with CC0 1.0 : see CAreadme.txt");
+    EXPECT_NE(window->newHeaderText().find("0 Author: Jane Doe [jdoe]\r\n"), std::string::npos);
+    EXPECT_TRUE(app.Header.FileChanged);
+}
+
+TEST_F(WindowTest, SetPreferencesKeepsALicenceThatNoEntryMatches)
+{
+    store.write(DefaultGroup, "RealName", "Jane Doe");
+    store.write(DefaultGroup, "Liscense", "Unknown licence");
+    startUp();
+    openThroughPendingFile(part("3001.dat", GoodPart));
+    dialogs.expectMessage(Answer::No);
+    window->cmdSetPreferences_Click();
+    EXPECT_EQ(app.Header.AuthorRealName, "Sam Sample");
+    dialogs.expectMessage(Answer::Yes);
+    window->cmdSetPreferences_Click();
+    EXPECT_EQ(app.Header.AuthorRealName, "Jane Doe");
+    EXPECT_EQ(app.Header.AuthorUserName, "");
+    EXPECT_EQ(app.Header.License, "Licensed under CC BY 4.0 : see CAreadme.txt");
+}
+
+TEST_F(WindowTest, RecentFilesMenuNewestFirstAndAClickOpens)
+{
+    startUp();
+    const auto a = part("a.dat", "0 A\r\n"), b = part("b.dat", "0 B\r\n"), c = part("c.dat", "0 C\r\n");
+    for (const auto& path : {a, b, c})
+        openThroughPendingFile(path);
+    EXPECT_EQ(child<QAction>("MRecentFile_1")->text().toStdString(), c);
+    EXPECT_EQ(child<QAction>("MRecentFile_3")->text().toStdString(), a);
+    EXPECT_FALSE(child<QAction>("MRecentFile_4")->isVisible());
+    child<QAction>("MRecentFile_3")->trigger();
+    EXPECT_EQ(text("txPartDescription"), "A");
+    EXPECT_EQ(child<QAction>("MRecentFile_1")->text().toStdString(), c);
+}
+
+TEST_F(WindowTest, RecentFileThatWasDeletedIsReportedAndStays)
+{
+    startUp();
+    const auto a = part("a.dat", "0 A\r\n"), b = part("b.dat", "0 B\r\n");
+    openThroughPendingFile(a);
+    openThroughPendingFile(b);
+    std::filesystem::remove(a);
+    dialogs.expectMessage(Answer::Ok);
+    dialogs.expectMessage(Answer::Ok);
+    child<QAction>("MRecentFile_2")->trigger();
+    EXPECT_EQ(dialogs.messages.back().text, "File " + a + " not found!");
+    EXPECT_EQ(child<QAction>("MRecentFile_2")->text().toStdString(), a);
+    EXPECT_EQ(caption(), "Quillmark 1.0.0 [a.dat]");
+}
+
+TEST_F(WindowTest, RecentFilesFromAnEarlierRunShowAtStartUp)
+{
+    store.write(RecentFilesGroup, "RecentFile1", "/parts/x.dat");
+    store.write(RecentFilesGroup, "RecentFile2", "/parts/y.dat");
+    startUp();
+    EXPECT_TRUE(child<QAction>("MRecentFile_0")->isVisible());
+    EXPECT_EQ(child<QAction>("MRecentFile_2")->text(), "/parts/y.dat");
+}
+
+// A drag that enters the window and is dropped there, as the window system delivers it.
+void drop(QWidget& target, QMimeData& data)
+{
+    QDragEnterEvent enter(QPoint(10, 10), Qt::CopyAction, &data, Qt::LeftButton, Qt::NoModifier);
+    QApplication::sendEvent(&target, &enter);
+    QDropEvent event(QPointF(10, 10), Qt::CopyAction, &data, Qt::LeftButton, Qt::NoModifier);
+    QApplication::sendEvent(&target, &event);
+}
+
+TEST_F(WindowTest, DroppingFilesOpensTheFirst)
+{
+    startUp();
+    const auto a = part("a.dat", "0 A\r\n"), b = part("b.dat", "0 B\r\n"), c = part("c.dat", "0 C\r\n");
+    QMimeData files;
+    files.setUrls({QUrl::fromLocalFile(QString::fromStdString(a)), QUrl::fromLocalFile(QString::fromStdString(b)),
+                   QUrl::fromLocalFile(QString::fromStdString(c))});
+    drop(*window, files);
+    EXPECT_EQ(caption(), "Quillmark 1.0.0 [a.dat]");
+    EXPECT_EQ(store.read(DefaultGroup, "LastPath", ""), work.path().string());
+
+    QMimeData text;
+    text.setText(QString::fromStdString(b));
+    drop(*window, text);
+    EXPECT_EQ(caption(), "Quillmark 1.0.0 [a.dat]");
+}
+
+} // namespace
