@@ -4,13 +4,16 @@
 
 namespace {
 
-std::string recentKey(int number) { return "RecentFile" + std::to_string(number); }
+std::string recentKey(int number)
+{
+    std::string key = "RecentFile";
+    return key.append(std::to_string(number));
+}
 
 } // namespace
 
 RecentFilesMenu::RecentFilesMenu()
 {
-    MRecentFile[0].caption = "-";
     for (int i = 1; i <= 10; ++i)
         MRecentFile[static_cast<std::size_t>(i)].caption = recentKey(i);
 }

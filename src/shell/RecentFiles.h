@@ -5,7 +5,7 @@
 
 class SettingsStore;
 
-// The recent-files items at the end of the File menu: item 0 is the separator, items 1 to 10
+// The recent-files items at the end of the File menu: item 0 is the separator (no caption), items 1 to 10
 // show one path each. The window mirrors this model.
 struct RecentFileItem {
     bool visible = false;
