@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QWidget>
+#include <initializer_list>
 
 // The windows were laid out in twips; at 15 twips per pixel.
 constexpr int Pixels(int twips) { return twips / 15; }
@@ -13,4 +14,27 @@ Widget* PlaceChild(QWidget* parent, const char* name, int left, int top, int wid
     widget->setObjectName(name);
     widget->setGeometry(Pixels(left), Pixels(top), Pixels(width), Pixels(height));
     return widget;
+}
+
+// The same for a control that shows a caption (label, button, check box, frame).
+template <typename Widget>
+Widget* PlaceCaptioned(QWidget* parent, const char* name, const char* caption, int left, int top, int width, int height)
+{
+    auto* widget = PlaceChild<Widget>(parent, name, left, top, width, height);
+    if constexpr (requires { widget->setTitle(caption); })
+        widget->setTitle(caption);
+    else
+        widget->setText(caption);
+    return widget;
+}
+
+// The order in which Tab moves through the controls.
+inline void ChainTabOrder(std::initializer_list<QWidget*> order)
+{
+    const QWidget* previous = nullptr;
+    for (QWidget* widget : order) {
+        if (previous)
+            QWidget::setTabOrder(const_cast<QWidget*>(previous), widget);
+        previous = widget;
+    }
 }

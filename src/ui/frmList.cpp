@@ -17,25 +17,15 @@ frmList::frmList(ListKind kind, const StringList& entries, const std::string& pr
     setWindowTitle(QString("List") + InfoOf(kind).captionSuffix);
     setModal(true);
     setFixedSize(Pixels(6645), Pixels(4155));
-    Frame1 = PlaceChild<QGroupBox>(this, "Frame1", 120, 840, 4935, 3255);
-    Frame1->setTitle("Current Values");
+    Frame1 = PlaceCaptioned<QGroupBox>(this, "Frame1", "Current Values", 120, 840, 4935, 3255);
     lsValues = PlaceChild<QListWidget>(Frame1, "lsValues", 120, 240, 4695, 2790);
-    cmdChange = PlaceChild<QPushButton>(this, "cmdChange", 5160, 480, 1335, 375);
-    cmdChange->setText("Update");
-    cmdAdd = PlaceChild<QPushButton>(this, "cmdAdd", 5160, 1200, 1335, 375);
-    cmdAdd->setText("Add");
-    cmdClose = PlaceChild<QPushButton>(this, "cmdClose", 5160, 2160, 1335, 375);
-    cmdClose->setText("Close");
+    cmdChange = PlaceCaptioned<QPushButton>(this, "cmdChange", "Update", 5160, 480, 1335, 375);
+    cmdAdd = PlaceCaptioned<QPushButton>(this, "cmdAdd", "Add", 5160, 1200, 1335, 375);
+    cmdClose = PlaceCaptioned<QPushButton>(this, "cmdClose", "Close", 5160, 2160, 1335, 375);
     cmdClose->setDefault(true);
     txUpdate = PlaceChild<QLineEdit>(this, "txUpdate", 240, 480, 4695, 285);
-    cmdDelete = PlaceChild<QPushButton>(this, "cmdDelete", 5160, 1680, 1335, 375);
-    cmdDelete->setText("Delete");
-    QWidget::setTabOrder(Frame1, lsValues);
-    QWidget::setTabOrder(lsValues, cmdChange);
-    QWidget::setTabOrder(cmdChange, cmdAdd);
-    QWidget::setTabOrder(cmdAdd, cmdClose);
-    QWidget::setTabOrder(cmdClose, txUpdate);
-    QWidget::setTabOrder(txUpdate, cmdDelete);
+    cmdDelete = PlaceCaptioned<QPushButton>(this, "cmdDelete", "Delete", 5160, 1680, 1335, 375);
+    ChainTabOrder({Frame1, lsValues, cmdChange, cmdAdd, cmdClose, txUpdate, cmdDelete});
 
     connect(lsValues, &QListWidget::itemClicked, this, [this] {
         editor_.select(static_cast<std::size_t>(lsValues->currentRow()));

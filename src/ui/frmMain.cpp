@@ -45,20 +45,6 @@ frmMain::frmMain(AppState& app, Services& services, QWidget* parent)
 
 frmMain::~frmMain() = default;
 
-QLabel* frmMain::label(const char* name, const char* caption, int left, int top, int width, int height)
-{
-    auto* widget = PlaceChild<QLabel>(centralWidget(), name, left, top, width, height);
-    widget->setText(caption);
-    return widget;
-}
-
-QPushButton* frmMain::button(const char* name, const char* caption, int left, int top, int width, int height)
-{
-    auto* widget = PlaceChild<QPushButton>(centralWidget(), name, left, top, width, height);
-    widget->setText(caption);
-    return widget;
-}
-
 QComboBox* frmMain::fieldCombo(const char* name, int left, int top, int width, int height)
 {
     auto* combo = PlaceChild<QComboBox>(centralWidget(), name, left, top, width, height);
@@ -78,46 +64,46 @@ QPlainTextEdit* frmMain::headerBox(const char* name, int left, int top, int widt
 
 void frmMain::createControls()
 {
-    Label1 = label("Label1", "Part Description:", 120, 120, 1335, 255);
+    Label1 = PlaceCaptioned<QLabel>(centralWidget(), "Label1", "Part Description:", 120, 120, 1335, 255);
     txPartDescription = PlaceChild<QLineEdit>(centralWidget(), "txPartDescription", 1560, 120, 6375, 285);
-    lblLength = label("lblLength", "Length:", 8160, 120, 975, 255);
+    lblLength = PlaceCaptioned<QLabel>(centralWidget(), "lblLength", "Length:", 8160, 120, 975, 255);
     lblLength->setAutoFillBackground(true);
-    Label2[0] = label("Label2_0", "File Name:", 120, 480, 1335, 255);
+    Label2[0] = PlaceCaptioned<QLabel>(centralWidget(), "Label2_0", "File Name:", 120, 480, 1335, 255);
     txFileName = PlaceChild<QLineEdit>(centralWidget(), "txFileName", 1560, 480, 7575, 285);
-    Label2[1] = label("Label2_1", "Author:", 120, 840, 1335, 255);
-    Label4 = label("Label4", "Real Name", 1560, 840, 855, 255);
+    Label2[1] = PlaceCaptioned<QLabel>(centralWidget(), "Label2_1", "Author:", 120, 840, 1335, 255);
+    Label4 = PlaceCaptioned<QLabel>(centralWidget(), "Label4", "Real Name", 1560, 840, 855, 255);
     txAuthorRealName = PlaceChild<QLineEdit>(centralWidget(), "txAuthorRealName", 2520, 840, 3015, 285);
-    Label3 = label("Label3", "Username:", 5640, 840, 855, 255);
+    Label3 = PlaceCaptioned<QLabel>(centralWidget(), "Label3", "Username:", 5640, 840, 855, 255);
     txAuthorUserName = PlaceChild<QLineEdit>(centralWidget(), "txAuthorUserName", 6600, 840, 2535, 285);
-    Label2[2] = label("Label2_2", "Part Type:", 120, 1200, 1335, 255);
+    Label2[2] = PlaceCaptioned<QLabel>(centralWidget(), "Label2_2", "Part Type:", 120, 1200, 1335, 255);
     cbPartTypes = fieldCombo("cbPartTypes", 1560, 1200, 7575, 315);
-    Label2[3] = label("Label2_3", "Liscense Type:", 120, 1560, 1335, 255);
+    Label2[3] = PlaceCaptioned<QLabel>(centralWidget(), "Label2_3", "Liscense Type:", 120, 1560, 1335, 255);
     cbLicenses = fieldCombo("cbLicenses", 1560, 1560, 6135, 315);
-    cmdSetPreferences = button("cmdSetPreferences", "Set Preferences", 7800, 1560, 1335, 255);
-    Label6 = label("Label6", "BFC Statement", 120, 1920, 1335, 255);
+    cmdSetPreferences = PlaceCaptioned<QPushButton>(centralWidget(), "cmdSetPreferences", "Set Preferences", 7800, 1560, 1335, 255);
+    Label6 = PlaceCaptioned<QLabel>(centralWidget(), "Label6", "BFC Statement", 120, 1920, 1335, 255);
     cbBFCStatement = fieldCombo("cbBFCStatement", 1560, 1920, 7575, 315);
-    Label8 = label("Label8", "Category", 120, 2280, 1335, 255);
+    Label8 = PlaceCaptioned<QLabel>(centralWidget(), "Label8", "Category", 120, 2280, 1335, 255);
     cbCategory = fieldCombo("cbCategory", 1560, 2280, 7575, 315);
-    Label9 = label("Label9", "Keywords", 120, 2640, 1335, 255);
+    Label9 = PlaceCaptioned<QLabel>(centralWidget(), "Label9", "Keywords", 120, 2640, 1335, 255);
     lsKeyWords = PlaceChild<QListWidget>(centralWidget(), "lsKeyWords", 1560, 2640, 3855, 840);
-    cmdEdit = button("cmdEdit", "Edit", 5520, 2640, 735, 255);
-    cmdAdd = button("cmdAdd", "Add", 5520, 2880, 735, 255);
-    cmdDelete = button("cmdDelete", "Delete", 5520, 3240, 735, 255);
-    Label11 = label("Label11", "Comments", 6600, 2640, 2415, 255);
+    cmdEdit = PlaceCaptioned<QPushButton>(centralWidget(), "cmdEdit", "Edit", 5520, 2640, 735, 255);
+    cmdAdd = PlaceCaptioned<QPushButton>(centralWidget(), "cmdAdd", "Add", 5520, 2880, 735, 255);
+    cmdDelete = PlaceCaptioned<QPushButton>(centralWidget(), "cmdDelete", "Delete", 5520, 3240, 735, 255);
+    Label11 = PlaceCaptioned<QLabel>(centralWidget(), "Label11", "Comments", 6600, 2640, 2415, 255);
     lsComments = PlaceChild<QListWidget>(centralWidget(), "lsComments", 6480, 2880, 2655, 1035);
-    Label10 = label("Label10", "History", 120, 3600, 1335, 255);
+    Label10 = PlaceCaptioned<QLabel>(centralWidget(), "Label10", "History", 120, 3600, 1335, 255);
     lsHistory = PlaceChild<QListWidget>(centralWidget(), "lsHistory", 1560, 3600, 3855, 840);
-    cmdHistoryEdit = button("cmdHistoryEdit", "Edit", 5520, 3600, 735, 255);
-    cmdHistoryAdd = button("cmdHistoryAdd", "Add", 5520, 3840, 735, 255);
-    cmdHistoryDelete = button("cmdHistoryDelete", "Delete", 5520, 4200, 735, 255);
-    cmdCommentsEdit = button("cmdCommentsEdit", "Edit", 6480, 4200, 735, 255);
-    cmdCommentsAdd = button("cmdCommentsAdd", "Add", 7440, 4200, 735, 255);
-    cmdCommentsDelete = button("cmdCommentsDelete", "Delete", 8400, 4200, 735, 255);
-    Label7 = label("Label7", "New Header:", 120, 4680, 1335, 255);
+    cmdHistoryEdit = PlaceCaptioned<QPushButton>(centralWidget(), "cmdHistoryEdit", "Edit", 5520, 3600, 735, 255);
+    cmdHistoryAdd = PlaceCaptioned<QPushButton>(centralWidget(), "cmdHistoryAdd", "Add", 5520, 3840, 735, 255);
+    cmdHistoryDelete = PlaceCaptioned<QPushButton>(centralWidget(), "cmdHistoryDelete", "Delete", 5520, 4200, 735, 255);
+    cmdCommentsEdit = PlaceCaptioned<QPushButton>(centralWidget(), "cmdCommentsEdit", "Edit", 6480, 4200, 735, 255);
+    cmdCommentsAdd = PlaceCaptioned<QPushButton>(centralWidget(), "cmdCommentsAdd", "Add", 7440, 4200, 735, 255);
+    cmdCommentsDelete = PlaceCaptioned<QPushButton>(centralWidget(), "cmdCommentsDelete", "Delete", 8400, 4200, 735, 255);
+    Label7 = PlaceCaptioned<QLabel>(centralWidget(), "Label7", "New Header:", 120, 4680, 1335, 255);
     txNewHeader = headerBox("txNewHeader", 1560, 4560, 7575, 1815);
-    Label5 = label("Label5", "Old Header:", 120, 6600, 1335, 255);
+    Label5 = PlaceCaptioned<QLabel>(centralWidget(), "Label5", "Old Header:", 120, 6600, 1335, 255);
     txOldHeader = headerBox("txOldHeader", 1560, 6480, 7575, 1695);
-    lblStatuszeile = label("lblStatuszeile", "", 120, 8280, 6735, 255);
+    lblStatuszeile = PlaceCaptioned<QLabel>(centralWidget(), "lblStatuszeile", "", 120, 8280, 6735, 255);
     Line1 = PlaceChild<QFrame>(centralWidget(), "Line1", 0, 0, 9240, 15);
     Line2 = PlaceChild<QFrame>(centralWidget(), "Line2", 0, 10, 9240, 15);
     for (auto* line : {Line1, Line2})
@@ -168,13 +154,10 @@ void frmMain::createMenus()
 
 void frmMain::setTabOrder()
 {
-    const QWidget* order[] = {txPartDescription, txFileName, txAuthorRealName, txAuthorUserName, cbPartTypes,
-                              cbLicenses, cbBFCStatement, cbCategory, txOldHeader, txNewHeader, lsKeyWords,
-                              cmdAdd, cmdDelete, cmdEdit, cmdSetPreferences, lsHistory, cmdHistoryEdit,
-                              cmdHistoryDelete, cmdHistoryAdd, lsComments, cmdCommentsEdit, cmdCommentsAdd,
-                              cmdCommentsDelete};
-    for (std::size_t i = 0; i + 1 < std::size(order); ++i)
-        QWidget::setTabOrder(const_cast<QWidget*>(order[i]), const_cast<QWidget*>(order[i + 1]));
+    ChainTabOrder({txPartDescription, txFileName, txAuthorRealName, txAuthorUserName, cbPartTypes, cbLicenses,
+                   cbBFCStatement, cbCategory, txOldHeader, txNewHeader, lsKeyWords, cmdAdd, cmdDelete, cmdEdit,
+                   cmdSetPreferences, lsHistory, cmdHistoryEdit, cmdHistoryDelete, cmdHistoryAdd, lsComments,
+                   cmdCommentsEdit, cmdCommentsAdd, cmdCommentsDelete});
     for (QLabel* text : {Label1, lblLength, Label4, Label3, Label6, Label8, Label9, Label11, Label10, Label7, Label5,
                          lblStatuszeile, Label2[0], Label2[1], Label2[2], Label2[3]})
         text->setFocusPolicy(Qt::NoFocus);

@@ -65,8 +65,6 @@ private:
     void createMenus();
     void setTabOrder();
     void connectHandlers();
-    QLabel* label(const char* name, const char* caption, int left, int top, int width, int height);
-    QPushButton* button(const char* name, const char* caption, int left, int top, int width, int height);
     QComboBox* fieldCombo(const char* name, int left, int top, int width, int height);
     QPlainTextEdit* headerBox(const char* name, int left, int top, int width, int height);
 

@@ -52,6 +52,19 @@ protected:
         EXPECT_TRUE(h.FileChanged);
     }
 
+    // Saving with and without backup fails with number, and folder holds the old part file alone.
+    void expectEverySaveFails(int number, const fs::path& folder)
+    {
+        for (const bool backup : {false, true}) {
+            dialogs = ScriptedDialogs();
+            dialogs.expectMessage(Answer::Ok);
+            EXPECT_FALSE(save(backup).saved);
+            expectReported(number);
+            EXPECT_EQ(ReadBytes(h.FilePath), OldContent);
+            EXPECT_EQ(namesIn(folder), std::set<std::string>{"3001.dat"});
+        }
+    }
+
     const std::string OldContent = "0 old\r\n1 16 a.dat\r\n";
     const std::string NewHeader = "0 new\r\n\r\n";
     const std::string NewContent = "0 new\r\n\r\n1 16 a.dat\r\n";
@@ -134,14 +147,7 @@ TEST_F(FileSaving, MissingPartFileWithBackupIsReportedAndNothingIsWritten)
 TEST_F(FileSaving, ReadOnlyPartFileIsNotOverwritten)
 {
     ::chmod(h.FilePath.c_str(), 0444);
-    for (const bool backup : {false, true}) {
-        dialogs = ScriptedDialogs();
-        dialogs.expectMessage(Answer::Ok);
-        EXPECT_FALSE(save(backup).saved);
-        expectReported(70);
-        EXPECT_EQ(ReadBytes(h.FilePath), OldContent);
-        EXPECT_EQ(namesIn(dir.path()), std::set<std::string>{"3001.dat"});
-    }
+    expectEverySaveFails(70, dir.path());
 }
 
 TEST_F(FileSaving, FolderThatDisappearedIsReportedAsPathNotFound)
@@ -204,14 +210,7 @@ TEST_F(FileSaving, ReadOnlyFolderKeepsTheOldFile)
         ASSERT_TRUE(mount.makeReadOnly());
     else
         fs::permissions(folder, fs::perms::owner_read | fs::perms::owner_exec);
-    for (const bool backup : {false, true}) {
-        dialogs = ScriptedDialogs();
-        dialogs.expectMessage(Answer::Ok);
-        EXPECT_FALSE(save(backup).saved);
-        expectReported(70);
-        EXPECT_EQ(ReadBytes(h.FilePath), OldContent);
-        EXPECT_EQ(namesIn(folder), std::set<std::string>{"3001.dat"});
-    }
+    expectEverySaveFails(70, folder);
     if (!asRoot)
         fs::permissions(folder, fs::perms::owner_all);
 }
@@ -226,14 +225,7 @@ TEST_F(FileSaving, FullDiskKeepsTheOldFile)
     h.FilePath = (folder / "3001.dat").string();
     TempDir::writeTo(h.FilePath, OldContent);
     h.Body.assign(256 * 1024, '1');
-    for (const bool backup : {false, true}) {
-        dialogs = ScriptedDialogs();
-        dialogs.expectMessage(Answer::Ok);
-        EXPECT_FALSE(save(backup).saved);
-        expectReported(61);
-        EXPECT_EQ(ReadBytes(h.FilePath), OldContent);
-        EXPECT_EQ(namesIn(folder), std::set<std::string>{"3001.dat"});
-    }
+    expectEverySaveFails(61, folder);
 }
 
 } // namespace
