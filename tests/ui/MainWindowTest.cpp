@@ -7,6 +7,7 @@
 #include <QPushButton>
 #include <QKeyEvent>
 #include <QTest>
+#include <QTimer>
 
 #include "CliRun.h"
 #include "WindowFixture.h"
@@ -383,6 +384,25 @@ TEST_F(WindowTest, Latin1FileRefusesCharactersItCannotHold)
     EXPECT_EQ(description->text().toStdString(), "Cran creus\u00e9");
     QTest::keyClicks(description, "!");
     EXPECT_EQ(app.Header.PartDescription, "Cran creus\xe9!");
+}
+
+TEST_F(WindowTest, CommandsArrivingInsideAnOpenWaitOrAreRefused)
+{
+    startUp();
+    window->show();
+    const auto path = part("3001.dat", GoodPart);
+    // Timers fire while the parser lets the window process pending events.
+    QTimer::singleShot(0, window.get(), [this] {
+        EXPECT_TRUE(window->openInProgress());
+        window->MDateiOeffnen_Click(); // a second open never runs inside the first
+        window->MDateiSpeichern_Click();
+        window->close(); // closes once the open has ended
+        EXPECT_TRUE(window->isVisible());
+    });
+    openThroughPendingFile(path);
+    EXPECT_EQ(caption(), "Quillmark 1.0.0 [3001.dat]");
+    EXPECT_FALSE(window->isVisible());
+    EXPECT_TRUE(dialogs.fileDialogsShown.empty());
 }
 
 TEST_F(WindowTest, AboutBoxNamesTheVersion)
