@@ -186,6 +186,17 @@ TEST(ParserEndOfHeader, BodyTrimsLinesAndKeepsInnerEmptyLines)
     EXPECT_EQ(h.OldHeader, "0 d\r\n0 FOO bar");
 }
 
+TEST(ParserEndOfHeader, BodyLinesAreJoinedByCrLfWhateverTheirLineEnds)
+{
+    HeaderData h;
+    ScriptedDialogs dialogs;
+    ParseProgress progress;
+    ParsePartFileContent(h, "0 d\r\n1 a\r\n 2 b \r\n3 c\r4 d\r\n\r\n  \r\n5 e", dialogs, progress);
+    EXPECT_EQ(h.Body, "1 a\r\n2 b\r\n3 c\r\n4 d\r\n\r\n\r\n5 e");
+    ParsePartFileContent(h, "0 d\r\n \r\n\r\n1 a\r\n", dialogs, progress);
+    EXPECT_EQ(h.Body, "1 a");
+}
+
 TEST(ParserEndOfHeader, EmptyLinesBeforeAnyBodyAddNothing)
 {
     const auto h = parseLines({"1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat"});
