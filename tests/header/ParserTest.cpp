@@ -222,6 +222,16 @@ TEST(ParserRecord, ASecondParseStartsFromEmptyLists)
     EXPECT_EQ(h.OldHeader, "0 b");
 }
 
+TEST(ParserAnyInput, OddBytesAreJustText)
+{
+    const std::string binary("0 \0\xff\x01\r\n\0\0\r\n", 10);
+    EXPECT_EQ(parseLines({binary}).PartDescription, std::string("\0\xff\x01", 3));
+    const auto blanks = parseLines({"0 d", "0 !KEYWORDS" + std::string(100000, ' ') + "x"});
+    EXPECT_EQ(blanks.Keywords, (StringList{"x"})) << "empty words before the first word are skipped";
+    const auto longLine = parseLines({"0 d", "1" + std::string(10 * 1024 * 1024, 'x')});
+    EXPECT_EQ(longLine.Body.size(), 10u * 1024 * 1024 + 1);
+}
+
 class RecordingProgress : public ParseProgress {
 public:
     void lineProgress(std::size_t linesRead) override { captions.push_back(ProgressCaption(linesRead)); }
