@@ -27,8 +27,10 @@ frmList::frmList(ListKind kind, const StringList& entries, const std::string& pr
     cmdDelete = PlaceCaptioned<QPushButton>(this, "cmdDelete", "Delete", 5160, 1680, 1335, 375);
     ChainTabOrder({Frame1, lsValues, cmdChange, cmdAdd, cmdClose, txUpdate, cmdDelete});
 
-    connect(lsValues, &QListWidget::itemClicked, this, [this] {
-        editor_.select(static_cast<std::size_t>(lsValues->currentRow()));
+    // Choosing an entry, by mouse or keyboard, copies its text into txUpdate.
+    connect(lsValues, &QListWidget::itemSelectionChanged, this, [this] {
+        const auto chosen = lsValues->selectedItems();
+        editor_.select(chosen.isEmpty() ? std::nullopt : std::optional<std::size_t>(lsValues->row(chosen.first())));
         txUpdate->setText(ListEntryToWidget(editor_.updateText()));
     });
     connect(txUpdate, &QLineEdit::textEdited, this, [this](const QString& text) { editor_.setUpdateText(text.toStdString()); });
@@ -50,11 +52,14 @@ frmList::frmList(ListKind kind, const StringList& entries, const std::string& pr
 
 void frmList::showEntries()
 {
+    const QSignalBlocker quiet(lsValues);
     lsValues->clear();
     for (const auto& entry : editor_.entries())
         lsValues->addItem(ListEntryToWidget(entry));
     if (const auto row = editor_.selected())
         lsValues->setCurrentRow(static_cast<int>(*row));
+    else
+        lsValues->setCurrentRow(-1);
     txUpdate->setText(ListEntryToWidget(editor_.updateText()));
 }
 

@@ -28,7 +28,6 @@ void clickRow(QListWidget& list, const QString& text)
     const auto items = list.findItems(text, Qt::MatchExactly);
     ASSERT_FALSE(items.isEmpty()) << text.toStdString();
     list.setCurrentItem(items.first());
-    emit list.itemClicked(items.first());
 }
 
 class ListMenuTest : public WindowTest {
