@@ -1,7 +1,6 @@
 #include "Parser.h"
 
 #include <array>
-#include <new>
 #include <optional>
 #include <vector>
 
@@ -358,7 +357,7 @@ void GetGlobalContent(HeaderData& header, Dialogs& dialogs, ParseProgress& progr
     }
     try {
         ParsePartFileContent(header, content->view(), dialogs, progress);
-    } catch (const std::bad_alloc&) {
-        ReportError(dialogs, QmError(7, "Out of memory"), GetGlobalContentProcedure);
+    } catch (const std::exception& failure) {
+        ReportError(dialogs, ErrorOf(failure), GetGlobalContentProcedure);
     }
 }

@@ -1,6 +1,7 @@
 #include "QmError.h"
 
 #include <cerrno>
+#include <new>
 #include <sys/stat.h>
 
 namespace {
@@ -21,6 +22,15 @@ QmError::QmError(int number, std::string description)
 }
 
 QmError InvalidCallError() { return {ErrorNumber::InvalidCall, "Invalid procedure call or argument"}; }
+
+QmError ErrorOf(const std::exception& failure)
+{
+    if (const auto* known = dynamic_cast<const QmError*>(&failure))
+        return *known;
+    if (dynamic_cast<const std::bad_alloc*>(&failure) != nullptr)
+        return {7, "Out of memory"};
+    return {51, "Internal error"};
+}
 
 QmError InputPastEndOfFileError() { return {ErrorNumber::InputPastEndOfFile, "Input past end of file"}; }
 

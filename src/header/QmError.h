@@ -30,6 +30,10 @@ inline constexpr int PathNotFound = 76;
 } // namespace ErrorNumber
 
 QmError InvalidCallError();
+
+// Any failure as the error reports show it: a QmError as it is, running out of memory as 7, and
+// anything else as 51, an internal error.
+QmError ErrorOf(const std::exception& failure);
 QmError InputPastEndOfFileError();
 
 // Maps an OS error (errno) met while working on path to the classic number and description.

@@ -47,8 +47,8 @@ void frmMain::editStandardList(ListKind kind, QComboBox& combo, const char* hand
         // The program only ever sees what was saved: the list is read again from its file.
         ReloadList(app_.Lists, kind, app_.ProgramFolder, services_.dialogs);
         fillCombo(combo, kind);
-    } catch (const QmError& error) {
-        ReportError(services_.dialogs, error, {handler, OwnerKind::Formular, "frmMain"});
+    } catch (const std::exception& error) {
+        ReportError(services_.dialogs, ErrorOf(error), {handler, OwnerKind::Formular, "frmMain"});
     }
 }
 

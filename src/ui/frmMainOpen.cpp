@@ -116,8 +116,7 @@ void frmMain::openChosenFile(const std::function<void()>& takeFile, bool removeT
 
 void frmMain::abandonOpen(const std::exception& error, const Procedure& procedure)
 {
-    const auto* known = dynamic_cast<const QmError*>(&error);
-    ReportError(services_.dialogs, known ? *known : QmError(51, "Internal error"), procedure);
+    ReportError(services_.dialogs, ErrorOf(error), procedure);
     app_.Header.Loading = false;
     lblStatuszeile->setText("");
 }
@@ -211,8 +210,7 @@ void frmMain::MDateiSpeichern_Click()
     try {
         checkHeaderAndSave();
     } catch (const std::exception& error) {
-        const auto* known = dynamic_cast<const QmError*>(&error);
-        ReportError(services_.dialogs, known ? *known : QmError(51, "Internal error"), SaveCommand);
+        ReportError(services_.dialogs, ErrorOf(error), SaveCommand);
     }
 }
 
