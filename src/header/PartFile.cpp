@@ -72,5 +72,3 @@ FileBytes::~FileBytes()
     if (mapped_ != nullptr)
         ::munmap(const_cast<char*>(mapped_), mappedSize_);
 }
-
-std::string ReadWholeFile(const std::string& path) { return std::string(FileBytes(path).view()); }

@@ -20,6 +20,3 @@ private:
     std::size_t mappedSize_ = 0;
     std::string read_;
 };
-
-// The whole file as a string of bytes. Throws QmError like FileBytes.
-std::string ReadWholeFile(const std::string& path);

@@ -10,23 +10,17 @@ struct clsCategory {
     std::string Description;
 };
 
-// The ordered collection of categories, numbered from 1. An entry may also be filed under a key.
+// The ordered collection of categories, numbered from 1.
 class colCategory {
 public:
-    clsCategory& Add(const std::string& Key, const std::string& Description, const std::string& sKey = {});
+    clsCategory& Add(const std::string& Key, const std::string& Description);
     // Throws QmError 9 when there is no such entry.
     const clsCategory& Item(std::size_t position) const;
-    const clsCategory& Item(const std::string& key) const;
     std::size_t Count() const { return entries_.size(); }
-    void Remove(std::size_t position);
-    void Remove(const std::string& key);
 
     auto begin() const { return entries_.begin(); }
     auto end() const { return entries_.end(); }
 
 private:
-    std::size_t positionOfKey(const std::string& key) const;
-
     std::vector<clsCategory> entries_;
-    std::vector<std::string> keys_; // beside each entry: its key, or "" when it has none
 };

@@ -73,15 +73,11 @@ TEST(DefaultListFiles, StandBesideTheExecutables)
     EXPECT_EQ(lists.Licenses.size(), 5u);
 }
 
-TEST(Categories, PositionsAndKeys)
+TEST(Categories, NumberedFromOne)
 {
     colCategory categories;
     categories.Add("", "Brick");
-    categories.Add("k", "Plate", "plate");
-    EXPECT_EQ(categories.Count(), 2u);
-    EXPECT_EQ(categories.Item("plate").Description, "Plate");
-    categories.Remove(1);
-    EXPECT_EQ(categories.Item(1).Description, "Plate");
+    EXPECT_EQ(categories.Item(1).Description, "Brick");
     EXPECT_THROW(categories.Item(2), QmError);
 }
 

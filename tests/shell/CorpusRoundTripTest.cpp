@@ -7,7 +7,7 @@
 #include "LineReader.h"
 #include "OpenDocument.h"
 #include "ParseProgress.h"
-#include "PartFile.h"
+#include "TempDir.h"
 #include "Text.h"
 #include "Words.h"
 
@@ -78,7 +78,7 @@ TEST(Corpus, SavingSettlesAfterOneSave)
     if (files.empty())
         GTEST_SKIP() << "no corpus folder beside the project";
     for (const auto& file : files) {
-        const auto once = savedBytes(file.string(), ReadWholeFile(file.string()));
+        const auto once = savedBytes(file.string(), ReadBytes(file.string()));
         const auto twice = savedBytes(file.string(), once);
         EXPECT_EQ(settledForm(once), settledForm(twice)) << file;
     }
@@ -90,7 +90,7 @@ TEST(Corpus, NothingOfTheBodyIsLost)
     if (files.empty())
         GTEST_SKIP() << "no corpus folder beside the project";
     for (const auto& file : files) {
-        const auto content = ReadWholeFile(file.string());
+        const auto content = ReadBytes(file.string());
         HeaderData header;
         DefaultAnswers dialogs;
         ParseProgress progress;
