@@ -6,6 +6,7 @@
 #include <QListWidget>
 #include <QMimeData>
 #include <QPushButton>
+#include <QTest>
 #include <filesystem>
 
 #include "StandardLists.h"
@@ -128,9 +129,9 @@ TEST_F(ListMenuTest, UpdateReplacesTheSelectedBfcStatement)
     EXPECT_EQ(listFile(ListKind::Bfc), "CERTIFY CCW\r\nCERTIFY CCW NOCLIP\r\nCERTIFY CW\r\n");
 }
 
-TEST_F(ListMenuTest, UnchangedPartTypeListClosesWithoutQuestion)
+TEST_F(ListMenuTest, EscapePressesCloseAndAnUnchangedListClosesWithoutQuestion)
 {
-    whenDialogShows<frmList>([&](frmList& dialog) { dialog.findChild<QPushButton*>("cmdClose")->click(); });
+    whenDialogShows<frmList>([&](frmList& dialog) { QTest::keyClick(&dialog, Qt::Key_Escape); });
     window->MEditPartTyps_Click();
     EXPECT_EQ(child<QComboBox>("cbPartTypes")->currentIndex(), -1);
     EXPECT_EQ(app.Header.PartType, "Part");
