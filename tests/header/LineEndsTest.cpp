@@ -144,6 +144,17 @@ TEST_F(PartFileParse, MissingFileIsReportedTwice)
     EXPECT_EQ(dialogs.messages[1].icon, Icon::Exclamation);
 }
 
+TEST_F(PartFileParse, FileInAMissingFolderIsNotFoundEither)
+{
+    header.FilePath = dir.file("gone/missing.dat");
+    dialogs.expectMessage(Answer::Ok);
+    dialogs.expectMessage(Answer::Ok);
+    GetGlobalContent(header, dialogs, progress);
+    ASSERT_EQ(dialogs.messages.size(), 2u);
+    EXPECT_EQ(dialogs.messages[0].text, "Error 76 (Path not found) in procedure IsUnixLineEnd of Modul modUNIX");
+    EXPECT_EQ(dialogs.messages[1].text, "File " + header.FilePath + " not found!");
+}
+
 TEST_F(PartFileParse, EmptyPathDoesNothing)
 {
     GetGlobalContent(header, dialogs, progress);
