@@ -131,28 +131,22 @@ TEST_F(PartFileParse, FileOfLineEndsOnly)
     EXPECT_EQ(h.Body, "");
 }
 
-TEST_F(PartFileParse, MissingFileIsReportedTwice)
+TEST_F(PartFileParse, MissingFileIsReportedByTheLineEndCheckAndAsNotFound)
 {
-    header.FilePath = dir.file("missing.dat");
-    dialogs.expectMessage(Answer::Ok);
-    dialogs.expectMessage(Answer::Ok);
-    GetGlobalContent(header, dialogs, progress);
-    ASSERT_EQ(dialogs.messages.size(), 2u);
-    EXPECT_EQ(dialogs.messages[0].text, "Error 53 (File not found) in procedure IsUnixLineEnd of Modul modUNIX");
-    EXPECT_EQ(dialogs.messages[1].text, "File " + header.FilePath + " not found!");
-    EXPECT_EQ(dialogs.messages[1].title, "Error");
-    EXPECT_EQ(dialogs.messages[1].icon, Icon::Exclamation);
-}
-
-TEST_F(PartFileParse, FileInAMissingFolderIsNotFoundEither)
-{
-    header.FilePath = dir.file("gone/missing.dat");
-    dialogs.expectMessage(Answer::Ok);
-    dialogs.expectMessage(Answer::Ok);
-    GetGlobalContent(header, dialogs, progress);
-    ASSERT_EQ(dialogs.messages.size(), 2u);
-    EXPECT_EQ(dialogs.messages[0].text, "Error 76 (Path not found) in procedure IsUnixLineEnd of Modul modUNIX");
-    EXPECT_EQ(dialogs.messages[1].text, "File " + header.FilePath + " not found!");
+    const std::pair<const char*, std::string> cases[] = {{"missing.dat", "Error 53 (File not found)"},
+                                                         {"gone/missing.dat", "Error 76 (Path not found)"}};
+    for (const auto& [name, report] : cases) {
+        header.FilePath = dir.file(name);
+        dialogs = ScriptedDialogs();
+        dialogs.expectMessage(Answer::Ok);
+        dialogs.expectMessage(Answer::Ok);
+        GetGlobalContent(header, dialogs, progress);
+        ASSERT_EQ(dialogs.messages.size(), 2u);
+        EXPECT_EQ(dialogs.messages[0].text, report + " in procedure IsUnixLineEnd of Modul modUNIX");
+        EXPECT_EQ(dialogs.messages[1].text, "File " + header.FilePath + " not found!");
+        EXPECT_EQ(dialogs.messages[1].title, "Error");
+        EXPECT_EQ(dialogs.messages[1].icon, Icon::Exclamation);
+    }
 }
 
 TEST_F(PartFileParse, EmptyPathDoesNothing)
