@@ -4,6 +4,7 @@
 #include <QFile>
 #include <QLayout>
 #include <QFrame>
+#include <QIcon>
 #include <QLabel>
 #include <QLineEdit>
 #include <QListWidget>
@@ -28,6 +29,9 @@ frmMain::frmMain(AppState& app, Services& services, QWidget* parent)
 {
     setObjectName("frmMain");
     setWindowTitle("Quillmark");
+    // The icon is linked in from a static library, whose resources register only when asked.
+    Q_INIT_RESOURCE(resources);
+    setWindowIcon(QIcon(":/quillmark.png"));
     setAcceptDrops(true);
     auto* client = new QWidget(this);
     client->setObjectName("client");

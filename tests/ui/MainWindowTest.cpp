@@ -39,6 +39,7 @@ TEST_F(WindowTest, StartsWithTheGreetingAndDisabledControls)
     EXPECT_EQ(child<QComboBox>("cbBFCStatement")->count(), 3);
     EXPECT_EQ(child<QComboBox>("cbBFCStatement")->currentIndex(), -1);
     EXPECT_EQ(app.Header.FileFolder, app.ProgramFolder);
+    EXPECT_FALSE(window->windowIcon().pixmap(32).isNull());
 }
 
 TEST_F(WindowTest, OpensTheFileNamedOnTheCommandLine)
