@@ -63,7 +63,7 @@ int RunCheck(const std::vector<std::string>& paths, bool json, ConsoleDialogs& d
 int RunSave(const std::vector<std::string>& paths, const SaveOptions& options, std::ostream& out, std::ostream& err)
 {
     ConsoleDialogs dialogs(err, [&options](const MessageBox& box) {
-        const bool userNameQuestion = box.title == "Missing Username";
+        const bool userNameQuestion = box.title == MissingUserNameTitle;
         const bool yes = userNameQuestion ? options.allowMissingUserName : options.fix;
         return yes ? Answer::Yes : Answer::No;
     });

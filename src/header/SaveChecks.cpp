@@ -83,7 +83,7 @@ SaveResult CheckHeaderAndSave(HeaderData& h, const SaveContext& context)
     if (stops(AuthorRule, h, dialogs))
         return {SaveOutcome::Refused, {}};
     if (missingUserName(h) &&
-        !askedYes(dialogs, "You have not set your username. Do you want to save anyway?", "Missing Username"))
+        !askedYes(dialogs, "You have not set your username. Do you want to save anyway?", MissingUserNameTitle))
         return {SaveOutcome::Declined, {}};
     for (const auto& rule : LaterRules)
         if (stops(rule, h, dialogs))

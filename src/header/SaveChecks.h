@@ -11,6 +11,9 @@ class Dialogs;
 
 inline constexpr std::size_t DescriptionLimit = 64;
 
+// The title of the question asked when the author line has no user name.
+inline constexpr const char* MissingUserNameTitle = "Missing Username";
+
 // A stop text as the box shows it: the sentence, CR LF, "Saving the file is not possible".
 std::string RefusalText(const std::string& sentence);
 

@@ -15,7 +15,6 @@ class ListEditor {
 public:
     ListEditor(ListKind kind, const StringList& entries, std::string programFolder, Dialogs& dialogs);
 
-    ListKind kind() const { return kind_; }
     std::string ListMode() const;
     bool ListChanged() const { return changed_; }
     const StringList& entries() const { return entries_; }

@@ -17,8 +17,6 @@ public:
     frmList(ListKind kind, const StringList& entries, const std::string& programFolder, Dialogs& dialogs,
             QWidget* parent = nullptr);
 
-    const ListEditor& editor() const { return editor_; }
-
 protected:
     void keyPressEvent(QKeyEvent* event) override;
 

@@ -19,6 +19,13 @@
 
 namespace {
 
+// major.minor.revision, from the project's version.
+std::string versionText()
+{
+    return std::to_string(QUILLMARK_VERSION_MAJOR) + "." + std::to_string(QUILLMARK_VERSION_MINOR) + "." +
+           std::to_string(QUILLMARK_VERSION_PATCH);
+}
+
 constexpr int ClientWidth = Pixels(9240);
 constexpr int ClientHeight = Pixels(8550);
 
@@ -186,8 +193,7 @@ void frmMain::StartUp(const QStringList& arguments)
     showRecentFiles();
     EnableControls();
     fillComboBoxes();
-    baseTitle_ = "Quillmark " + std::to_string(QUILLMARK_VERSION_MAJOR) + "." + std::to_string(QUILLMARK_VERSION_MINOR) +
-                 "." + std::to_string(QUILLMARK_VERSION_PATCH);
+    baseTitle_ = "Quillmark " + versionText();
     setWindowTitle(QString::fromStdString(baseTitle_));
     Line1->setGeometry(0, 0, ClientWidth, 1);
     Line2->setGeometry(0, 1, ClientWidth, 1);
@@ -202,8 +208,6 @@ void frmMain::StartUp(const QStringList& arguments)
 
 void frmMain::MInfo_Click()
 {
-    const auto version = std::to_string(QUILLMARK_VERSION_MAJOR) + "." + std::to_string(QUILLMARK_VERSION_MINOR) + "." +
-                         std::to_string(QUILLMARK_VERSION_PATCH);
-    services_.dialogs.message(InformationBox("Quillmark Version: " + version + "\r\n" + "Copyright " +
+    services_.dialogs.message(InformationBox("Quillmark Version: " + versionText() + "\r\n" + "Copyright " +
                                              QUILLMARK_COPYRIGHT_YEARS + " " + QUILLMARK_COPYRIGHT_HOLDER));
 }

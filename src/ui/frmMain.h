@@ -70,7 +70,10 @@ private:
 
     // Opening.
     bool saveChangesBeforeOpen();
-    void openChosenFile(const std::function<void()>& takeFile, bool removeTabs);
+    // Opens the file that takeFile names; a failure is reported for procedure, and a close
+    // requested meanwhile is carried out at the end.
+    void openChosenFile(const std::function<void()>& takeFile, bool removeTabs, const Procedure& procedure);
+    void readChosenFile(const std::function<void()>& takeFile, bool removeTabs);
     void clearWindow();
     void fillComboBoxes();
     void fillCombo(QComboBox& combo, ListKind kind);

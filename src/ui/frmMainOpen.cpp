@@ -50,12 +50,7 @@ void frmMain::MDateiOeffnen_Click()
             return; // Cancel: the file the user was working on stays open
         path = *chosen;
     }
-    try {
-        openChosenFile([&] { LadeDATDateiCommandLine(app_, path, services_); }, true);
-    } catch (const std::exception& error) {
-        abandonOpen(error, OpenCommand);
-    }
-    finishCloseRequestedDuringOpen();
+    openChosenFile([&] { LadeDATDateiCommandLine(app_, path, services_); }, true, OpenCommand);
 }
 
 void frmMain::OpenFile(const std::string& path)
@@ -71,12 +66,7 @@ void frmMain::OpenFile(const std::string& path)
         if (answer == Answer::Yes && checkHeaderAndSave().outcome != SaveOutcome::Saved)
             return; // the edits are not lost because a check refused the save
     }
-    try {
-        openChosenFile([&] { TakeRecentFile(app_, path, services_); }, false);
-    } catch (const std::exception& error) {
-        abandonOpen(error, OpenRecentFile);
-    }
-    finishCloseRequestedDuringOpen();
+    openChosenFile([&] { TakeRecentFile(app_, path, services_); }, false, OpenRecentFile);
 }
 
 void frmMain::MRecentFile_Click(int index)
@@ -90,7 +80,17 @@ bool frmMain::saveChangesBeforeOpen()
     return !app_.Header.FileChanged || checkHeaderAndSave().outcome == SaveOutcome::Saved;
 }
 
-void frmMain::openChosenFile(const std::function<void()>& takeFile, bool removeTabs)
+void frmMain::openChosenFile(const std::function<void()>& takeFile, bool removeTabs, const Procedure& procedure)
+{
+    try {
+        readChosenFile(takeFile, removeTabs);
+    } catch (const std::exception& error) {
+        abandonOpen(error, procedure);
+    }
+    finishCloseRequestedDuringOpen();
+}
+
+void frmMain::readChosenFile(const std::function<void()>& takeFile, bool removeTabs)
 {
     app_.Header.Loading = true;
     clearWindow();
