@@ -7,11 +7,11 @@
 #include "Dates.h"
 #include "Dialogs.h"
 #include "ErrorReport.h"
+#include "LargeBuffer.h"
 #include "LineEnds.h"
 #include "LineReader.h"
 #include "ParseProgress.h"
 #include "PartFile.h"
-#include "LargeBuffer.h"
 #include "Text.h"
 #include "Words.h"
 
