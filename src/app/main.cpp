@@ -2,22 +2,19 @@
 #include <QApplication>
 
 #include "EventLoop.h"
-#include <QFont>
 
 #include "AppState.h"
 #include "Clock.h"
 #include "IniSettingsStore.h"
 #include "QtDialogs.h"
+#include "WindowFont.h"
 #include "frmMain.h"
 
 int main(int argc, char** argv)
 {
     UseLeanEventLoop();
     QApplication application(argc, argv); // takes Qt's own options (-platform, -style, ...) out of argv
-    // The windows were drawn for a small dialog font; larger ones would not fit their fixed places.
-    QFont font = QApplication::font();
-    font.setPointSizeF(8);
-    QApplication::setFont(font);
+    UseWindowFont();
     AppState app;
     app.ProgramFolder = QCoreApplication::applicationDirPath().toStdString();
     IniSettingsStore store;

@@ -5,6 +5,7 @@
 #include "CliFiles.h"
 #include "Clock.h"
 #include "Composer.h"
+#include "FileSave.h"
 #include "ConsoleDialogs.h"
 #include "SaveChecks.h"
 #include "Text.h"
@@ -63,6 +64,9 @@ int RunCheck(const std::vector<std::string>& paths, bool json, ConsoleDialogs& d
 int RunSave(const std::vector<std::string>& paths, const SaveOptions& options, std::ostream& out, std::ostream& err)
 {
     ConsoleDialogs dialogs(err, [&options](const MessageBox& box) {
+        // Another program's changes since the file was read are never overwritten from here.
+        if (box.title == ChangedOnDiskTitle)
+            return Answer::No;
         const bool userNameQuestion = box.title == MissingUserNameTitle;
         const bool yes = userNameQuestion ? options.allowMissingUserName : options.fix;
         return yes ? Answer::Yes : Answer::No;
@@ -80,7 +84,7 @@ int RunSave(const std::vector<std::string>& paths, const SaveOptions& options, s
             out << "skipped " << path << ": no user name set\n";
             return ExitStatus::Refused;
         case SaveOutcome::Failed:
-            out << "failed " << path << ": " << dialogs.lastMessage() << '\n';
+            out << "failed " << path << ": " << (dialogs.lastTitle() == ChangedOnDiskTitle ? "changed while saving" : dialogs.lastMessage()) << '\n';
             return ExitStatus::SaveFailed;
         case SaveOutcome::Refused:
         case SaveOutcome::DescriptionTooLong:

@@ -8,6 +8,27 @@
 #include "PartFile.h"
 #include "QmError.h"
 
+namespace {
+
+void reportUnreadable(const std::string& path, const std::exception& failure, std::ostream& err)
+{
+    err << "quillmark-cli: cannot read " << path << ": " << ErrorOf(failure).description() << '\n';
+}
+
+// A failure while working on one file (running out of memory, say) ends that file, not the run.
+int handleCatching(const std::string& path, HeaderData& header, std::ostream& err,
+                   const std::function<int(HeaderData&)>& handle)
+{
+    try {
+        return handle(header);
+    } catch (const std::exception& failure) {
+        reportUnreadable(path, failure, err);
+        return ExitStatus::Unreadable;
+    }
+}
+
+} // namespace
+
 std::optional<HeaderData> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err)
 {
     dialogs.setCurrentFile(path);
@@ -16,9 +37,10 @@ std::optional<HeaderData> OpenForCli(const std::string& path, ConsoleDialogs& di
         HeaderData header;
         ParseProgress silent;
         OpenPartFileContent(header, path, content.view(), dialogs, silent);
+        header.ReadStamp = content.stamp();
         return header;
-    } catch (const QmError& error) {
-        err << "quillmark-cli: cannot read " << path << ": " << error.description() << '\n';
+    } catch (const std::exception& failure) {
+        reportUnreadable(path, failure, err);
         return std::nullopt;
     }
 }
@@ -29,7 +51,7 @@ int ForEachOpenedFile(const std::vector<std::string>& paths, ConsoleDialogs& dia
     int status = ExitStatus::Ok;
     for (const auto& path : paths) {
         auto header = OpenForCli(path, dialogs, err);
-        status = std::max(status, header ? handle(*header) : ExitStatus::Unreadable);
+        status = std::max(status, header ? handleCatching(path, *header, err, handle) : ExitStatus::Unreadable);
     }
     return status;
 }

@@ -7,6 +7,7 @@ ConsoleDialogs::ConsoleDialogs(std::ostream& err, Answerer answerer) : err_(err)
 Answer ConsoleDialogs::message(const MessageBox& box)
 {
     lastMessage_ = box.text;
+    lastTitle_ = box.title;
     if (box.buttons != Buttons::Ok && answerer_)
         return answerer_(box);
     err_ << currentFile_ << ": " << OneLine(box.text) << '\n';

@@ -18,6 +18,7 @@ public:
     void setCurrentFile(const std::string& path) { currentFile_ = path; }
     // The text of the last box shown, answered or not.
     const std::string& lastMessage() const { return lastMessage_; }
+    const std::string& lastTitle() const { return lastTitle_; }
 
     Answer message(const MessageBox& box) override;
     std::string input(const std::string& prompt, const std::string& title, const std::string& defaultText) override;
@@ -28,6 +29,7 @@ private:
     Answerer answerer_;
     std::string currentFile_;
     std::string lastMessage_;
+    std::string lastTitle_;
 };
 
 // A message on one line: its CR LF become "; ".

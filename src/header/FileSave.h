@@ -1,8 +1,6 @@
 #pragma once
 
-#include <optional>
 #include <string>
-#include <string_view>
 
 #include "Clock.h"
 #include "HeaderData.h"
@@ -14,19 +12,17 @@ class Dialogs;
 // path gives "unbenannt_Backup_....txt". A file name without "." throws QmError 5.
 std::string MakeBackupName(const std::string& path, const LocalDateTime& stamp);
 
-// Replaces the file at path by the pieces, one after the other, without ever leaving it broken:
-// the new text goes to a temporary file in the same folder, reaches the disk, and only then
-// takes the file's name. With a backup path, the old content ends under that name. On any
-// failure the file keeps its old content, nothing else is left behind, and QmError is thrown.
-void ReplaceFileSafely(const std::string& path, std::initializer_list<std::string_view> pieces,
-                       const std::optional<std::string>& backupPath);
+// The title of the question asked before overwriting a file that changed since it was read.
+inline constexpr const char* ChangedOnDiskTitle = "File Changed on Disk";
 
 struct FileSaveResult {
     bool saved = false;
     std::string backupPath;
 };
 
-// Writes newHeader, the body and one CR LF to FilePath, after a dated backup when makeBackup is
-// on, and clears FileChanged. A failure is reported through dialogs and FileChanged stays.
+// Writes newHeader, the body and one CR LF to FilePath (to the file it links to), after a dated
+// backup beside that file when makeBackup is on, and clears FileChanged. A file that changed on
+// disk since it was read is only overwritten when the user says so. A failure is reported
+// through dialogs, and FileChanged stays.
 FileSaveResult FileSave(HeaderData& header, const std::string& newHeader, bool makeBackup, const Clock& clock,
                         Dialogs& dialogs);

@@ -1,7 +1,10 @@
 #pragma once
 
+#include <optional>
 #include <string>
 #include <vector>
+
+#include "FileStamp.h"
 
 // A list of header lines. The texts talk about entry 1 to count; the code indexes from 0.
 using StringList = std::vector<std::string>;
@@ -34,6 +37,8 @@ struct HeaderData {
     std::string OldHeader;
     std::string Body;
     TextEncoding Encoding = TextEncoding::Utf8;
+    // The file at FilePath as it was read, or as the last save left it; none when nothing was read.
+    std::optional<FileStamp> ReadStamp;
 
     bool FileChanged = false;
     bool FileLoaded = false;

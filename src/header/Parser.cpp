@@ -2,7 +2,6 @@
 
 #include <array>
 #include <optional>
-#include <vector>
 
 #include "Dates.h"
 #include "Dialogs.h"
@@ -65,9 +64,9 @@ private:
         headerEnded_ = true;
         toBody(line);
     }
-    std::string_view word(std::size_t position) const { return words_[position - 1]; }
-    std::size_t wordCount() const { return words_.size(); }
-    std::string joinedFrom(std::size_t k) const { return JoinWordsFrom(words_, k); }
+    std::string_view word(std::size_t position) const { return words_.word(position); }
+    std::size_t wordCount() const { return words_.count(); }
+    std::string joinedFrom(std::size_t k) const { return words_.joinedFrom(k); }
 
     void takeDescription(std::string_view line);
     void takeKeywordLine(std::string_view line);
@@ -79,14 +78,14 @@ private:
 
     HeaderData& h_;
     bool headerEnded_ = false;
-    std::vector<std::string_view> words_;
+    Words words_;
 };
 
 void HeaderParser::classify(std::string_view line, std::size_t lineNumber)
 {
     if (line.empty())
         return;
-    SplitWords(line, words_);
+    words_ = Words(line);
     if (word(1) != "0") {
         endHeader(line);
         return;
@@ -347,6 +346,7 @@ void GetGlobalContent(HeaderData& header, Dialogs& dialogs, ParseProgress& progr
     try {
         content.emplace(header.FilePath);
     } catch (const QmError& error) {
+        header.ReadStamp = StampOfPath(header.FilePath);
         ReportError(dialogs, error, IsUnixLineEndProcedure);
         const bool missing = error.number() == ErrorNumber::FileNotFound || error.number() == ErrorNumber::PathNotFound;
         if (missing)
@@ -357,6 +357,7 @@ void GetGlobalContent(HeaderData& header, Dialogs& dialogs, ParseProgress& progr
     }
     try {
         ParsePartFileContent(header, content->view(), dialogs, progress);
+        header.ReadStamp = content->stamp();
     } catch (const std::exception& failure) {
         ReportError(dialogs, ErrorOf(failure), GetGlobalContentProcedure);
     }

@@ -28,11 +28,15 @@ QmError ErrorOf(const std::exception& failure)
     if (const auto* known = dynamic_cast<const QmError*>(&failure))
         return *known;
     if (dynamic_cast<const std::bad_alloc*>(&failure) != nullptr)
-        return {7, "Out of memory"};
+        return OutOfMemoryError();
     return {51, "Internal error"};
 }
 
 QmError InputPastEndOfFileError() { return {ErrorNumber::InputPastEndOfFile, "Input past end of file"}; }
+
+QmError OutOfMemoryError() { return {ErrorNumber::OutOfMemory, "Out of memory"}; }
+
+QmError PathFileAccessError() { return {ErrorNumber::PathFileAccessError, "Path/File access error"}; }
 
 QmError OsError(int errnoValue, const std::string& path)
 {
@@ -55,6 +59,6 @@ QmError OsError(int errnoValue, const std::string& path)
     case EIO:
         return {ErrorNumber::DeviceIoError, "Device I/O error"};
     default:
-        return {ErrorNumber::PathFileAccessError, "Path/File access error"};
+        return PathFileAccessError();
     }
 }

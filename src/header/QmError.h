@@ -18,6 +18,7 @@ private:
 
 namespace ErrorNumber {
 inline constexpr int InvalidCall = 5;
+inline constexpr int OutOfMemory = 7;
 inline constexpr int SubscriptOutOfRange = 9;
 inline constexpr int FileNotFound = 53;
 inline constexpr int DeviceIoError = 57;
@@ -35,6 +36,9 @@ QmError InvalidCallError();
 // anything else as 51, an internal error.
 QmError ErrorOf(const std::exception& failure);
 QmError InputPastEndOfFileError();
+QmError OutOfMemoryError();
+// 75: what the program cannot work on, such as a folder or a device where a file should be.
+QmError PathFileAccessError();
 
 // Maps an OS error (errno) met while working on path to the classic number and description.
 QmError OsError(int errnoValue, const std::string& path);

@@ -1,28 +1,41 @@
 #include "Words.h"
 
-void SplitWords(std::string_view line, std::vector<std::string_view>& words)
+#include <algorithm>
+
+Words::Words(std::string_view line) : text_(line)
 {
-    words.clear();
-    std::string_view rest = line;
-    while (!rest.empty()) {
-        const auto blank = rest.find(' ');
-        if (blank == std::string_view::npos) {
-            words.push_back(rest);
-            break;
-        }
-        words.push_back(rest.substr(0, blank));
-        rest.remove_prefix(blank + 1);
-    }
+    if (line.empty())
+        return;
+    if (text_.back() == ' ')
+        text_.remove_suffix(1);
+    count_ = 1 + static_cast<std::size_t>(std::count(text_.begin(), text_.end(), ' '));
 }
 
-std::string JoinWordsFrom(const std::vector<std::string_view>& words, std::size_t k)
+std::size_t Words::startOf(std::size_t position) const
 {
-    std::string result;
-    for (std::size_t position = k; position <= words.size(); ++position) {
-        const auto word = words[position - 1];
-        if (!result.empty())
-            result += ' ';
-        result += word;
+    if (position < cursorPosition_) {
+        cursorPosition_ = 1;
+        cursorOffset_ = 0;
     }
-    return result;
+    while (cursorPosition_ < position) {
+        cursorOffset_ = text_.find(' ', cursorOffset_) + 1;
+        ++cursorPosition_;
+    }
+    return cursorOffset_;
+}
+
+std::string_view Words::word(std::size_t position) const
+{
+    const auto start = startOf(position);
+    const auto end = text_.find(' ', start);
+    return text_.substr(start, end == std::string_view::npos ? std::string_view::npos : end - start);
+}
+
+std::string Words::joinedFrom(std::size_t k) const
+{
+    if (k > count_)
+        return {};
+    const auto rest = text_.substr(startOf(k));
+    const auto firstText = rest.find_first_not_of(' ');
+    return firstText == std::string_view::npos ? std::string() : std::string(rest.substr(firstText));
 }

@@ -2,13 +2,30 @@
 
 #include <string>
 #include <string_view>
-#include <vector>
 
 // The words of a header line: split at every blank, so two blanks in a row give an empty word
 // between them, a leading blank gives an empty first word, and one blank at the very end gives
-// no empty last word. Index 0 holds word 1. The views point into line.
-void SplitWords(std::string_view line, std::vector<std::string_view>& words);
+// no empty last word. Words are counted from 1.
+//
+// Nothing is stored per word, so a line of a million blanks costs no more memory than a short
+// one; reading the words in order is as cheap as splitting them once.
+class Words {
+public:
+    explicit Words(std::string_view line = {});
 
-// The words from the 1-based position k joined by single blanks; empty words before the first
-// non-empty one are skipped, later empty words keep their blank.
-std::string JoinWordsFrom(const std::vector<std::string_view>& words, std::size_t k);
+    std::size_t count() const { return count_; }
+    // Word position (1 to count); the view points into the line.
+    std::string_view word(std::size_t position) const;
+    // The words from position k joined by single blanks; empty words before the first non-empty
+    // one are skipped, later empty words keep their blank.
+    std::string joinedFrom(std::size_t k) const;
+
+private:
+    std::size_t startOf(std::size_t position) const;
+
+    std::string_view text_;
+    std::size_t count_ = 0;
+    // Where the last word asked for starts, so that reading the words in order never rescans.
+    mutable std::size_t cursorPosition_ = 1;
+    mutable std::size_t cursorOffset_ = 0;
+};

@@ -52,7 +52,7 @@ void ListEditor::add()
 
 void ListEditor::deleteSelected()
 {
-    if (!selected_ || refuseNone("Delete Entry"))
+    if (!selected_ || refuseNone("Delete Entry", "delete"))
         return;
     entries_.erase(entries_.begin() + static_cast<std::ptrdiff_t>(*selected_));
     selected_.reset();
@@ -62,7 +62,7 @@ void ListEditor::deleteSelected()
 
 void ListEditor::updateSelected()
 {
-    if (!selected_ || refuseNone("Update Entry"))
+    if (!selected_ || refuseNone("Update Entry", "change"))
         return;
     const auto typed = std::string(TrimBlanks(updateText_));
     if (typed.empty())
@@ -108,10 +108,11 @@ bool ListEditor::contains(const std::string& entry) const
     return std::find(entries_.begin(), entries_.end(), entry) != entries_.end();
 }
 
-bool ListEditor::refuseNone(const char* title) const
+bool ListEditor::refuseNone(const char* title, const char* verb) const
 {
     if (entries_[*selected_] != NoneEntry)
         return false;
-    dialogs_.message({"The entry '<none>' is not allowd to delete.", title, Buttons::Ok, Icon::Critical, Answer::Ok});
+    dialogs_.message({std::string("The entry '<none>' is not allowd to ") + verb + ".", title, Buttons::Ok,
+                      Icon::Critical, Answer::Ok});
     return true;
 }

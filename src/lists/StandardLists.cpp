@@ -1,9 +1,9 @@
 #include "StandardLists.h"
 
 #include "ErrorReport.h"
-#include "FileSave.h"
 #include "LineReader.h"
 #include "PartFile.h"
+#include "SafeReplace.h"
 
 namespace {
 

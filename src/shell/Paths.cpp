@@ -1,5 +1,7 @@
 #include "Paths.h"
 
+#include <filesystem>
+
 #include "ErrorReport.h"
 #include "SplitText.h"
 #include "Text.h"
@@ -27,4 +29,20 @@ std::string DateiNurPfad(const std::string& path)
     if (folder.empty() && pieces.size() > 1)
         return "/";
     return folder;
+}
+
+std::string AbsolutePath(const std::string& path)
+{
+    if (path.empty())
+        return path;
+    std::string absolute;
+    for (const auto& piece : std::filesystem::absolute(path)) {
+        const auto text = piece.string();
+        if (text == "." || text.empty())
+            continue;
+        if (!absolute.empty() && absolute.back() != '/')
+            absolute += '/';
+        absolute += text;
+    }
+    return absolute;
 }

@@ -16,6 +16,10 @@ Widget* PlaceChild(QWidget* parent, const char* name, int left, int top, int wid
     return widget;
 }
 
+// Widens a label, button or check box whose twip width is too small for its caption in the
+// window font, just enough to show it whole; its place and the other controls stay.
+void WidenToShowCaption(QWidget& control);
+
 // The same for a control that shows a caption (label, button, check box, frame).
 template <typename Widget>
 Widget* PlaceCaptioned(QWidget* parent, const char* name, const char* caption, int left, int top, int width, int height)
@@ -25,6 +29,7 @@ Widget* PlaceCaptioned(QWidget* parent, const char* name, const char* caption, i
         widget->setTitle(caption);
     else
         widget->setText(caption);
+    WidenToShowCaption(*widget);
     return widget;
 }
 

@@ -14,6 +14,7 @@
 
 #include "Dialogs.h"
 #include "OpenRoad.h"
+#include "Paths.h"
 #include "TwipLayout.h"
 #include "WindowProgress.h"
 
@@ -200,7 +201,8 @@ void frmMain::StartUp(const QStringList& arguments)
     lblStatuszeile->setGeometry(0, ClientHeight - lblStatuszeile->height(), ClientWidth, lblStatuszeile->height());
     lblStatuszeile->setText("Welcome to Quillmark programm.");
     // The shell hands the arguments over already split: the first one is the path, blanks and all.
-    app_.PendingFile = arguments.isEmpty() ? std::string() : QFile::encodeName(arguments.first()).toStdString();
+    // It is remembered in full, so that the recent files still find it from another folder.
+    app_.PendingFile = arguments.isEmpty() ? std::string() : AbsolutePath(QFile::encodeName(arguments.first()).toStdString());
     show();
     if (!app_.PendingFile.empty())
         MDateiOeffnen_Click();

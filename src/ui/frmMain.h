@@ -4,6 +4,8 @@
 #include <array>
 #include <functional>
 #include <memory>
+#include <set>
+#include <utility>
 
 #include "AppState.h"
 #include "ErrorReport.h"
@@ -92,6 +94,7 @@ private:
     void updateTextField(QLineEdit& box, std::string& field);
     void updateComboField(QComboBox& combo, std::string& field);
     void moveFocusOnEnter(QObject* watched);
+    bool typedIntoBox(QObject* watched, QEvent* event);
     void showLength();
 
     // Line lists.
@@ -112,6 +115,7 @@ private:
     std::string baseTitle_;
     std::string newHeaderText_;
     bool closeRequestedDuringOpen_ = false;
+    std::set<std::pair<const QObject*, int>> keysPressedInBox_; // (box, key) pressed and not yet released
 
     // The controls, by the names the program has always used.
     QLabel* Label1;

@@ -79,14 +79,27 @@ bool frmMain::eventFilter(QObject* watched, QEvent* event)
         {txAuthorUserName, &HeaderData::AuthorUserName}};
     if (event->type() == QEvent::KeyPress) {
         const auto key = static_cast<QKeyEvent*>(event)->key();
+        keysPressedInBox_.insert({watched, key});
         if (key == Qt::Key_Return || key == Qt::Key_Enter)
             moveFocusOnEnter(watched); // the key still reaches the control
     }
-    if (event->type() == QEvent::KeyRelease || leftForAnotherControl(event))
+    if (typedIntoBox(watched, event) || leftForAnotherControl(event))
         for (const auto& [box, field] : boxes)
             if (watched == box && box->isEnabled())
                 updateTextField(*box, app_.Header.*field);
+    if (event->type() == QEvent::FocusOut)
+        std::erase_if(keysPressedInBox_, [watched](const auto& pressed) { return pressed.first == watched; });
     return QMainWindow::eventFilter(watched, event);
+}
+
+// A key's release edits a box only when the box also had the key's press: the release of a key
+// that opened a menu, closed a dialog or chose a menu item lands in the box without being typed
+// there. Focus leaving the box (to a menu, say) forgets its presses.
+bool frmMain::typedIntoBox(QObject* watched, QEvent* event)
+{
+    if (event->type() != QEvent::KeyRelease)
+        return false;
+    return keysPressedInBox_.erase({watched, static_cast<QKeyEvent*>(event)->key()}) > 0;
 }
 
 void frmMain::moveFocusOnEnter(QObject* watched)
@@ -96,8 +109,11 @@ void frmMain::moveFocusOnEnter(QObject* watched)
         {cbPartTypes, cbLicenses},             {cbLicenses, cbBFCStatement},         {cbBFCStatement, cbCategory},
         {cbCategory, lsKeyWords}};
     for (const auto& [from, to] : chain)
-        if (watched == from)
+        if (watched == from) {
+            // Keyboard focus shows its frame, as after Tab.
+            setAttribute(Qt::WA_KeyboardFocusChange);
             to->setFocus(Qt::TabFocusReason);
+        }
 }
 
 void frmMain::updateTextField(QLineEdit& box, std::string& field)

@@ -18,6 +18,7 @@
 #include "ListEditor.h"
 #include "OpenRoad.h"
 #include "Parser.h"
+#include "Paths.h"
 #include "WindowProgress.h"
 #include "frmMain.h"
 
@@ -71,7 +72,7 @@ void frmMain::OpenFile(const std::string& path)
 
 void frmMain::MRecentFile_Click(int index)
 {
-    OpenFile(MRecentFile[static_cast<std::size_t>(index)]->text().toStdString());
+    OpenFile(app_.Recent.MRecentFile[static_cast<std::size_t>(index)].caption);
     showRecentFiles();
 }
 
@@ -197,8 +198,8 @@ void frmMain::showRecentFiles()
     ShowRecentFiles(app_.Recent, services_.store);
     for (std::size_t i = 0; i < MRecentFile.size(); ++i) {
         const auto& item = app_.Recent.MRecentFile[i];
-        if (i > 0)
-            MRecentFile[i]->setText(QString::fromStdString(item.caption));
+        if (i > 0) // a "&" in a path is part of the name, not an access key
+            MRecentFile[i]->setText(QString::fromStdString(item.caption).replace("&", "&&"));
         MRecentFile[i]->setVisible(item.visible);
     }
 }
@@ -227,9 +228,14 @@ SaveResult frmMain::checkHeaderAndSave()
 void frmMain::showDescriptionTooLong()
 {
     txPartDescription->setFocus(Qt::OtherFocusReason);
-    const auto length = static_cast<int>(txPartDescription->text().size());
-    txPartDescription->setSelection(static_cast<int>(DescriptionLimit), length - static_cast<int>(DescriptionLimit));
-    lblLength->setText(QString("Length: %1").arg(txPartDescription->text().toUcs4().size()));
+    const auto text = txPartDescription->text();
+    // The limit counts characters; the box counts UTF-16 units, two for a character beyond the
+    // basic plane.
+    int start = 0;
+    for (std::size_t character = 0; character < DescriptionLimit && start < text.size(); ++character)
+        start += text.at(start).isHighSurrogate() && start + 1 < text.size() ? 2 : 1;
+    txPartDescription->setSelection(start, static_cast<int>(text.size()) - start);
+    lblLength->setText(QString("Length: %1").arg(text.toUcs4().size()));
 }
 
 void frmMain::closeEvent(QCloseEvent* event)
@@ -264,6 +270,6 @@ void frmMain::dropEvent(QDropEvent* event)
     if (!file || openInProgress())
         return;
     event->acceptProposedAction();
-    app_.PendingFile = *file;
+    app_.PendingFile = AbsolutePath(*file);
     MDateiOeffnen_Click();
 }

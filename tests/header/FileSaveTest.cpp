@@ -226,6 +226,14 @@ TEST_F(FileSaving, FullDiskKeepsTheOldFile)
     TempDir::writeTo(h.FilePath, OldContent);
     h.Body.assign(256 * 1024, '1');
     expectEverySaveFails(61, folder);
+    // A file with a second name is rewritten in place: when that fails, its old bytes come back.
+    fs::create_hard_link(h.FilePath, folder / "second.dat");
+    dialogs = ScriptedDialogs();
+    dialogs.expectMessage(Answer::Ok);
+    EXPECT_FALSE(save(false).saved);
+    expectReported(61);
+    EXPECT_EQ(ReadBytes((folder / "second.dat").string()), OldContent);
+    EXPECT_EQ(namesIn(folder), (std::set<std::string>{"3001.dat", "second.dat"}));
 }
 
 } // namespace

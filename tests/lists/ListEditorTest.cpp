@@ -115,7 +115,7 @@ TEST_F(ListEditing, UpdateReplacesTheSelectedEntry)
     dialogs.expectMessage(Answer::Ok);
     list.updateSelected();
     EXPECT_EQ(dialogs.messages.back().title, "Update Entry");
-    EXPECT_EQ(dialogs.messages.back().text, "The entry '<none>' is not allowd to delete.");
+    EXPECT_EQ(dialogs.messages.back().text, "The entry '<none>' is not allowd to change.");
     EXPECT_EQ(list.entries().front(), "<none>");
 }
 

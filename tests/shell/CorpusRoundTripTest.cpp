@@ -45,15 +45,15 @@ std::vector<std::string> nonEmptyLinesAfterTheHeader(std::string content)
     if (IsUnixLineEnd(content))
         content = LfToCrLf(content);
     std::vector<std::string> lines;
-    std::vector<std::string_view> words;
     bool headerEnded = false;
     LineReader reader(content);
     while (!reader.atEnd()) {
         const auto line = reader.nextLine();
-        SplitWords(line, words);
-        const bool invertNext = words.size() >= 3 && words[0] == "0" && words[1] == "BFC" &&
-                                (words[2] == "INVERTNEXT" || (words[2] == "CERTIFY" && words.size() >= 4 && words[3] == "INVERTNEXT"));
-        if (!line.empty() && (words[0] != "0" || invertNext))
+        const Words words(line);
+        const bool invertNext = words.count() >= 3 && words.word(1) == "0" && words.word(2) == "BFC" &&
+                                (words.word(3) == "INVERTNEXT" ||
+                                 (words.word(3) == "CERTIFY" && words.count() >= 4 && words.word(4) == "INVERTNEXT"));
+        if (!line.empty() && (words.word(1) != "0" || invertNext))
             headerEnded = true;
         const auto trimmed = TrimBlanks(line);
         if (headerEnded && !trimmed.empty())

@@ -141,6 +141,40 @@ TEST_F(WindowTest, TypingRecomposesAndMarksTheFileChanged)
     EXPECT_NE(child<QLabel>("lblLength")->styleSheet().indexOf("255, 0, 0"), -1);
 }
 
+// Keys that reach a box without being typed there, as Qt delivers them, are no edits: closing the
+// window afterwards asks nothing.
+TEST_F(WindowTest, KeysMeantForMenusDialogsAndOtherWindowsAreNoEdits)
+{
+    startUp();
+    openThroughPendingFile(part("3001.dat", GoodPart));
+    auto* description = child<QLineEdit>("txPartDescription");
+    description->setFocus();
+    const auto send = [description](QEvent::Type type, int key, Qt::KeyboardModifiers modifiers = {}) {
+        QKeyEvent event(type, key, modifiers);
+        QApplication::sendEvent(description, &event);
+    };
+    const auto focus = [description](QEvent::Type type, Qt::FocusReason reason) {
+        QFocusEvent event(type, reason);
+        QApplication::sendEvent(description, &event);
+    };
+    // Alt+I opens the File menu, Escape closes it: the box sees Alt pressed, loses the focus to
+    // the menu, and then gets the releases.
+    send(QEvent::KeyPress, Qt::Key_Alt, Qt::AltModifier);
+    focus(QEvent::FocusOut, Qt::PopupFocusReason);
+    focus(QEvent::FocusIn, Qt::PopupFocusReason);
+    send(QEvent::KeyRelease, Qt::Key_Escape);
+    send(QEvent::KeyRelease, Qt::Key_Alt);
+    // The about box closed with Enter: the release of Enter lands in the box.
+    dialogs.expectMessage(Answer::Ok);
+    window->MInfo_Click();
+    send(QEvent::KeyRelease, Qt::Key_Return);
+    // Another application's window takes the focus and gives it back.
+    focus(QEvent::FocusOut, Qt::ActiveWindowFocusReason);
+    focus(QEvent::FocusIn, Qt::ActiveWindowFocusReason);
+    EXPECT_FALSE(app.Header.FileChanged);
+    EXPECT_TRUE(window->close());
+}
+
 TEST_F(WindowTest, PassingThroughABoxMarksTheFileChanged)
 {
     startUp();
@@ -164,8 +198,11 @@ TEST_F(WindowTest, EnterMovesTheFocusAlongTheFields)
     for (const auto& [from, to] : chain) {
         auto* control = child<QWidget>(from);
         control->setFocus();
+        window->setAttribute(Qt::WA_KeyboardFocusChange, false);
         QTest::keyClick(control, Qt::Key_Return);
         EXPECT_EQ(QApplication::focusWidget(), child<QWidget>(to)) << from;
+        // The style draws the focus frame only after a keyboard focus change, as Tab makes.
+        EXPECT_TRUE(window->testAttribute(Qt::WA_KeyboardFocusChange)) << from;
     }
 }
 
@@ -262,15 +299,15 @@ TEST_F(WindowTest, SaveRefusesALongDescriptionAndSelectsItsTail)
     const auto path = part("3001.dat", GoodPart);
     openThroughPendingFile(path);
     auto* description = child<QLineEdit>("txPartDescription");
-    description->setText(QString(70, 'd'));
+    // A character beyond the basic plane is one character but two UTF-16 units.
+    description->setText(QString::fromUtf8("\xF0\x9F\x98\x80") + QString(69, 'd'));
     description->setFocus();
     QTest::keyClick(description, Qt::Key_End);
     dialogs.expectMessage(Answer::Ok);
     window->MDateiSpeichern_Click();
     EXPECT_EQ(dialogs.messages.back().text,
               "Length of the part description is limited to 64 character!\r\nSaving the file is not possible");
-    EXPECT_EQ(description->selectionStart(), 64);
-    EXPECT_EQ(description->selectedText().size(), 6);
+    EXPECT_EQ(description->selectedText(), QString(6, 'd'));
     EXPECT_EQ(text("lblLength"), "Length: 70");
     EXPECT_EQ(ReadBytes(path), GoodPart);
 }
@@ -314,19 +351,35 @@ TEST_F(WindowTest, CloseQuestionsThreeAnswers)
     EXPECT_TRUE(window->close());
 }
 
-TEST_F(WindowTest, CloseQuestionsYesKeepsTheWindowWhenTheSaveFails)
+TEST_F(WindowTest, FileChangedOnDiskIsOverwrittenOnlyWhenTheUserSaysSo)
 {
     startUp();
     const auto path = part("3001.dat", GoodPart);
     openThroughPendingFile(path);
     window->show();
+    app.Prefs.MakeBackup = false;
     app.Header.FileChanged = true;
-    std::filesystem::remove(path); // with backups on, a missing file cannot be saved
-    dialogs.expectMessage(Answer::Yes);
-    dialogs.expectMessage(Answer::Ok);
+    const std::string theirs = GoodPart + "1 16 0 0 0 1 0 0 0 1 0 0 0 1 theirs.dat\r\n";
+    TempDir::writeTo(path, theirs);
+
+    // Each road that saves asks, and No writes nothing and goes no further.
+    dialogs.expectMessage(Answer::No);
+    window->MDateiSpeichern_Click();
+    EXPECT_EQ(dialogs.messages.back().title, "File Changed on Disk");
+    dialogs.expectMessage(Answer::Yes); // the close question
+    dialogs.expectMessage(Answer::No);
     EXPECT_FALSE(window->close());
-    EXPECT_EQ(dialogs.messages.back().text, "Error 53 (File not found) in procedure FileSave of Module modQuillmark");
+    dialogs.expectMessage(Answer::No);
+    openThroughPendingFile(part("other.dat", "0 Other\r\n"));
+    EXPECT_EQ(caption(), "Quillmark 1.0.0 [3001.dat]");
+    EXPECT_EQ(ReadBytes(path), theirs);
     EXPECT_TRUE(app.Header.FileChanged);
+
+    dialogs.expectMessage(Answer::Yes);
+    window->MDateiSpeichern_Click();
+    EXPECT_EQ(ReadBytes(path), window->newHeaderText() + app.Header.Body + "\r\n");
+    EXPECT_FALSE(app.Header.FileChanged);
+    EXPECT_TRUE(dialogs.scriptUsedUp());
 }
 
 TEST_F(WindowTest, RefusedSaveStopsTheOpenAndKeepsTheEdits)

@@ -2,6 +2,7 @@
 #include <QCheckBox>
 #include <QComboBox>
 #include <QDropEvent>
+#include <QLabel>
 #include <QLineEdit>
 #include <QListWidget>
 #include <QMimeData>
@@ -137,6 +138,26 @@ TEST_F(ListMenuTest, EscapePressesCloseAndAnUnchangedListClosesWithoutQuestion)
     EXPECT_EQ(app.Header.PartType, "Part");
 }
 
+// Every caption shows whole in the window font: its text is no wider than the room the control
+// leaves it.
+TEST_F(WindowTest, EveryCaptionOfTheThreeWindowsShowsWhole)
+{
+    startUp();
+    frmList list(ListKind::Category, {"<none>"}, app.ProgramFolder, dialogs);
+    frmOption options(PreferencesForm{}, {});
+    for (const QWidget* shown : std::initializer_list<const QWidget*>{window.get(), &list, &options}) {
+        for (const auto* label : shown->findChildren<QLabel*>())
+            EXPECT_LE(label->fontMetrics().horizontalAdvance(label->text()), label->contentsRect().width())
+                << label->objectName().toStdString();
+        for (const auto* button : shown->findChildren<QAbstractButton*>()) {
+            const auto caption = QString(button->text()).remove('&');
+            const int indicator = qobject_cast<const QCheckBox*>(button) ? 20 : 0;
+            EXPECT_LE(button->fontMetrics().horizontalAdvance(caption) + indicator + 4, button->width())
+                << button->objectName().toStdString();
+        }
+    }
+}
+
 TEST_F(WindowTest, PreferencesWindowWithAnEmptyStore)
 {
     startUp();
@@ -210,11 +231,12 @@ TEST_F(WindowTest, SetPreferencesKeepsALicenceThatNoEntryMatches)
 TEST_F(WindowTest, RecentFilesMenuNewestFirstAndAClickOpens)
 {
     startUp();
-    const auto a = part("a.dat", "0 A\r\n"), b = part("b.dat", "0 B\r\n"), c = part("c.dat", "0 C\r\n");
+    // "&" is part of a file's name, not an access key.
+    const auto a = part("a&b.dat", "0 A\r\n"), b = part("b.dat", "0 B\r\n"), c = part("c.dat", "0 C\r\n");
     for (const auto& path : {a, b, c})
         openThroughPendingFile(path);
     EXPECT_EQ(child<QAction>("MRecentFile_1")->text().toStdString(), c);
-    EXPECT_EQ(child<QAction>("MRecentFile_3")->text().toStdString(), a);
+    EXPECT_EQ(child<QAction>("MRecentFile_3")->text(), QString::fromStdString(a).replace("&", "&&"));
     EXPECT_FALSE(child<QAction>("MRecentFile_4")->isVisible());
     child<QAction>("MRecentFile_3")->trigger();
     EXPECT_EQ(text("txPartDescription"), "A");
@@ -252,6 +274,27 @@ void drop(QWidget& target, QMimeData& data)
     QApplication::sendEvent(&target, &enter);
     QDropEvent event(QPointF(10, 10), Qt::CopyAction, &data, Qt::LeftButton, Qt::NoModifier);
     QApplication::sendEvent(&target, &event);
+}
+
+// Paths named relative to the working folder are remembered in full, so that the recent files
+// and the Open dialog still find them when the program starts from another folder.
+TEST_F(WindowTest, RelativePathsFromTheCommandLineAndDropsAreMadeFull)
+{
+    part("a.dat", "0 A\r\n");
+    part("b.dat", "0 B\r\n");
+    const auto previous = std::filesystem::current_path();
+    std::filesystem::create_directory(work.path() / "sub");
+    std::filesystem::current_path(work.path() / "sub");
+    startUp({"../a.dat"});
+    EXPECT_EQ(app.Header.FilePath, (work.path() / "sub/../a.dat").string());
+    QMimeData files;
+    files.setUrls({QUrl::fromLocalFile("./../b.dat")});
+    drop(*window, files);
+    std::filesystem::current_path(previous);
+    EXPECT_EQ(app.Header.FilePath, (work.path() / "sub/../b.dat").string());
+    EXPECT_EQ(store.read(RecentFilesGroup, "RecentFile1", ""), app.Header.FilePath);
+    EXPECT_EQ(store.read(RecentFilesGroup, "RecentFile2", ""), (work.path() / "sub/../a.dat").string());
+    EXPECT_EQ(store.read(DefaultGroup, "LastPath", ""), (work.path() / "sub/..").string());
 }
 
 TEST_F(WindowTest, DroppingFilesOpensTheFirst)

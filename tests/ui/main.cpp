@@ -3,6 +3,7 @@
 #include <gtest/gtest.h>
 
 #include "EventLoop.h"
+#include "WindowFont.h"
 
 int main(int argc, char** argv)
 {
@@ -10,6 +11,7 @@ int main(int argc, char** argv)
         qputenv("QT_QPA_PLATFORM", "offscreen");
     UseLeanEventLoop();
     QApplication application(argc, argv);
+    UseWindowFont();
     ::testing::InitGoogleTest(&argc, argv);
     return RUN_ALL_TESTS();
 }

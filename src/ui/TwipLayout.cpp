@@ -1,0 +1,31 @@
+#include "TwipLayout.h"
+
+#include <QAbstractButton>
+#include <QLabel>
+#include <QPushButton>
+#include <QStyle>
+
+namespace {
+
+// The width the caption needs, with what the style draws around it.
+int widthForCaption(const QWidget& control)
+{
+    if (const auto* button = qobject_cast<const QPushButton*>(&control)) {
+        // A push button's size hint has a floor of its own that the small twip buttons are below.
+        const auto shown = QString(button->text()).remove('&');
+        return button->fontMetrics().horizontalAdvance(shown) +
+               2 * button->style()->pixelMetric(QStyle::PM_ButtonMargin, nullptr, button);
+    }
+    if (qobject_cast<const QLabel*>(&control) || qobject_cast<const QAbstractButton*>(&control))
+        return control.sizeHint().width();
+    return 0;
+}
+
+} // namespace
+
+void WidenToShowCaption(QWidget& control)
+{
+    const int needed = widthForCaption(control);
+    if (needed > control.width())
+        control.resize(needed, control.height());
+}
