@@ -24,13 +24,15 @@ QString shownHeader(const std::string& text, TextEncoding encoding)
     return shown;
 }
 
-// Focus that moves to another control of the window, not to a message box or another window.
+// Focus that moves to another control of the window, not to a message box, a menu or another
+// window.
 bool leftForAnotherControl(QEvent* event)
 {
     if (event->type() != QEvent::FocusOut)
         return false;
     const auto reason = static_cast<QFocusEvent*>(event)->reason();
-    return reason != Qt::ActiveWindowFocusReason && reason != Qt::PopupFocusReason;
+    return reason != Qt::ActiveWindowFocusReason && reason != Qt::PopupFocusReason &&
+           reason != Qt::MenuBarFocusReason;
 }
 
 } // namespace

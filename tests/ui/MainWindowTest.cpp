@@ -158,10 +158,11 @@ TEST_F(WindowTest, KeysMeantForMenusDialogsAndOtherWindowsAreNoEdits)
         QApplication::sendEvent(description, &event);
     };
     // Alt+I opens the File menu, Escape closes it: the box sees Alt pressed, loses the focus to
-    // the menu, and then gets the releases.
+    // the menu bar and its menu, and then gets the releases.
     send(QEvent::KeyPress, Qt::Key_Alt, Qt::AltModifier);
     focus(QEvent::FocusOut, Qt::PopupFocusReason);
-    focus(QEvent::FocusIn, Qt::PopupFocusReason);
+    focus(QEvent::FocusOut, Qt::MenuBarFocusReason);
+    focus(QEvent::FocusIn, Qt::MenuBarFocusReason);
     send(QEvent::KeyRelease, Qt::Key_Escape);
     send(QEvent::KeyRelease, Qt::Key_Alt);
     // The about box closed with Enter: the release of Enter lands in the box.
