@@ -1,7 +1,6 @@
 #include "LineEnds.h"
 
 #include <cstring>
-#include <limits>
 
 #include "LineReader.h"
 #include "Text.h"
@@ -34,28 +33,18 @@ std::string LfToCrLf(std::string_view text)
     return result;
 }
 
-std::string ReplaceText(std::string_view text, std::string_view search, std::string_view replacement,
-                        std::size_t start, std::size_t maxCount, bool ignoreCase)
+std::string ReplaceAll(std::string_view text, std::string_view search, std::string_view replacement)
 {
-    if (search.empty() || start == 0)
+    if (search.empty())
         return std::string(text);
     std::string result;
     result.reserve(text.size());
     std::size_t copiedUpTo = 0;
-    std::size_t searchFrom = start - 1;
-    for (std::size_t replaced = 0; replaced < maxCount; ++replaced) {
-        const auto found = ignoreCase ? FindIgnoreCase(text, search, searchFrom) : text.find(search, searchFrom);
-        if (found == std::string_view::npos)
-            break;
+    for (auto found = text.find(search); found != std::string_view::npos; found = text.find(search, copiedUpTo)) {
         result.append(text, copiedUpTo, found - copiedUpTo);
         result.append(replacement);
-        copiedUpTo = searchFrom = found + search.size();
+        copiedUpTo = found + search.size();
     }
     result.append(text, copiedUpTo);
     return result;
-}
-
-std::string ReplaceAll(std::string_view text, std::string_view search, std::string_view replacement)
-{
-    return ReplaceText(text, search, replacement, 1, std::numeric_limits<std::size_t>::max(), false);
 }

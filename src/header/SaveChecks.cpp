@@ -7,34 +7,29 @@
 
 namespace {
 
-struct Rule {
-    const char* sentence;
+bool descriptionTooLong(const HeaderData& h) { return CharacterCount(h.PartDescription, h.Encoding) > DescriptionLimit; }
+bool missingUserName(const HeaderData& h) { return h.AuthorUserName.empty(); }
+
+// One step of the save's checks: a rule that stops the save with its sentence, or the question
+// whether to save without a user name.
+struct Check {
+    const char* sentence; // nullptr for the user-name question
     bool (*fails)(const HeaderData&);
+    SaveOutcome outcome = SaveOutcome::Refused;
 };
 
-bool descriptionTooLong(const HeaderData& h) { return CharacterCount(h.PartDescription, h.Encoding) > DescriptionLimit; }
-
-const Rule DescriptionRule{"Length of the part description is limited to 64 character!", descriptionTooLong};
-const Rule AuthorRule{"You need to mention the Author!", [](const HeaderData& h) { return h.AuthorRealName.empty(); }};
-
-// The checks that come after the user-name question, in their order.
-const Rule LaterRules[] = {
+// The checks in the one order in which a save makes them and a check lists them.
+const Check Checks[] = {
+    {"Length of the part description is limited to 64 character!", descriptionTooLong,
+     SaveOutcome::DescriptionTooLong},
+    {"You need to mention the Author!", [](const HeaderData& h) { return h.AuthorRealName.empty(); }},
+    {nullptr, missingUserName},
     {"You need to set the BFC type!", [](const HeaderData& h) { return h.Bfc.empty(); }},
     {"You need to set the Liscense type!", [](const HeaderData& h) { return h.License.empty(); }},
     {"You need to set the Part type!", [](const HeaderData& h) { return h.PartType.empty(); }},
     {"Parts with 'needs work' in title needs a proper comment!",
      [](const HeaderData& h) { return h.NeedsWork && h.Comments.empty(); }},
 };
-
-bool missingUserName(const HeaderData& h) { return h.AuthorUserName.empty(); }
-
-bool stops(const Rule& rule, const HeaderData& header, Dialogs& dialogs)
-{
-    if (!rule.fails(header))
-        return false;
-    dialogs.message(StopBox(RefusalText(rule.sentence)));
-    return true;
-}
 
 bool askedYes(Dialogs& dialogs, const char* text, const char* title)
 {
@@ -64,13 +59,14 @@ std::string RefusalText(const std::string& sentence) { return sentence + "\r\nSa
 SaveFindings EvaluateSaveChecks(const HeaderData& h)
 {
     SaveFindings findings;
-    for (const auto* rule : {&DescriptionRule, &AuthorRule})
-        if (rule->fails(h))
-            findings.refusals.push_back(RefusalText(rule->sentence));
-    for (const auto& rule : LaterRules)
-        if (rule.fails(h))
-            findings.refusals.push_back(RefusalText(rule.sentence));
-    findings.missingUserName = missingUserName(h);
+    for (const auto& check : Checks) {
+        if (!check.fails(h))
+            continue;
+        if (check.sentence == nullptr)
+            findings.missingUserName = true;
+        else
+            findings.refusals.push_back(RefusalText(check.sentence));
+    }
     findings.fixups = {HasCertifyInvertNext(h.Body), HasRotationLines(h.Body), HasWriteLines(h.Body), HasColorLines(h)};
     return findings;
 }
@@ -78,16 +74,16 @@ SaveFindings EvaluateSaveChecks(const HeaderData& h)
 SaveResult CheckHeaderAndSave(HeaderData& h, const SaveContext& context)
 {
     auto& dialogs = context.dialogs;
-    if (stops(DescriptionRule, h, dialogs))
-        return {SaveOutcome::DescriptionTooLong, {}};
-    if (stops(AuthorRule, h, dialogs))
-        return {SaveOutcome::Refused, {}};
-    if (missingUserName(h) &&
-        !askedYes(dialogs, "You have not set your username. Do you want to save anyway?", MissingUserNameTitle))
-        return {SaveOutcome::Declined, {}};
-    for (const auto& rule : LaterRules)
-        if (stops(rule, h, dialogs))
-            return {SaveOutcome::Refused, {}};
+    for (const auto& check : Checks) {
+        if (!check.fails(h))
+            continue;
+        if (check.sentence != nullptr) {
+            dialogs.message(StopBox(RefusalText(check.sentence)));
+            return {check.outcome, {}};
+        }
+        if (!askedYes(dialogs, "You have not set your username. Do you want to save anyway?", MissingUserNameTitle))
+            return {SaveOutcome::Declined, {}};
+    }
     offerFixUps(h, context);
     const auto saved = FileSave(h, context.newHeader(), context.makeBackup, context.clock, dialogs);
     return {saved.saved ? SaveOutcome::Saved : SaveOutcome::Failed, saved.backupPath};

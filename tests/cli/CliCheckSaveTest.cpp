@@ -4,13 +4,6 @@
 #include <nlohmann/json.hpp>
 
 #include "CliRun.h"
-#include "Composer.h"
-#include "Dialogs.h"
-#include "FileSave.h"
-#include "FixedClock.h"
-#include "OpenDocument.h"
-#include "ParseProgress.h"
-#include "Corpus.h"
 #include "TempDir.h"
 
 namespace fs = std::filesystem;
@@ -37,7 +30,7 @@ TEST(CliCheck, ListsEveryFindingAndNeverWrites)
     EXPECT_NE(run.out.find(bad + ": missing user name\n"), std::string::npos);
     EXPECT_NE(run.out.find(bad + ": fix-up offered: 0 ROTATION lines in the body\n"), std::string::npos);
     EXPECT_EQ(ReadBytes(bad), NoAuthorPart);
-    EXPECT_EQ(fs::directory_iterator(dir.path()) != fs::directory_iterator(), true);
+    EXPECT_EQ(std::distance(fs::directory_iterator(dir.path()), fs::directory_iterator()), 2);
 }
 
 TEST(CliCheck, JsonObjectPerFile)
@@ -105,58 +98,6 @@ TEST(CliSave, FailedSaveExitsThree)
     EXPECT_EQ(run.status, 3);
     EXPECT_NE(run.out.find("failed " + part + ": Error 5 "), std::string::npos);
     EXPECT_EQ(ReadBytes(part), GoodPart);
-}
-
-// Every corpus file, saved as the window saves it (no checks) with backups on and off, is
-// written exactly as print shows it, and its backup is the original byte for byte.
-TEST(CorpusSave, SavedCopyEqualsPrintAndBackupEqualsOriginal)
-{
-    const auto files = CorpusPartFiles();
-    if (files.empty())
-        GTEST_SKIP() << "no corpus folder beside the project";
-    TempDir dir;
-    DefaultAnswers dialogs;
-    ParseProgress progress;
-    const FixedClock clock;
-    for (const auto& file : files) {
-        const auto original = ReadBytes(file.string());
-        const auto printed = RunCliWith({"print", file.string()}).out;
-        for (const bool backup : {false, true}) {
-            const auto copy = (dir.path() / file.filename()).string();
-            TempDir::writeTo(copy, original);
-            HeaderData header;
-            OpenPartFileContent(header, copy, original, dialogs, progress);
-            const auto saved = FileSave(header, ComposeHeader(header), backup, clock, dialogs);
-            ASSERT_TRUE(saved.saved) << file;
-            EXPECT_EQ(ReadBytes(copy), printed) << file;
-            if (backup) {
-                EXPECT_EQ(ReadBytes(saved.backupPath), original) << file;
-            }
-            fs::remove_all(dir.path());
-            fs::create_directory(dir.path());
-        }
-    }
-}
-
-// The save command writes the same for every file that passes the checks.
-TEST(CorpusSave, SaveCommandWritesWhatPrintShows)
-{
-    const auto files = CorpusPartFiles();
-    if (files.empty())
-        GTEST_SKIP() << "no corpus folder beside the project";
-    TempDir dir;
-    int saved = 0;
-    for (const auto& file : files) {
-        const auto copy = (dir.path() / file.filename()).string();
-        TempDir::writeTo(copy, ReadBytes(file.string()));
-        const auto run = RunCliWith({"save", "--no-backup", "--allow-missing-username", copy});
-        if (run.status == 0) {
-            ++saved;
-            EXPECT_EQ(ReadBytes(copy), RunCliWith({"print", file.string()}).out) << file;
-        }
-        fs::remove(copy);
-    }
-    EXPECT_GT(saved, 1000);
 }
 
 } // namespace

@@ -69,12 +69,4 @@ TEST(CliPrint, MissingFileGivesStatusTwoAndNoOutput)
     EXPECT_NE(run.err.find("/nonexistent/folder/x.dat"), std::string::npos);
 }
 
-TEST(CliHelp, ExplainsEachCommand)
-{
-    const auto run = RunCliWith({"--help"});
-    EXPECT_EQ(run.status, 0);
-    EXPECT_NE(run.out.find("fields"), std::string::npos);
-    EXPECT_NE(run.out.find("print"), std::string::npos);
-}
-
 } // namespace

@@ -19,11 +19,16 @@ TEST(Composer, ExampleHeaderInItsLineOrder)
     h.PartType = "Part";
     h.UpdateTag = "2004-01";
     h.Bfc = "CERTIFY CCW";
-    h.Category = "<none>";
-    h.Keywords = {"brick, stud"};
+    h.Category = "Brick";
+    h.Keywords = {"brick, stud", "2 x 4"};
     EXPECT_EQ(ComposeHeader(h), "0 Brick 2 x 4\r\n0 Name: 3001.dat\r\n0 Author: Sam Sample [ssample]\r\n"
                                 "0 !LDRAW_ORG Part UPDATE 2004-01\r\n\r\n0 BFC CERTIFY CCW\r\n\r\n"
-                                "0 !KEYWORDS brick, stud\r\n\r\n");
+                                "0 !CATEGORY Brick\r\n0 !KEYWORDS brick, stud\r\n0 !KEYWORDS 2 x 4\r\n\r\n");
+    // "<none>" writes no category line, and the keywords keep their group.
+    h.Category = "<none>";
+    EXPECT_NE(ComposeHeader(h).find("0 BFC CERTIFY CCW\r\n\r\n0 !KEYWORDS brick, stud\r\n"), std::string::npos);
+    h.Keywords.clear();
+    EXPECT_EQ(ComposeHeader(h).find("CERTIFY CCW\r\n\r\n\r\n"), std::string::npos);
 }
 
 TEST(Composer, EveryGroupFollowedByOneBlankLineAndColourLinesLast)
@@ -68,13 +73,6 @@ TEST(Composer, UpdateTagOnlyForOfficialPartTypes)
     h.UpdateTag.clear();
     h.PartType = "Part";
     EXPECT_NE(ComposeHeader(h).find("0 !LDRAW_ORG Part\r\n"), std::string::npos);
-}
-
-TEST(Composer, CategoryNoneWritesNothingNorItsBlankLine)
-{
-    HeaderData h;
-    h.Category = "<none>";
-    EXPECT_EQ(ComposeHeader(h), ComposeHeader(HeaderData{}));
 }
 
 } // namespace

@@ -1,14 +1,20 @@
+// Saving a part file: what ends on disk, and what a save must never lose: the old bytes when it
+// fails, files behind links, other names of the same file, another program's changes, another
+// user's file, and the file itself when the save is killed.
 #include <gtest/gtest.h>
 
-#include <filesystem>
-#include <set>
+#include <csignal>
+#include <grp.h>
 #include <sys/mount.h>
 #include <sys/stat.h>
+#include <sys/wait.h>
 #include <unistd.h>
 
+#include "Dialogs.h"
 #include "FileSave.h"
 #include "FixedClock.h"
 #include "QmError.h"
+#include "SafeReplace.h"
 #include "ScriptedDialogs.h"
 #include "TempDir.h"
 
@@ -16,12 +22,16 @@ namespace fs = std::filesystem;
 
 namespace {
 
-std::set<std::string> namesIn(const fs::path& folder)
+const std::string OldContent = "0 old\r\n1 16 a.dat\r\n";
+const std::string NewHeader = "0 new\r\n\r\n";
+const std::string NewContent = "0 new\r\n\r\n1 16 a.dat\r\n";
+const std::string BackupName = "3001_Backup_2008-08-10_14-05-09.dat";
+
+struct stat statOf(const std::string& path)
 {
-    std::set<std::string> names;
-    for (const auto& entry : fs::directory_iterator(folder))
-        names.insert(entry.path().filename().string());
-    return names;
+    struct stat info {};
+    ::lstat(path.c_str(), &info);
+    return info;
 }
 
 TEST(MakeBackupName, StampBetweenBaseAndExtension)
@@ -29,7 +39,6 @@ TEST(MakeBackupName, StampBetweenBaseAndExtension)
     const LocalDateTime stamp{2008, 8, 10, 14, 5, 9};
     EXPECT_EQ(MakeBackupName("/parts/3001.dat", stamp), "/parts/3001_Backup_2008-08-10_14-05-09.dat");
     EXPECT_EQ(MakeBackupName("/parts/3001.old.dat", stamp), "/parts/3001_Backup_2008-08-10_14-05-09.old.dat");
-    EXPECT_EQ(MakeBackupName("/3001.dat", stamp), "/3001_Backup_2008-08-10_14-05-09.dat");
     EXPECT_EQ(MakeBackupName("3001.dat", stamp), "3001_Backup_2008-08-10_14-05-09.dat");
     EXPECT_EQ(MakeBackupName("  ", stamp), "unbenannt_Backup_2008-08-10_14-05-09.txt");
     EXPECT_THROW(MakeBackupName("/my.parts/3001", stamp), QmError);
@@ -44,122 +53,72 @@ protected:
         h.FileChanged = true;
     }
     FileSaveResult save(bool backup) { return FileSave(h, NewHeader, backup, clock, dialogs); }
-    void expectReported(int number)
+    // Saving fails with number, is reported, and folder holds the old part file alone.
+    void expectSaveFails(bool backup, int number, const fs::path& folder)
     {
+        dialogs = ScriptedDialogs();
+        dialogs.expectMessage(Answer::Ok);
+        EXPECT_FALSE(save(backup).saved);
         ASSERT_EQ(dialogs.messages.size(), 1u);
-        EXPECT_EQ(dialogs.messages[0].text.rfind("Error " + std::to_string(number) + " (", 0), 0u) << dialogs.messages[0].text;
+        EXPECT_EQ(dialogs.messages[0].text.rfind("Error " + std::to_string(number) + " (", 0), 0u)
+            << dialogs.messages[0].text;
         EXPECT_NE(dialogs.messages[0].text.find(") in procedure FileSave of Module modQuillmark"), std::string::npos);
         EXPECT_TRUE(h.FileChanged);
+        EXPECT_EQ(ReadBytes(h.FilePath), OldContent);
+        EXPECT_EQ(NamesIn(folder), std::set<std::string>{fs::path(h.FilePath).filename().string()});
     }
 
-    // Saving with and without backup fails with number, and folder holds the old part file alone.
-    void expectEverySaveFails(int number, const fs::path& folder)
-    {
-        for (const bool backup : {false, true}) {
-            dialogs = ScriptedDialogs();
-            dialogs.expectMessage(Answer::Ok);
-            EXPECT_FALSE(save(backup).saved);
-            expectReported(number);
-            EXPECT_EQ(ReadBytes(h.FilePath), OldContent);
-            EXPECT_EQ(namesIn(folder), std::set<std::string>{"3001.dat"});
-        }
-    }
-
-    const std::string OldContent = "0 old\r\n1 16 a.dat\r\n";
-    const std::string NewHeader = "0 new\r\n\r\n";
-    const std::string NewContent = "0 new\r\n\r\n1 16 a.dat\r\n";
     TempDir dir;
     HeaderData h;
     ScriptedDialogs dialogs;
     FixedClock clock;
 };
 
-TEST_F(FileSaving, WithoutBackupReplacesTheFile)
-{
-    EXPECT_TRUE(save(false).saved);
-    EXPECT_TRUE(save(false).saved);
-    EXPECT_EQ(ReadBytes(h.FilePath), NewContent);
-    EXPECT_FALSE(h.FileChanged);
-    EXPECT_EQ(namesIn(dir.path()), std::set<std::string>{"3001.dat"});
-}
-
-TEST_F(FileSaving, KeepsThePermissionsOfTheFile)
+TEST_F(FileSaving, WritesTheNewTextKeepingPermissionsAndTheOldInTheBackup)
 {
     ::chmod(h.FilePath.c_str(), 0640);
-    ASSERT_TRUE(save(false).saved);
-    struct stat info {};
-    ::stat(h.FilePath.c_str(), &info);
-    EXPECT_EQ(info.st_mode & 0777, 0640u);
-}
-
-TEST_F(FileSaving, BackupHoldsTheOldContent)
-{
+    EXPECT_TRUE(save(false).saved);
+    EXPECT_FALSE(h.FileChanged);
+    EXPECT_EQ(NamesIn(dir.path()), std::set<std::string>{"3001.dat"});
+    EXPECT_EQ(statOf(h.FilePath).st_mode & 0777, 0640u);
+    TempDir::writeTo(h.FilePath, OldContent);
+    h.ReadStamp.reset();
     const auto result = save(true);
-    EXPECT_TRUE(result.saved);
-    EXPECT_EQ(result.backupPath, dir.file("3001_Backup_2008-08-10_14-05-09.dat"));
+    EXPECT_EQ(result.backupPath, dir.file(BackupName));
     EXPECT_EQ(ReadBytes(result.backupPath), OldContent);
     EXPECT_EQ(ReadBytes(h.FilePath), NewContent);
 }
 
-TEST_F(FileSaving, TwoSavesInTwoSecondsLeaveTwoBackups)
+TEST_F(FileSaving, ABackupNameIsNeverOverwritten)
 {
     ASSERT_TRUE(save(true).saved);
     h.Body = "2 24 b";
-    h.FileChanged = true;
+    dialogs.expectMessage(Answer::Ok);
+    EXPECT_FALSE(save(true).saved); // the same second: the name is taken
+    EXPECT_EQ(dialogs.messages.back().text.rfind("Error 58 (", 0), 0u);
+    EXPECT_EQ(ReadBytes(h.FilePath), NewContent);
     clock.set({2008, 8, 10, 14, 5, 10});
     ASSERT_TRUE(save(true).saved);
-    EXPECT_EQ(namesIn(dir.path()), (std::set<std::string>{"3001.dat", "3001_Backup_2008-08-10_14-05-09.dat",
-                                                          "3001_Backup_2008-08-10_14-05-10.dat"}));
-    EXPECT_EQ(ReadBytes(dir.file("3001_Backup_2008-08-10_14-05-09.dat")), OldContent);
-    EXPECT_EQ(ReadBytes(dir.file("3001_Backup_2008-08-10_14-05-10.dat")), NewContent);
+    EXPECT_EQ(NamesIn(dir.path()),
+              (std::set<std::string>{"3001.dat", BackupName, "3001_Backup_2008-08-10_14-05-10.dat"}));
+    EXPECT_EQ(ReadBytes(dir.file(BackupName)), OldContent);
 }
 
-TEST_F(FileSaving, SecondSaveInTheSameSecondFailsOnTheExistingBackup)
+TEST_F(FileSaving, RefusedSavesAreReportedAndWriteNothing)
 {
-    ASSERT_TRUE(save(true).saved);
-    h.Body = "2 24 b";
-    h.FileChanged = true;
-    dialogs.expectMessage(Answer::Ok);
-    EXPECT_FALSE(save(true).saved);
-    expectReported(58);
-    EXPECT_EQ(ReadBytes(h.FilePath), NewContent);
-    EXPECT_EQ(namesIn(dir.path()), (std::set<std::string>{"3001.dat", "3001_Backup_2008-08-10_14-05-09.dat"}));
-}
-
-TEST_F(FileSaving, NameWithoutDotCannotBeBackedUp)
-{
-    h.FilePath = dir.write("README", OldContent);
-    dialogs.expectMessage(Answer::Ok);
-    EXPECT_FALSE(save(true).saved);
-    expectReported(5);
-    EXPECT_EQ(ReadBytes(h.FilePath), OldContent);
-}
-
-TEST_F(FileSaving, MissingPartFileWithBackupIsReportedAndNothingIsWritten)
-{
-    fs::remove(h.FilePath);
-    dialogs.expectMessage(Answer::Ok);
-    EXPECT_FALSE(save(true).saved);
-    expectReported(53);
-    EXPECT_TRUE(namesIn(dir.path()).empty());
-}
-
-TEST_F(FileSaving, ReadOnlyPartFileIsNotOverwritten)
-{
+    fs::rename(h.FilePath, dir.file("README"));
+    h.FilePath = dir.file("README");
+    expectSaveFails(true, 5, dir.path()); // no "." for the backup's name
+    fs::rename(h.FilePath, dir.file("3001.dat"));
+    h.FilePath = dir.file("3001.dat");
     ::chmod(h.FilePath.c_str(), 0444);
-    expectEverySaveFails(70, dir.path());
-}
-
-TEST_F(FileSaving, FolderThatDisappearedIsReportedAsPathNotFound)
-{
+    expectSaveFails(false, 70, dir.path());
+    expectSaveFails(true, 70, dir.path());
     h.FilePath = (dir.path() / "gone" / "3001.dat").string();
-    for (const bool backup : {false, true}) {
-        dialogs = ScriptedDialogs();
-        dialogs.expectMessage(Answer::Ok);
-        EXPECT_FALSE(save(backup).saved);
-        expectReported(76);
-    }
-    EXPECT_TRUE(namesIn(dir.path()).size() == 1u);
+    dialogs = ScriptedDialogs();
+    dialogs.expectMessage(Answer::Ok);
+    EXPECT_FALSE(save(false).saved);
+    EXPECT_EQ(dialogs.messages.back().text.rfind("Error 76 (", 0), 0u);
 }
 
 TEST_F(FileSaving, RelativePathKeepsItsBackupBesideIt)
@@ -169,16 +128,15 @@ TEST_F(FileSaving, RelativePathKeepsItsBackupBesideIt)
     h.FilePath = "3001.dat";
     const auto result = save(true);
     fs::current_path(previous);
-    EXPECT_TRUE(result.saved);
-    EXPECT_EQ(result.backupPath, "3001_Backup_2008-08-10_14-05-09.dat");
-    EXPECT_EQ(ReadBytes(dir.file(result.backupPath)), OldContent);
+    EXPECT_EQ(result.backupPath, BackupName);
+    EXPECT_EQ(ReadBytes(dir.file(BackupName)), OldContent);
 }
 
 // A small file system of our own, for the faults that permissions cannot make for root.
 class ScratchMount {
 public:
     ScratchMount(const fs::path& at, const char* options)
-        : at_(at), mounted_(::mount("tmpfs", at.c_str(), "tmpfs", 0, options) == 0)
+        : at_(at), mounted_(fs::create_directory(at) && ::mount("tmpfs", at.c_str(), "tmpfs", 0, options) == 0)
     {
     }
     ~ScratchMount()
@@ -196,44 +154,166 @@ private:
     bool mounted_;
 };
 
-TEST_F(FileSaving, ReadOnlyFolderKeepsTheOldFile)
+TEST_F(FileSaving, ReadOnlyOrFullFileSystemKeepsTheOldFile)
 {
-    const auto folder = dir.path() / "ro";
-    fs::create_directory(folder);
-    ScratchMount mount(folder, "size=1m");
-    const bool asRoot = ::geteuid() == 0;
-    if (asRoot && !mount.mounted())
-        GTEST_SKIP() << "running as root without the right to mount a read-only folder";
-    h.FilePath = (folder / "3001.dat").string();
+    const auto readOnly = dir.path() / "ro", full = dir.path() / "full";
+    ScratchMount roMount(readOnly, "size=1m"), fullMount(full, "size=64k");
+    if (!roMount.mounted() || !fullMount.mounted())
+        GTEST_SKIP() << "cannot mount small file systems here";
+    h.FilePath = (readOnly / "3001.dat").string();
     TempDir::writeTo(h.FilePath, OldContent);
-    if (asRoot)
-        ASSERT_TRUE(mount.makeReadOnly());
-    else
-        fs::permissions(folder, fs::perms::owner_read | fs::perms::owner_exec);
-    expectEverySaveFails(70, folder);
-    if (!asRoot)
-        fs::permissions(folder, fs::perms::owner_all);
-}
+    ASSERT_TRUE(roMount.makeReadOnly());
+    for (const bool backup : {false, true})
+        expectSaveFails(backup, 70, readOnly);
 
-TEST_F(FileSaving, FullDiskKeepsTheOldFile)
-{
-    const auto folder = dir.path() / "full";
-    fs::create_directory(folder);
-    ScratchMount mount(folder, "size=64k");
-    if (!mount.mounted())
-        GTEST_SKIP() << "cannot mount a small file system here to fill it";
-    h.FilePath = (folder / "3001.dat").string();
+    h.FilePath = (full / "3001.dat").string();
     TempDir::writeTo(h.FilePath, OldContent);
     h.Body.assign(256 * 1024, '1');
-    expectEverySaveFails(61, folder);
+    for (const bool backup : {false, true})
+        expectSaveFails(backup, 61, full);
     // A file with a second name is rewritten in place: when that fails, its old bytes come back.
-    fs::create_hard_link(h.FilePath, folder / "second.dat");
-    dialogs = ScriptedDialogs();
+    fs::create_hard_link(h.FilePath, full / "second.dat");
     dialogs.expectMessage(Answer::Ok);
     EXPECT_FALSE(save(false).saved);
-    expectReported(61);
-    EXPECT_EQ(ReadBytes((folder / "second.dat").string()), OldContent);
-    EXPECT_EQ(namesIn(folder), (std::set<std::string>{"3001.dat", "second.dat"}));
+    EXPECT_EQ(ReadBytes((full / "second.dat").string()), OldContent);
+    EXPECT_EQ(NamesIn(full), (std::set<std::string>{"3001.dat", "second.dat"}));
 }
+
+TEST_F(FileSaving, ThroughASymbolicLinkTheTargetIsWrittenAndTheLinkStays)
+{
+    fs::create_directory(dir.path() / "models");
+    h.FilePath = dir.file("models/link.dat");
+    fs::create_symlink("../3001.dat", h.FilePath);
+    const auto result = save(true);
+    ASSERT_TRUE(result.saved);
+    EXPECT_TRUE(fs::is_symlink(h.FilePath));
+    EXPECT_EQ(ReadBytes(dir.file("3001.dat")), NewContent);
+    EXPECT_EQ(result.backupPath, dir.file(BackupName));
+    EXPECT_TRUE(S_ISREG(statOf(result.backupPath).st_mode));
+    EXPECT_EQ(ReadBytes(result.backupPath), OldContent);
+    EXPECT_EQ(NamesIn(dir.path() / "models"), std::set<std::string>{"link.dat"});
+}
+
+TEST_F(FileSaving, EveryHardLinkShowsTheNewContent)
+{
+    fs::create_hard_link(h.FilePath, dir.file("other.dat"));
+    const auto inode = statOf(h.FilePath).st_ino;
+    for (const bool backup : {false, true})
+        ASSERT_TRUE(save(backup).saved);
+    EXPECT_EQ(ReadBytes(dir.file("other.dat")), NewContent);
+    EXPECT_EQ(statOf(h.FilePath).st_ino, inode);
+    EXPECT_EQ(ReadBytes(dir.file(BackupName)), NewContent); // a copy, not a third name
+    EXPECT_EQ(NamesIn(dir.path()), (std::set<std::string>{"3001.dat", "other.dat", BackupName}));
+}
+
+TEST_F(FileSaving, AFileChangedOnDiskIsOverwrittenOnlyAfterAsking)
+{
+    h.ReadStamp = StampOfPath(h.FilePath);
+    const std::string theirs = OldContent + "1 16 b.dat\r\n";
+    TempDir::writeTo(h.FilePath, theirs);
+    dialogs.expectMessage(Answer::No);
+    EXPECT_FALSE(save(false).saved);
+    const auto& box = dialogs.messages[0];
+    EXPECT_EQ(box.title, "File Changed on Disk");
+    EXPECT_EQ(box.text, "The file " + h.FilePath +
+                            " was changed by another program after it was opened.\r\n"
+                            "Save anyway and overwrite those changes?");
+    EXPECT_EQ(box.buttons, Buttons::YesNo);
+    EXPECT_EQ(box.icon, Icon::Exclamation);
+    EXPECT_EQ(box.defaultButton, Answer::No);
+    EXPECT_EQ(ReadBytes(h.FilePath), theirs);
+    EXPECT_TRUE(h.FileChanged);
+
+    dialogs.expectMessage(Answer::Yes);
+    EXPECT_TRUE(save(false).saved);
+    EXPECT_EQ(ReadBytes(h.FilePath), NewContent);
+    EXPECT_TRUE(save(false).saved); // the stamp is now the saved file's: no question
+    EXPECT_EQ(dialogs.messages.size(), 2u);
+    fs::remove(h.FilePath); // a file that is gone counts as changed too
+    dialogs.expectMessage(Answer::No);
+    EXPECT_FALSE(save(false).saved);
+}
+
+// Runs act in a child process as the user nobody; its exit status is what act returns.
+int asNobody(const std::function<int()>& act)
+{
+    const pid_t child = ::fork();
+    if (child == 0) {
+        if (::setgroups(0, nullptr) != 0 || ::setresgid(65534, 65534, 65534) != 0 ||
+            ::setresuid(65534, 65534, 65534) != 0)
+            ::_exit(99);
+        ::_exit(act());
+    }
+    int status = 0;
+    ::waitpid(child, &status, 0);
+    return WIFEXITED(status) ? WEXITSTATUS(status) : -1;
+}
+
+TEST(AnotherUsersFile, IsRefusedOrKeepsItsOwner)
+{
+    if (::geteuid() != 0)
+        GTEST_SKIP() << "needs root to act as another user";
+    TempDir dir;
+    fs::permissions(dir.path(), fs::perms::all);
+    const auto saveStatus = [](const std::string& path) {
+        try {
+            ReplaceFileSafely(path, {NewHeader}, std::nullopt);
+            return 0;
+        } catch (const QmError& error) {
+            return error.number();
+        }
+    };
+    const auto rootsOwn = dir.write("roots.dat", OldContent);
+    ::chmod(rootsOwn.c_str(), 0644); // writable for root alone, in a folder everyone may write
+    EXPECT_EQ(asNobody([&] { return saveStatus(rootsOwn); }), 70);
+    EXPECT_EQ(ReadBytes(rootsOwn), OldContent);
+    const auto shared = dir.write("shared.dat", OldContent);
+    ::chmod(shared.c_str(), 0666); // writable for nobody too: rewritten, and still root's
+    EXPECT_EQ(asNobody([&] { return saveStatus(shared); }), 0);
+    EXPECT_EQ(ReadBytes(shared), NewHeader);
+    EXPECT_EQ(statOf(shared).st_uid, 0u);
+    EXPECT_EQ(NamesIn(dir.path()), (std::set<std::string>{"roots.dat", "shared.dat"}));
+}
+
+// A save killed right after each of its steps leaves the old or the new bytes under the part's
+// name, the backup only with the old bytes, and nothing that the next save does not clear (but
+// the copy of a file it was rewriting in place, the one whole copy of the old bytes).
+class KilledSave : public ::testing::TestWithParam<std::tuple<ReplaceStep, bool, bool>> {};
+
+TEST_P(KilledSave, LeavesTheFileWholeAndNoLeftovers)
+{
+    const auto [step, withBackup, hardLinked] = GetParam();
+    TempDir dir;
+    const auto path = dir.write("3001.dat", OldContent);
+    std::set<std::string> names{"3001.dat"};
+    if (hardLinked) {
+        fs::create_hard_link(path, dir.file("second.dat"));
+        names.insert("second.dat");
+    }
+    const auto backup = withBackup ? std::optional(dir.file(BackupName)) : std::nullopt;
+    if (::fork() == 0) {
+        ReplaceFileSafely(path, {NewContent}, backup, [step = step](ReplaceStep reached) {
+            if (reached == step)
+                ::raise(SIGKILL);
+        });
+        ::_exit(0);
+    }
+    ::wait(nullptr);
+    const auto bytes = ReadBytes(path);
+    EXPECT_TRUE(bytes == OldContent || bytes == NewContent) << bytes;
+    if (withBackup && fs::exists(*backup)) {
+        EXPECT_EQ(ReadBytes(*backup), OldContent);
+        names.insert(BackupName);
+    }
+    ReplaceFileSafely(path, {NewContent}, std::nullopt);
+    auto left = NamesIn(dir.path());
+    std::erase_if(left, [](const std::string& name) { return name.rfind(".quillmark-keep-", 0) == 0; });
+    EXPECT_EQ(left, names);
+}
+
+INSTANTIATE_TEST_SUITE_P(EveryStep, KilledSave,
+                         ::testing::Combine(::testing::Values(ReplaceStep::NewTextWritten, ReplaceStep::BackupMade,
+                                                              ReplaceStep::NewTextNamed, ReplaceStep::Placed),
+                                            ::testing::Bool(), ::testing::Bool()));
 
 } // namespace

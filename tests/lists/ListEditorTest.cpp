@@ -59,6 +59,16 @@ TEST_F(ListEditing, AddNormalisesByMode)
     EXPECT_EQ(dialogs.inputsShown.back().title, "New License Type");
 }
 
+TEST_F(ListEditing, SelectionStaysOnItsEntryWhenAnAddedOneGoesBeforeIt)
+{
+    auto list = editor(ListKind::Bfc, {"NOCERTIFY", "CERTIFY CW"});
+    list.select(1); // NOCERTIFY
+    dialogs.expectInput("certify ccw");
+    list.add();
+    list.deleteSelected();
+    EXPECT_EQ(list.entries(), (StringList{"CERTIFY CCW", "CERTIFY CW"}));
+}
+
 TEST_F(ListEditing, DuplicateOrCancelledAddChangesNothing)
 {
     auto list = editor(ListKind::Bfc, {"NOCERTIFY"});

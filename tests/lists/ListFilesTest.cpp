@@ -61,24 +61,4 @@ TEST(ListFiles, WriterPutsCrLfAfterEveryEntry)
     EXPECT_EQ(ReadBytes(path), "");
 }
 
-TEST(DefaultListFiles, StandBesideTheExecutables)
-{
-    ScriptedDialogs dialogs;
-    StandardLists lists;
-    LoadStandardLists(lists, QUILLMARK_PROGRAM_FOLDER, dialogs);
-    EXPECT_EQ(lists.Categories.Count(), 100u);
-    EXPECT_EQ(lists.Categories.Item(1).Description, "<none>");
-    EXPECT_EQ(lists.PartTypes.size(), 20u);
-    EXPECT_EQ(lists.BfcStatements, (StringList{"CERTIFY CCW", "CERTIFY CW", "NOCERTIFY"}));
-    EXPECT_EQ(lists.Licenses.size(), 5u);
-}
-
-TEST(Categories, NumberedFromOne)
-{
-    colCategory categories;
-    categories.Add("", "Brick");
-    EXPECT_EQ(categories.Item(1).Description, "Brick");
-    EXPECT_THROW(categories.Item(2), QmError);
-}
-
 } // namespace

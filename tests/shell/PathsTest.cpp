@@ -1,12 +1,10 @@
 #include <gtest/gtest.h>
 
-#include "CommandLine.h"
 #include "Paths.h"
 #include "ScriptedDialogs.h"
 
 namespace {
 
-using Pieces = std::vector<std::string>;
 
 TEST(PathHelpers, NameAndFolder)
 {
@@ -31,17 +29,6 @@ TEST(PathHelpers, BlankPathHasNoNameAndIsReported)
     EXPECT_EQ(dialogs.messages[0].text, "Error 9 (Subscript out of range) in procedure DateiNurName of Modul modFunctions");
     EXPECT_EQ(dialogs.messages[0].title, "Quillmark");
     EXPECT_EQ(DateiNurPfad(""), "");
-}
-
-TEST(CommandLine, BlanksSeparateUnlessTheLineHoldsAQuote)
-{
-    EXPECT_EQ(SplitCommandLine(""), (Pieces{""}));
-    EXPECT_EQ(SplitCommandLine("/parts/3001.dat"), (Pieces{"", "/parts/3001.dat"}));
-    EXPECT_EQ(SplitCommandLine("/My Parts/3001.dat", 1), (Pieces{"", "/My"}));
-    EXPECT_EQ(SplitCommandLine("\"/My Parts/3001.dat\"", 1), (Pieces{"", "/My Parts/3001.dat"}));
-    EXPECT_EQ(SplitCommandLine("\"/a b.dat\"\"/c.dat\"", 1), (Pieces{"", "/a b.dat"}));
-    EXPECT_EQ(SplitCommandLine(" \"/a.dat\"", 1), (Pieces{"", " "}));
-    EXPECT_EQ(SplitCommandLine("a  b\tc"), (Pieces{"", "a", "b\tc"}));
 }
 
 } // namespace

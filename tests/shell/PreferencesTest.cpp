@@ -13,19 +13,6 @@ protected:
     Preferences preferences;
 };
 
-TEST_F(PreferencesStore, EmptyStoreGivesEmptyFormWithBackupOn)
-{
-    const auto form = OpenPreferencesForm(preferences, store);
-    EXPECT_EQ(form.realName, "");
-    EXPECT_EQ(form.license, "");
-    EXPECT_TRUE(form.backup);
-    SavePreferencesForm(form, preferences, store);
-    EXPECT_EQ(store.read(DefaultGroup, "RealName", "?"), "");
-    EXPECT_EQ(store.read(DefaultGroup, "UserName", "?"), "");
-    EXPECT_EQ(store.read(DefaultGroup, "Liscense", "?"), "");
-    EXPECT_EQ(store.read(DefaultGroup, "Backup", "?"), "True");
-}
-
 TEST_F(PreferencesStore, BackupIsOnOnlyForTrueOrWahr)
 {
     const std::pair<const char*, bool> cases[] = {{"True", true}, {" True ", true}, {"Wahr", true},

@@ -1,10 +1,15 @@
 #include "ScriptedDialogs.h"
 
 #include <gtest/gtest.h>
+#include <stdexcept>
 
 Answer ScriptedDialogs::message(const MessageBox& box)
 {
     messages.push_back(box);
+    if (failNext_) {
+        failNext_ = false;
+        throw std::runtime_error("scripted failure");
+    }
     if (answers_.empty()) {
         ADD_FAILURE() << "unexpected message box: " << box.title << ": " << box.text;
         return box.buttons == Buttons::Ok ? Answer::Ok : Answer::Cancel;

@@ -14,6 +14,8 @@ public:
     void expectMessage(Answer answer) { answers_.push_back(answer); }
     void expectInput(std::string typed) { inputs_.push_back(std::move(typed)); }
     void expectOpenFile(std::optional<std::string> chosen) { files_.push_back(std::move(chosen)); }
+    // The next message box throws instead of answering, as a failure inside a command would.
+    void failNextMessage() { failNext_ = true; }
 
     Answer message(const MessageBox& box) override;
     std::string input(const std::string& prompt, const std::string& title, const std::string& defaultText) override;
@@ -30,6 +32,7 @@ public:
     bool scriptUsedUp() const { return answers_.empty() && inputs_.empty() && files_.empty(); }
 
 private:
+    bool failNext_ = false;
     std::deque<Answer> answers_;
     std::deque<std::string> inputs_;
     std::deque<std::optional<std::string>> files_;

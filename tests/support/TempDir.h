@@ -1,6 +1,7 @@
 #pragma once
 
 #include <filesystem>
+#include <set>
 #include <string>
 
 // A fresh folder under the system's temporary folder, removed with everything in it.
@@ -22,3 +23,6 @@ private:
 };
 
 std::string ReadBytes(const std::string& path);
+
+// The names of the entries in folder.
+std::set<std::string> NamesIn(const std::filesystem::path& folder);
