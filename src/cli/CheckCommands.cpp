@@ -1,16 +1,24 @@
 #include "CheckCommands.h"
 
+#include <filesystem>
+#include <map>
+#include <mutex>
 #include <nlohmann/json.hpp>
+#include <sstream>
 
+#include "Batch.h"
 #include "CliFiles.h"
 #include "Clock.h"
 #include "Composer.h"
-#include "FileSave.h"
 #include "ConsoleDialogs.h"
-#include "SaveChecks.h"
+#include "FileSave.h"
+#include "PartFileList.h"
+#include "Summary.h"
 #include "Text.h"
 
 namespace {
+
+std::string firstLine(const std::string& text) { return text.substr(0, text.find('\r')); }
 
 std::string checkJson(const HeaderData& header, const SaveFindings& findings)
 {
@@ -22,76 +30,150 @@ std::string checkJson(const HeaderData& header, const SaveFindings& findings)
                       {"rotation", findings.fixups.rotation},
                       {"write", findings.fixups.write},
                       {"color", findings.fixups.color}};
-    return json.dump();
+    return json.dump() + '\n';
 }
 
-void printFindings(std::ostream& out, const std::string& path, const SaveFindings& findings)
+std::string findingLines(const std::string& path, const SaveFindings& findings)
+{
+    std::string lines;
+    for (const auto& refusal : findings.refusals)
+        lines += path + ": refused: " + firstLine(refusal) + '\n';
+    if (findings.missingUserName)
+        lines += path + ": missing user name\n";
+    for (const auto& [offered, what] : FixUpNames(findings.fixups))
+        if (offered)
+            lines += path + ": fix-up offered: " + what + '\n';
+    return lines.empty() ? path + ": ok\n" : lines;
+}
+
+void noteFindings(FileReport& report, const SaveFindings& findings)
 {
     for (const auto& refusal : findings.refusals)
-        out << path << ": refused: " << refusal.substr(0, refusal.find('\r')) << '\n';
-    if (findings.missingUserName)
-        out << path << ": missing user name\n";
-    const auto& f = findings.fixups;
-    const std::pair<bool, const char*> offers[] = {{f.certifyInvertNext, "0 BFC CERTIFY INVERTNEXT in the body"},
-                                                   {f.rotation, "0 ROTATION lines in the body"},
-                                                   {f.write, "0 WRITE lines in the body"},
-                                                   {f.color, "COLOR lines in the header"}};
-    bool anything = !findings.refusals.empty() || findings.missingUserName;
-    for (const auto& [offered, what] : offers) {
-        if (offered)
-            out << path << ": fix-up offered: " << what << '\n';
-        anything = anything || offered;
+        report.refusals.push_back(firstLine(refusal));
+    report.missingUserName = findings.missingUserName;
+    report.fixups = findings.fixups;
+}
+
+// Opens the file at path and lets handle fill the report; an unreadable file is reported as such.
+FileReport reportOn(const std::string& path, ConsoleDialogs::Answerer answerer,
+                    const std::function<void(HeaderData&, ConsoleDialogs&, FileReport&)>& handle)
+{
+    FileReport report;
+    std::ostringstream err;
+    ConsoleDialogs dialogs(err, std::move(answerer));
+    auto header = OpenForCli(path, dialogs, err);
+    if (!header) {
+        report.unreadable = true;
+        report.status = ExitStatus::Unreadable;
+    } else {
+        try {
+            handle(*header, dialogs, report);
+        } catch (const std::exception& failure) {
+            ReportUnreadable(path, failure, err);
+            report = FileReport{};
+            report.unreadable = true;
+            report.status = ExitStatus::Unreadable;
+        }
     }
-    if (!anything)
-        out << path << ": ok\n";
+    report.err = err.str();
+    return report;
+}
+
+int runBatch(const std::vector<std::string>& arguments, const BatchOptions& batch, std::ostream& out,
+             std::ostream& err, const std::function<FileReport(const std::string&)>& work)
+{
+    const auto files = ExpandPartFiles(arguments);
+    Summary summary;
+    int status = ExitStatus::Ok;
+    RunInOrder(
+        files.size(), ThreadsFor(batch.threads), [&](std::size_t index) { return work(files[index]); },
+        [&](FileReport& report) {
+            out << report.out;
+            err << report.err;
+            summary.add(report);
+            status = std::max(status, report.status);
+        },
+        batch.errIsTerminal && !batch.quiet ? &err : nullptr);
+    if (!batch.quiet)
+        summary.print(err);
+    return status;
+}
+
+// Saves of one file never run at the same time, even when it is named twice.
+class FileLocks {
+public:
+    std::mutex& of(const std::string& path)
+    {
+        std::error_code error;
+        auto key = std::filesystem::weakly_canonical(path, error).string();
+        const std::lock_guard lock(mutex_);
+        return locks_[error ? path : key];
+    }
+
+private:
+    std::mutex mutex_;
+    std::map<std::string, std::mutex> locks_;
+};
+
+std::string savedLine(const std::string& path, const SaveOptions& options, const SaveResult& result,
+                      ConsoleDialogs& dialogs, FileReport& report)
+{
+    switch (result.outcome) {
+    case SaveOutcome::Saved:
+        report.saving = FileReport::Saving::Saved;
+        return "saved " + path + (options.backup ? " (backup: " + result.backupPath + ")" : " (no backup)") + '\n';
+    case SaveOutcome::Declined:
+        report.saving = FileReport::Saving::Skipped;
+        report.status = ExitStatus::Refused;
+        return "skipped " + path + ": no user name set\n";
+    case SaveOutcome::Failed:
+        report.saving = FileReport::Saving::Failed;
+        report.status = ExitStatus::SaveFailed;
+        return "failed " + path + ": " +
+               (dialogs.lastTitle() == ChangedOnDiskTitle ? "changed while saving" : dialogs.lastMessage()) + '\n';
+    case SaveOutcome::Refused:
+    case SaveOutcome::DescriptionTooLong:
+        break;
+    }
+    report.saving = FileReport::Saving::Skipped;
+    report.status = ExitStatus::Refused;
+    report.refusals.push_back(firstLine(dialogs.lastMessage()));
+    return "skipped " + path + ": " + firstLine(dialogs.lastMessage()) + '\n';
 }
 
 } // namespace
 
-int RunCheck(const std::vector<std::string>& paths, bool json, ConsoleDialogs& dialogs, std::ostream& out,
+int RunCheck(const std::vector<std::string>& arguments, bool json, const BatchOptions& batch, std::ostream& out,
              std::ostream& err)
 {
-    return ForEachOpenedFile(paths, dialogs, err, [&](HeaderData& header) {
-        const auto findings = EvaluateSaveChecks(header);
-        if (json)
-            out << checkJson(header, findings) << '\n';
-        else
-            printFindings(out, header.FilePath, findings);
-        return findings.refusals.empty() ? ExitStatus::Ok : ExitStatus::Refused;
+    return runBatch(arguments, batch, out, err, [&](const std::string& path) {
+        return reportOn(path, {}, [&](HeaderData& header, ConsoleDialogs&, FileReport& report) {
+            const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
+            report.out = json ? checkJson(header, findings) : findingLines(header.FilePath, findings);
+            noteFindings(report, findings);
+            report.status = findings.refusals.empty() ? ExitStatus::Ok : ExitStatus::Refused;
+        });
     });
 }
 
-int RunSave(const std::vector<std::string>& paths, const SaveOptions& options, std::ostream& out, std::ostream& err)
+int RunSave(const std::vector<std::string>& arguments, const SaveOptions& options, const BatchOptions& batch,
+            std::ostream& out, std::ostream& err)
 {
-    ConsoleDialogs dialogs(err, [&options](const MessageBox& box) {
+    const auto answer = [&options](const MessageBox& box) {
         // Another program's changes since the file was read are never overwritten from here.
         if (box.title == ChangedOnDiskTitle)
             return Answer::No;
         const bool userNameQuestion = box.title == MissingUserNameTitle;
-        const bool yes = userNameQuestion ? options.allowMissingUserName : options.fix;
-        return yes ? Answer::Yes : Answer::No;
-    });
+        return (userNameQuestion ? options.allowMissingUserName : options.fix) ? Answer::Yes : Answer::No;
+    };
     const SystemClock clock;
-    return ForEachOpenedFile(paths, dialogs, err, [&](HeaderData& header) {
-        const SaveContext context{dialogs, clock, options.backup, [&header] { return ComposeHeader(header); }, [] {}};
-        const auto& path = header.FilePath;
-        const auto result = CheckHeaderAndSave(header, context);
-        switch (result.outcome) {
-        case SaveOutcome::Saved:
-            out << "saved " << path << (options.backup ? " (backup: " + result.backupPath + ")" : " (no backup)") << '\n';
-            return ExitStatus::Ok;
-        case SaveOutcome::Declined:
-            out << "skipped " << path << ": no user name set\n";
-            return ExitStatus::Refused;
-        case SaveOutcome::Failed:
-            out << "failed " << path << ": " << (dialogs.lastTitle() == ChangedOnDiskTitle ? "changed while saving" : dialogs.lastMessage()) << '\n';
-            return ExitStatus::SaveFailed;
-        case SaveOutcome::Refused:
-        case SaveOutcome::DescriptionTooLong:
-            break;
-        }
-        const auto& refusal = dialogs.lastMessage();
-        out << "skipped " << path << ": " << refusal.substr(0, refusal.find('\r')) << '\n';
-        return ExitStatus::Refused;
+    FileLocks locks;
+    return runBatch(arguments, batch, out, err, [&](const std::string& path) {
+        const std::lock_guard lock(locks.of(path));
+        return reportOn(path, answer, [&](HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
+            const SaveContext context{dialogs, clock, options.backup, [&header] { return ComposeHeader(header); },
+                                      [] {}, batch.limitDescription};
+            report.out = savedLine(header.FilePath, options, CheckHeaderAndSave(header, context), dialogs, report);
+        });
     });
 }

@@ -4,10 +4,16 @@
 #include <string>
 #include <vector>
 
-class ConsoleDialogs;
+// How check and save work through many files.
+struct BatchOptions {
+    unsigned threads = 0;          // 0: one per core
+    bool quiet = false;            // no summary at the end
+    bool limitDescription = true;  // the description's 64 characters
+    bool errIsTerminal = false;    // a progress line is drawn on a terminal only
+};
 
-// check: every save check on every file, without writing anything.
-int RunCheck(const std::vector<std::string>& paths, bool json, ConsoleDialogs& dialogs, std::ostream& out,
+// check: every save check on every file (folders searched for part files), without writing.
+int RunCheck(const std::vector<std::string>& arguments, bool json, const BatchOptions& batch, std::ostream& out,
              std::ostream& err);
 
 struct SaveOptions {
@@ -17,4 +23,5 @@ struct SaveOptions {
 };
 
 // save: re-saves every file as "&Save" does, answering its questions by the options.
-int RunSave(const std::vector<std::string>& paths, const SaveOptions& options, std::ostream& out, std::ostream& err);
+int RunSave(const std::vector<std::string>& arguments, const SaveOptions& options, const BatchOptions& batch,
+            std::ostream& out, std::ostream& err);

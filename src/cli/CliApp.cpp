@@ -6,7 +6,7 @@
 #include "CheckCommands.h"
 #include "PrintCommands.h"
 
-int RunCli(int argc, const char* const* argv, std::ostream& out, std::ostream& err)
+int RunCli(int argc, const char* const* argv, std::ostream& out, std::ostream& err, bool errIsTerminal)
 {
     CLI::App app{"quillmark-cli: reads LDraw part files (*.dat) the way the Quillmark editor opens them."};
     app.name("quillmark-cli");
@@ -22,25 +22,38 @@ int RunCli(int argc, const char* const* argv, std::ostream& out, std::ostream& e
         "print", "Write to standard output exactly the bytes that saving FILE right after opening it would write.");
     print->add_option("FILE", printFile, "Part file to read")->required();
 
+    BatchOptions batch;
+    batch.errIsTerminal = errIsTerminal;
+    bool noLengthLimit = false;
+    const auto addBatchOptions = [&](CLI::App* command) {
+        command->add_flag("--no-length-limit", noLengthLimit, "Allow part descriptions of any length");
+        command->add_option("-j,--jobs", batch.threads, "Files worked on at once (default: one per core)");
+        command->add_flag("--quiet", batch.quiet, "No summary at the end on standard error");
+    };
+
     std::vector<std::string> checkFiles;
     bool checkJson = false;
     auto* check = app.add_subcommand(
-        "check", "Run every save check on each FILE without writing: refusals, a missing user name, and the "
-                 "fix-ups a save would offer. Exit status 1 when any file would be refused, 2 when one cannot be read.");
+        "check", "Run every save check on each FILE, or each part file (*.dat) below a FOLDER, without writing: "
+                 "refusals, a missing user name, and the fix-ups a save would offer; then a summary on standard "
+                 "error. Exit status 1 when any file would be refused, 2 when one cannot be read.");
     check->add_flag("--json", checkJson, "One JSON object per file and line");
-    check->add_option("FILE", checkFiles, "Part files to check")->required();
+    addBatchOptions(check);
+    check->add_option("FILE", checkFiles, "Part files or folders to check")->required();
 
     std::vector<std::string> saveFiles;
     bool noBackup = false;
     SaveOptions saveOptions;
     auto* save = app.add_subcommand(
-        "save", "Re-save each FILE as the editor's Save does: checked, optionally fixed, with a dated backup. "
-                "Exit status 1 when a file was skipped, 2 when one cannot be read, 3 when a save failed.");
+        "save", "Re-save each FILE, or each part file below a FOLDER, as the editor's Save does: checked, "
+                "optionally fixed, with a dated backup. Exit status 1 when a file was skipped, 2 when one cannot "
+                "be read, 3 when a save failed.");
     save->add_flag("--no-backup", noBackup, "Do not keep the old file under a dated backup name");
     save->add_flag("--fix", saveOptions.fix, "Apply all four body and colour fix-ups");
     save->add_flag("--allow-missing-username", saveOptions.allowMissingUserName,
                    "Save files whose author line has no user name");
-    save->add_option("FILE", saveFiles, "Part files to save")->required();
+    addBatchOptions(save);
+    save->add_option("FILE", saveFiles, "Part files or folders to save")->required();
 
     try {
         app.parse(argc, argv);
@@ -49,13 +62,14 @@ int RunCli(int argc, const char* const* argv, std::ostream& out, std::ostream& e
     }
 
     ConsoleDialogs dialogs(err);
+    batch.limitDescription = !noLengthLimit;
     if (*fields)
         return RunFields(fieldsFiles, dialogs, out, err);
     if (*check)
-        return RunCheck(checkFiles, checkJson, dialogs, out, err);
+        return RunCheck(checkFiles, checkJson, batch, out, err);
     if (*save) {
         saveOptions.backup = !noBackup;
-        return RunSave(saveFiles, saveOptions, out, err);
+        return RunSave(saveFiles, saveOptions, batch, out, err);
     }
     return RunPrint(printFile, dialogs, out, err);
 }

@@ -2,5 +2,6 @@
 
 #include <ostream>
 
-// quillmark-cli: the header core on the command line. Returns the exit status.
-int RunCli(int argc, const char* const* argv, std::ostream& out, std::ostream& err);
+// quillmark-cli: the header core on the command line. Returns the exit status. A progress line
+// is drawn on err only when it is a terminal.
+int RunCli(int argc, const char* const* argv, std::ostream& out, std::ostream& err, bool errIsTerminal = false);

@@ -8,12 +8,12 @@
 #include "PartFile.h"
 #include "QmError.h"
 
-namespace {
-
-void reportUnreadable(const std::string& path, const std::exception& failure, std::ostream& err)
+void ReportUnreadable(const std::string& path, const std::exception& failure, std::ostream& err)
 {
     err << "quillmark-cli: cannot read " << path << ": " << ErrorOf(failure).description() << '\n';
 }
+
+namespace {
 
 // A failure while working on one file (running out of memory, say) ends that file, not the run.
 int handleCatching(const std::string& path, HeaderData& header, std::ostream& err,
@@ -22,7 +22,7 @@ int handleCatching(const std::string& path, HeaderData& header, std::ostream& er
     try {
         return handle(header);
     } catch (const std::exception& failure) {
-        reportUnreadable(path, failure, err);
+        ReportUnreadable(path, failure, err);
         return ExitStatus::Unreadable;
     }
 }
@@ -40,7 +40,7 @@ std::optional<HeaderData> OpenForCli(const std::string& path, ConsoleDialogs& di
         header.ReadStamp = content.stamp();
         return header;
     } catch (const std::exception& failure) {
-        reportUnreadable(path, failure, err);
+        ReportUnreadable(path, failure, err);
         return std::nullopt;
     }
 }

@@ -18,6 +18,9 @@ inline constexpr int Unreadable = 2;
 inline constexpr int SaveFailed = 3;
 } // namespace ExitStatus
 
+// The one line that names a file that could not be read or worked on.
+void ReportUnreadable(const std::string& path, const std::exception& failure, std::ostream& err);
+
 // Opens path as the Open command does. When the file cannot be read, says so in one line on
 // err and returns nullopt.
 std::optional<HeaderData> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err);

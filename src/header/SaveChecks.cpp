@@ -31,6 +31,12 @@ const Check Checks[] = {
      [](const HeaderData& h) { return h.NeedsWork && h.Comments.empty(); }},
 };
 
+// The one check that the author may turn off: today's header standard no longer limits it.
+bool applies(const Check& check, bool limitDescription)
+{
+    return limitDescription || check.outcome != SaveOutcome::DescriptionTooLong;
+}
+
 bool askedYes(Dialogs& dialogs, const char* text, const char* title)
 {
     return dialogs.message(QuestionBox(text, title)) == Answer::Yes;
@@ -56,11 +62,11 @@ void offerFixUps(HeaderData& h, const SaveContext& context)
 
 std::string RefusalText(const std::string& sentence) { return sentence + "\r\nSaving the file is not possible"; }
 
-SaveFindings EvaluateSaveChecks(const HeaderData& h)
+SaveFindings EvaluateSaveChecks(const HeaderData& h, bool limitDescription)
 {
     SaveFindings findings;
     for (const auto& check : Checks) {
-        if (!check.fails(h))
+        if (!applies(check, limitDescription) || !check.fails(h))
             continue;
         if (check.sentence == nullptr)
             findings.missingUserName = true;
@@ -75,7 +81,7 @@ SaveResult CheckHeaderAndSave(HeaderData& h, const SaveContext& context)
 {
     auto& dialogs = context.dialogs;
     for (const auto& check : Checks) {
-        if (!check.fails(h))
+        if (!applies(check, context.limitDescription) || !check.fails(h))
             continue;
         if (check.sentence != nullptr) {
             dialogs.message(StopBox(RefusalText(check.sentence)));

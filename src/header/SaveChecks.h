@@ -27,7 +27,8 @@ struct SaveFindings {
     bool missingUserName = false;
     FixUpOffers fixups;
 };
-SaveFindings EvaluateSaveChecks(const HeaderData& header);
+// With limitDescription off, the description may be of any length.
+SaveFindings EvaluateSaveChecks(const HeaderData& header, bool limitDescription = true);
 
 enum class SaveOutcome {
     Saved,
@@ -45,6 +46,7 @@ struct SaveContext {
     bool makeBackup;
     std::function<std::string()> newHeader;
     std::function<void()> recompose;
+    bool limitDescription = true; // off: the description may be of any length
 };
 
 struct SaveResult {

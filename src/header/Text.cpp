@@ -69,19 +69,26 @@ std::string ToUpperAscii(std::string_view text)
     return result;
 }
 
-std::size_t FindIgnoreCase(std::string_view text, std::string_view needle, std::size_t from)
-{
-    if (needle.size() > text.size())
-        return std::string_view::npos;
-    for (std::size_t pos = from; pos + needle.size() <= text.size(); ++pos)
-        if (equalIgnoreCaseAt(text, pos, needle))
-            return pos;
-    return std::string_view::npos;
-}
-
 bool ContainsIgnoreCase(std::string_view text, std::string_view needle)
 {
-    return FindIgnoreCase(text, needle) != std::string_view::npos;
+    if (needle.empty())
+        return true;
+    const char first = needle.front();
+    const bool firstHasCase = lowerAscii(first) != upperAscii(first);
+    for (std::size_t pos = 0; pos + needle.size() <= text.size(); ++pos) {
+        // A first byte without case ("0 WRITE") lets memchr skip to the candidates, so a body of
+        // megabytes is not folded byte by byte.
+        if (!firstHasCase) {
+            const auto* found = static_cast<const char*>(
+                std::memchr(text.data() + pos, first, text.size() - needle.size() + 1 - pos));
+            if (found == nullptr)
+                return false;
+            pos = static_cast<std::size_t>(found - text.data());
+        }
+        if (equalIgnoreCaseAt(text, pos, needle))
+            return true;
+    }
+    return false;
 }
 
 bool IsValidUtf8(std::string_view bytes)

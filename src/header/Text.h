@@ -14,9 +14,7 @@ std::string_view TrimBlanks(std::string_view text);
 std::string ToLowerAscii(std::string_view text);
 std::string ToUpperAscii(std::string_view text);
 
-// Position of the first occurrence of needle at or after from, comparing ASCII letters
-// without regard to case; npos when there is none.
-std::size_t FindIgnoreCase(std::string_view text, std::string_view needle, std::size_t from = 0);
+// True when needle occurs in text, comparing ASCII letters without regard to case.
 bool ContainsIgnoreCase(std::string_view text, std::string_view needle);
 
 bool IsValidUtf8(std::string_view bytes);

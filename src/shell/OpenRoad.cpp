@@ -7,6 +7,7 @@ void StartUpState(AppState& app, Services& services)
 {
     // An author who turned backups off gets none from the first save on.
     app.Prefs.MakeBackup = StoredBackupChoice(services.store);
+    app.Prefs.LimitDescription = StoredDescriptionLimit(services.store);
     app.Header.FileLoaded = false;
     app.Header.FileChanged = false;
     app.Header.FileFolder = StartFolder(services.store, app.ProgramFolder);

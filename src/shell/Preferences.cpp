@@ -12,6 +12,16 @@ std::string storedText(const SettingsStore& store, const char* key)
     return TrimBlanks(value).empty() ? std::string() : value;
 }
 
+// A stored choice: "True" or "Wahr" after trimming means on, a missing key too.
+bool storedChoice(const SettingsStore& store, const char* key)
+{
+    const auto value = store.read(DefaultGroup, key, "True");
+    const auto trimmed = TrimBlanks(value);
+    return trimmed == "True" || trimmed == "Wahr";
+}
+
+const char* choiceText(bool on) { return on ? "True" : "False"; }
+
 } // namespace
 
 void LadeDefaults(Preferences& preferences, const SettingsStore& store)
@@ -21,20 +31,18 @@ void LadeDefaults(Preferences& preferences, const SettingsStore& store)
     preferences.DefaultLicense = storedText(store, "Liscense");
 }
 
-bool StoredBackupChoice(const SettingsStore& store)
-{
-    const auto value = store.read(DefaultGroup, "Backup", "True");
-    const auto trimmed = TrimBlanks(value);
-    return trimmed == "True" || trimmed == "Wahr";
-}
+bool StoredBackupChoice(const SettingsStore& store) { return storedChoice(store, "Backup"); }
+
+bool StoredDescriptionLimit(const SettingsStore& store) { return storedChoice(store, "DescriptionLimit"); }
 
 PreferencesForm OpenPreferencesForm(Preferences& preferences, const SettingsStore& store)
 {
     PreferencesForm form{storedText(store, "RealName"), storedText(store, "UserName"), storedText(store, "Liscense"),
-                         StoredBackupChoice(store)};
+                         StoredBackupChoice(store), StoredDescriptionLimit(store)};
     if (!form.license.empty())
         preferences.DefaultLicense = form.license;
     preferences.MakeBackup = form.backup;
+    preferences.LimitDescription = form.descriptionLimit;
     return form;
 }
 
@@ -43,8 +51,10 @@ void SavePreferencesForm(const PreferencesForm& form, Preferences& preferences, 
     store.write(DefaultGroup, "RealName", std::string(TrimBlanks(form.realName)));
     store.write(DefaultGroup, "UserName", std::string(TrimBlanks(form.userName)));
     store.write(DefaultGroup, "Liscense", std::string(TrimBlanks(form.license)));
-    store.write(DefaultGroup, "Backup", form.backup ? "True" : "False");
+    store.write(DefaultGroup, "Backup", choiceText(form.backup));
+    store.write(DefaultGroup, "DescriptionLimit", choiceText(form.descriptionLimit));
     preferences.MakeBackup = form.backup;
+    preferences.LimitDescription = form.descriptionLimit;
 }
 
 std::string StartFolder(const SettingsStore& store, const std::string& programFolder)

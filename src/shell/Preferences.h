@@ -10,6 +10,7 @@ struct Preferences {
     std::string DefaultUserName;
     std::string DefaultLicense;
     bool MakeBackup = true;
+    bool LimitDescription = true; // the description's 64 characters
 };
 
 // Refreshes the three default texts from the store; a value that is blank after trimming is empty.
@@ -17,6 +18,8 @@ void LadeDefaults(Preferences& preferences, const SettingsStore& store);
 
 // The stored "Backup" choice: "True" or "Wahr" after trimming means on, a missing key too.
 bool StoredBackupChoice(const SettingsStore& store);
+// The stored "DescriptionLimit" choice, read as "Backup" is.
+bool StoredDescriptionLimit(const SettingsStore& store);
 
 // What the preferences window shows and saves.
 struct PreferencesForm {
@@ -24,13 +27,16 @@ struct PreferencesForm {
     std::string userName;
     std::string license; // the stored licence; the window selects the last entry equal to it
     bool backup = true;
+    bool descriptionLimit = true;
 };
 
 // Opening the window: the stored values (blank ones shown empty), and at once the stored backup
-// choice into MakeBackup and a stored licence into DefaultLicense.
+// and description-limit choices into MakeBackup and LimitDescription and a stored licence into
+// DefaultLicense.
 PreferencesForm OpenPreferencesForm(Preferences& preferences, const SettingsStore& store);
 
-// Saving the window: the texts trimmed, "Backup" as "True" or "False", and MakeBackup.
+// Saving the window: the texts trimmed, "Backup" and "DescriptionLimit" as "True" or "False", and
+// MakeBackup and LimitDescription.
 void SavePreferencesForm(const PreferencesForm& form, Preferences& preferences, SettingsStore& store);
 
 // The folder the Open dialog starts in: "LastPath", or the program's folder on the first run.

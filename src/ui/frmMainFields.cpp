@@ -150,7 +150,7 @@ void frmMain::showLength()
 {
     const auto length = txPartDescription->text().toUcs4().size();
     lblLength->setText(QString("Length: %1").arg(length));
-    const bool tooLong = static_cast<std::size_t>(length) > DescriptionLimit;
+    const bool tooLong = app_.Prefs.LimitDescription && static_cast<std::size_t>(length) > DescriptionLimit;
     lblLength->setStyleSheet(tooLong ? "background-color: rgb(255, 0, 0);" : "background-color: rgb(0, 255, 0);");
 }
 

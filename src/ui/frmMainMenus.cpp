@@ -60,6 +60,7 @@ void frmMain::MEinstellDefault_Click()
     frmOption dialog(form, displayTexts(app_.Lists.Licenses), this);
     if (dialog.exec() == QDialog::Accepted)
         SavePreferencesForm(dialog.form(), app_.Prefs, services_.store);
+    showLength(); // the limit may have changed
 }
 
 void frmMain::cmdSetPreferences_Click()

@@ -217,8 +217,12 @@ void frmMain::MDateiSpeichern_Click()
 
 SaveResult frmMain::checkHeaderAndSave()
 {
-    const SaveContext context{services_.dialogs, services_.clock, app_.Prefs.MakeBackup,
-                              [this] { return newHeaderText_; }, [this] { MakeNewHeader(); }};
+    const SaveContext context{services_.dialogs,
+                              services_.clock,
+                              app_.Prefs.MakeBackup,
+                              [this] { return newHeaderText_; },
+                              [this] { MakeNewHeader(); },
+                              app_.Prefs.LimitDescription};
     const auto result = CheckHeaderAndSave(app_.Header, context);
     if (result.outcome == SaveOutcome::DescriptionTooLong)
         showDescriptionTooLong();

@@ -14,7 +14,7 @@ frmOption::frmOption(const PreferencesForm& form, const QStringList& sortedLicen
     setObjectName("frmOption");
     setWindowTitle("Preferences");
     setModal(true);
-    setFixedSize(Pixels(7455), Pixels(1890));
+    setFixedSize(Pixels(7455), Pixels(2250));
     Label1 = PlaceCaptioned<QLabel>(this, "Label1", "Your Real Name", 120, 240, 1215, 255);
     txRealName = PlaceChild<QLineEdit>(this, "txRealName", 1560, 240, 4455, 285);
     Label2_0 = PlaceCaptioned<QLabel>(this, "Label2_0", "Your Username", 120, 600, 1215, 255);
@@ -25,7 +25,9 @@ frmOption::frmOption(const PreferencesForm& form, const QStringList& sortedLicen
     cbLicenses = PlaceChild<QComboBox>(this, "cbLicenses", 1560, 960, 4455, 315);
     Label2_3 = PlaceCaptioned<QLabel>(this, "Label2_3", "Liscense Type:", 120, 960, 1335, 255);
     chkBackup = PlaceCaptioned<QCheckBox>(this, "chkBackup", "Backup file", 120, 1440, 1695, 255);
-    ChainTabOrder({txRealName, txUserName, cmdSave, cmdCancel, cbLicenses, chkBackup});
+    chkDescriptionLimit = PlaceCaptioned<QCheckBox>(this, "chkDescriptionLimit",
+                                                    "Limit Part Description to 64 characters", 120, 1800, 4455, 255);
+    ChainTabOrder({txRealName, txUserName, cmdSave, cmdCancel, cbLicenses, chkBackup, chkDescriptionLimit});
 
     txRealName->setText(QString::fromStdString(form.realName));
     txUserName->setText(QString::fromStdString(form.userName));
@@ -36,6 +38,7 @@ frmOption::frmOption(const PreferencesForm& form, const QStringList& sortedLicen
         if (!form.license.empty() && cbLicenses->itemText(i) == stored)
             cbLicenses->setCurrentIndex(i); // the last equal entry stays selected
     chkBackup->setChecked(form.backup);
+    chkDescriptionLimit->setChecked(form.descriptionLimit);
     connect(cmdSave, &QPushButton::clicked, this, &QDialog::accept);
     connect(cmdCancel, &QPushButton::clicked, this, &QDialog::reject);
 }
@@ -44,5 +47,5 @@ PreferencesForm frmOption::form() const
 {
     return {txRealName->text().toStdString(), txUserName->text().toStdString(),
             cbLicenses->currentIndex() < 0 ? std::string() : cbLicenses->currentText().toStdString(),
-            chkBackup->isChecked()};
+            chkBackup->isChecked(), chkDescriptionLimit->isChecked()};
 }

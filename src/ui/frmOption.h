@@ -10,7 +10,7 @@ class QLabel;
 class QLineEdit;
 class QPushButton;
 
-// The preferences window: the author's names, default licence and backup choice.
+// The preferences window: the author's names, default licence, backup and description-limit choices.
 class frmOption : public QDialog {
     Q_OBJECT
 
@@ -30,4 +30,5 @@ private:
     QComboBox* cbLicenses;
     QLabel* Label2_3;
     QCheckBox* chkBackup;
+    QCheckBox* chkDescriptionLimit;
 };

@@ -28,7 +28,7 @@ protected:
     SaveResult save()
     {
         return CheckHeaderAndSave(h, {dialogs, clock, false, [this] { return ComposeHeader(h); },
-                                      [this] { ++recomposed; }});
+                                      [this] { ++recomposed; }, limitDescription});
     }
     std::string saved() const { return ReadBytes(h.FilePath); }
     TempDir dir;
@@ -36,6 +36,7 @@ protected:
     ScriptedDialogs dialogs;
     FixedClock clock;
     int recomposed = 0;
+    bool limitDescription = true;
 };
 
 TEST_F(SaveChecks, CompleteHeaderIsSavedWithoutAQuestion)
@@ -46,13 +47,19 @@ TEST_F(SaveChecks, CompleteHeaderIsSavedWithoutAQuestion)
     EXPECT_TRUE(dialogs.messages.empty());
 }
 
-TEST_F(SaveChecks, DescriptionOfSixtyFiveCharactersIsRefused)
+TEST_F(SaveChecks, DescriptionOfSixtyFiveCharactersIsRefusedUnlessTheLimitIsOff)
 {
     h.PartDescription = std::string(64, 'x');
     EXPECT_EQ(save().outcome, SaveOutcome::Saved);
     h.PartDescription = std::string(65, 'x');
     dialogs.expectMessage(Answer::Ok);
     EXPECT_EQ(save().outcome, SaveOutcome::DescriptionTooLong);
+    // With the limit lifted, only the length rule goes.
+    h.PartDescription = std::string(300, 'x');
+    limitDescription = false;
+    EXPECT_EQ(save().outcome, SaveOutcome::Saved);
+    h.Bfc.clear();
+    EXPECT_EQ(EvaluateSaveChecks(h, false).refusals, std::vector<std::string>{RefusalText("You need to set the BFC type!")});
 }
 
 TEST_F(SaveChecks, DescriptionLengthCountsCharactersOfAUtf8File)

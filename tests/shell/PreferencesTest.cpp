@@ -13,27 +13,34 @@ protected:
     Preferences preferences;
 };
 
-TEST_F(PreferencesStore, BackupIsOnOnlyForTrueOrWahr)
+TEST_F(PreferencesStore, ChoicesAreOnWhenMissingAndOnlyForTrueOrWahr)
 {
+    EXPECT_TRUE(StoredBackupChoice(store));
+    EXPECT_TRUE(StoredDescriptionLimit(store));
     const std::pair<const char*, bool> cases[] = {{"True", true}, {" True ", true}, {"Wahr", true},
                                                   {"true", false}, {"False", false}, {"", false}};
     for (const auto& [stored, on] : cases) {
         store.write(DefaultGroup, "Backup", stored);
+        store.write(DefaultGroup, "DescriptionLimit", stored);
         EXPECT_EQ(StoredBackupChoice(store), on) << stored;
-        preferences.MakeBackup = !on;
+        EXPECT_EQ(StoredDescriptionLimit(store), on) << stored;
+        preferences.MakeBackup = preferences.LimitDescription = !on;
         OpenPreferencesForm(preferences, store);
         EXPECT_EQ(preferences.MakeBackup, on) << "applied on opening, even when cancelled";
+        EXPECT_EQ(preferences.LimitDescription, on);
     }
 }
 
 TEST_F(PreferencesStore, SavingTrimsTheTexts)
 {
-    SavePreferencesForm({"  Jane Doe ", " jdoe", "L ", false}, preferences, store);
+    SavePreferencesForm({"  Jane Doe ", " jdoe", "L ", false, false}, preferences, store);
     EXPECT_EQ(store.read(DefaultGroup, "RealName", ""), "Jane Doe");
     EXPECT_EQ(store.read(DefaultGroup, "UserName", ""), "jdoe");
     EXPECT_EQ(store.read(DefaultGroup, "Liscense", ""), "L");
     EXPECT_EQ(store.read(DefaultGroup, "Backup", ""), "False");
+    EXPECT_EQ(store.read(DefaultGroup, "DescriptionLimit", ""), "False");
     EXPECT_FALSE(preferences.MakeBackup);
+    EXPECT_FALSE(preferences.LimitDescription);
 }
 
 TEST_F(PreferencesStore, LadeDefaultsTakesTheStoredValuesAndBlankAsEmpty)

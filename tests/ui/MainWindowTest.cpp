@@ -120,6 +120,9 @@ TEST_F(WindowTest, TypingRecomposesAndMarksTheFileChanged)
     QTest::keyClicks(description, std::string(50, 'x').c_str());
     EXPECT_EQ(text("lblLength"), "Length: 68");
     EXPECT_NE(child<QLabel>("lblLength")->styleSheet().indexOf("255, 0, 0"), -1);
+    app.Prefs.LimitDescription = false; // any length is fine: green
+    QTest::keyClicks(description, "y");
+    EXPECT_NE(child<QLabel>("lblLength")->styleSheet().indexOf("0, 255, 0"), -1);
 }
 
 // Keys that reach a box without being typed there, as Qt delivers them, are no edits: closing the

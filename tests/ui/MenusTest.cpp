@@ -144,6 +144,8 @@ TEST_F(WindowTest, PreferencesWindowWithAnEmptyStore)
         EXPECT_EQ(dialog.findChild<QLineEdit*>("txRealName")->text(), "");
         EXPECT_EQ(dialog.findChild<QComboBox*>("cbLicenses")->currentIndex(), -1);
         EXPECT_TRUE(dialog.findChild<QCheckBox*>("chkBackup")->isChecked());
+        EXPECT_TRUE(dialog.findChild<QCheckBox*>("chkDescriptionLimit")->isChecked());
+        dialog.findChild<QCheckBox*>("chkDescriptionLimit")->setChecked(false);
         dialog.findChild<QLineEdit*>("txRealName")->setText("  Jane Doe ");
         dialog.findChild<QPushButton*>("cmdSave")->click();
     });
@@ -151,6 +153,8 @@ TEST_F(WindowTest, PreferencesWindowWithAnEmptyStore)
     EXPECT_EQ(store.read(DefaultGroup, "RealName", ""), "Jane Doe");
     EXPECT_EQ(store.read(DefaultGroup, "Liscense", "?"), "");
     EXPECT_EQ(store.read(DefaultGroup, "Backup", ""), "True");
+    EXPECT_EQ(store.read(DefaultGroup, "DescriptionLimit", ""), "False");
+    EXPECT_FALSE(app.Prefs.LimitDescription);
 }
 
 TEST_F(WindowTest, SetPreferencesPutsTheDefaultsIntoTheHeader)

@@ -1,0 +1,79 @@
+#include "Batch.h"
+
+#include <algorithm>
+#include <atomic>
+#include <chrono>
+#include <condition_variable>
+#include <cstdio>
+#include <mutex>
+#include <optional>
+#include <thread>
+#include <vector>
+
+namespace {
+
+class ProgressLine {
+public:
+    ProgressLine(std::ostream* out, std::size_t total) : out_(out), total_(total) {}
+    ~ProgressLine()
+    {
+        if (out_ != nullptr)
+            *out_ << "\r\033[K" << std::flush; // the line goes; the summary takes its place
+    }
+    ProgressLine(const ProgressLine&) = delete;
+    ProgressLine& operator=(const ProgressLine&) = delete;
+
+    void show(std::size_t done)
+    {
+        using namespace std::chrono;
+        const auto now = steady_clock::now();
+        if (out_ == nullptr || (now - lastDrawn_ < milliseconds(100) && done < total_))
+            return;
+        lastDrawn_ = now;
+        const double seconds = std::max(duration<double>(now - start_).count(), 1e-6);
+        char text[96];
+        std::snprintf(text, sizeof text, "%zu of %zu files, %.0f files/s", done, total_,
+                      static_cast<double>(done) / seconds);
+        *out_ << "\r\033[K" << text << std::flush;
+    }
+
+private:
+    std::ostream* out_;
+    std::size_t total_;
+    std::chrono::steady_clock::time_point start_ = std::chrono::steady_clock::now();
+    std::chrono::steady_clock::time_point lastDrawn_{};
+};
+
+} // namespace
+
+void RunInOrder(std::size_t count, unsigned threads, const std::function<FileReport(std::size_t)>& work,
+                const std::function<void(FileReport&)>& emit, std::ostream* progress)
+{
+    std::vector<std::optional<FileReport>> reports(count);
+    std::mutex mutex;
+    std::condition_variable finished;
+    std::atomic<std::size_t> next{0};
+    const auto worker = [&] {
+        for (auto index = next++; index < count; index = next++) {
+            auto report = work(index);
+            const std::lock_guard lock(mutex);
+            reports[index] = std::move(report);
+            finished.notify_one();
+        }
+    };
+    std::vector<std::jthread> pool;
+    for (std::size_t i = 0; i < std::min<std::size_t>(threads, count); ++i)
+        pool.emplace_back(worker);
+    ProgressLine line(progress, count);
+    for (std::size_t index = 0; index < count; ++index) {
+        std::unique_lock lock(mutex);
+        finished.wait(lock, [&] { return reports[index].has_value(); });
+        auto report = std::move(*reports[index]);
+        reports[index].reset();
+        lock.unlock();
+        emit(report);
+        line.show(index + 1);
+    }
+}
+
+unsigned ThreadsFor(unsigned asked) { return asked > 0 ? asked : std::max(1u, std::thread::hardware_concurrency()); }

@@ -1,0 +1,17 @@
+#pragma once
+
+#include <cstddef>
+#include <functional>
+#include <ostream>
+
+#include "FileReport.h"
+
+// Works on count files on threads threads and hands each report to emit in the files' order, on
+// the calling thread, as soon as it and all before it are done: the output is the same as with
+// one thread. While it works, a progress line (files done of all, files per second) is redrawn
+// in place on progress when that is given, and cleared at the end.
+void RunInOrder(std::size_t count, unsigned threads, const std::function<FileReport(std::size_t)>& work,
+                const std::function<void(FileReport&)>& emit, std::ostream* progress);
+
+// The threads to use: the number asked for, or one per core when it is 0.
+unsigned ThreadsFor(unsigned asked);

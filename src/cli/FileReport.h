@@ -1,0 +1,29 @@
+#pragma once
+
+#include <array>
+#include <string>
+#include <utility>
+#include <vector>
+
+#include "SaveChecks.h"
+
+// What a batch command found for one file: its output, and the facts the summary counts.
+struct FileReport {
+    std::string out; // for standard output
+    std::string err; // for standard error
+    int status = 0;  // the file's exit status
+    bool unreadable = false;
+    std::vector<std::string> refusals; // the first line of each stop text
+    bool missingUserName = false;
+    FixUpOffers fixups;
+    enum class Saving { NotAsked, Saved, Skipped, Failed } saving = Saving::NotAsked;
+};
+
+// Each fix-up with the words the output uses for it.
+inline std::array<std::pair<bool, const char*>, 4> FixUpNames(const FixUpOffers& f)
+{
+    return {{{f.certifyInvertNext, "0 BFC CERTIFY INVERTNEXT in the body"},
+             {f.rotation, "0 ROTATION lines in the body"},
+             {f.write, "0 WRITE lines in the body"},
+             {f.color, "COLOR lines in the header"}}};
+}

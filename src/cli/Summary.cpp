@@ -1,0 +1,34 @@
+#include "Summary.h"
+
+void Summary::add(const FileReport& report)
+{
+    ++files_;
+    if (report.unreadable) {
+        ++unreadable_;
+        return;
+    }
+    refused_ += report.refusals.empty() ? 0 : 1;
+    for (const auto& reason : report.refusals)
+        ++reasons_[reason];
+    missingUserName_ += report.missingUserName ? 1 : 0;
+    for (const auto& [offered, what] : FixUpNames(report.fixups))
+        if (offered)
+            ++fixups_[what];
+    saving_ = saving_ || report.saving != FileReport::Saving::NotAsked;
+    saved_ += report.saving == FileReport::Saving::Saved ? 1 : 0;
+    skipped_ += report.saving == FileReport::Saving::Skipped ? 1 : 0;
+    failed_ += report.saving == FileReport::Saving::Failed ? 1 : 0;
+}
+
+void Summary::print(std::ostream& err) const
+{
+    err << files_ << " files, " << refused_ << " refused, " << missingUserName_ << " without user name, "
+        << unreadable_ << " unreadable";
+    if (saving_)
+        err << "; " << saved_ << " saved, " << skipped_ << " skipped, " << failed_ << " failed";
+    err << '\n';
+    for (const auto& [reason, count] : reasons_)
+        err << "  refused: " << reason << ": " << count << '\n';
+    for (const auto& [what, count] : fixups_)
+        err << "  fix-up offered: " << what << ": " << count << '\n';
+}
