@@ -4,6 +4,7 @@
 #include <map>
 #include <mutex>
 #include <nlohmann/json.hpp>
+#include <optional>
 #include <sstream>
 
 #include "Batch.h"
@@ -13,14 +14,34 @@
 #include "ConsoleDialogs.h"
 #include "FileSave.h"
 #include "PartFileList.h"
+#include "QmError.h"
+#include "StandardLists.h"
 #include "Summary.h"
 #include "Text.h"
+#include "TrackerCheck.h"
 
 namespace {
 
+using TrackerFindings = std::vector<TrackerFinding>;
+
+// The official categories, from the category list beside the program.
+bool readCategories(StringList& categories, std::ostream& err)
+{
+    std::error_code error;
+    const auto folder = std::filesystem::read_symlink("/proc/self/exe", error).parent_path().string();
+    const auto path = ListFilePath(folder, ListKind::Category);
+    try {
+        categories = ReadListFile(path);
+        return true;
+    } catch (const QmError& failure) {
+        err << "quillmark-cli: cannot read the category list " << path << ": " << failure.description() << '\n';
+        return false;
+    }
+}
+
 std::string firstLine(const std::string& text) { return text.substr(0, text.find('\r')); }
 
-std::string checkJson(const HeaderData& header, const SaveFindings& findings)
+std::string checkJson(const HeaderData& header, const SaveFindings& findings, const TrackerFindings* tracker)
 {
     nlohmann::ordered_json json;
     json["FilePath"] = Latin1ToUtf8(header.FilePath);
@@ -30,10 +51,15 @@ std::string checkJson(const HeaderData& header, const SaveFindings& findings)
                       {"rotation", findings.fixups.rotation},
                       {"write", findings.fixups.write},
                       {"color", findings.fixups.color}};
+    if (tracker != nullptr) {
+        json["tracker"] = nlohmann::ordered_json::array();
+        for (const auto& finding : *tracker)
+            json["tracker"].push_back({{"id", finding.id}, {"level", LevelText(finding.level)}, {"text", finding.text}});
+    }
     return json.dump() + '\n';
 }
 
-std::string findingLines(const std::string& path, const SaveFindings& findings)
+std::string findingLines(const std::string& path, const SaveFindings& findings, const TrackerFindings* tracker)
 {
     std::string lines;
     for (const auto& refusal : findings.refusals)
@@ -43,6 +69,8 @@ std::string findingLines(const std::string& path, const SaveFindings& findings)
     for (const auto& [offered, what] : FixUpNames(findings.fixups))
         if (offered)
             lines += path + ": fix-up offered: " + what + '\n';
+    for (const auto& finding : tracker ? *tracker : TrackerFindings{})
+        lines += path + ": tracker " + LevelText(finding.level) + " " + finding.id + ": " + finding.text + '\n';
     return lines.empty() ? path + ": ok\n" : lines;
 }
 
@@ -143,15 +171,29 @@ std::string savedLine(const std::string& path, const SaveOptions& options, const
 
 } // namespace
 
-int RunCheck(const std::vector<std::string>& arguments, bool json, const BatchOptions& batch, std::ostream& out,
-             std::ostream& err)
+int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& options, const BatchOptions& batch,
+             std::ostream& out, std::ostream& err)
 {
+    StringList categories;
+    if (options.tracker && !readCategories(categories, err))
+        return ExitStatus::Unreadable;
     return runBatch(arguments, batch, out, err, [&](const std::string& path) {
         return reportOn(path, {}, [&](HeaderData& header, ConsoleDialogs&, FileReport& report) {
             const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
-            report.out = json ? checkJson(header, findings) : findingLines(header.FilePath, findings);
+            std::optional<TrackerFindings> tracker;
+            if (options.tracker)
+                tracker = CheckRecordForTracker(header, ComposeHeader(header), categories);
+            const auto* trackerFindings = tracker ? &*tracker : nullptr;
+            report.out = options.json ? checkJson(header, findings, trackerFindings)
+                                      : findingLines(header.FilePath, findings, trackerFindings);
             noteFindings(report, findings);
-            report.status = findings.refusals.empty() ? ExitStatus::Ok : ExitStatus::Refused;
+            bool trackerRefuses = false;
+            for (const auto& finding : tracker.value_or(TrackerFindings{})) {
+                report.trackerIds.push_back(finding.id);
+                trackerRefuses = trackerRefuses || finding.level == FindingLevel::Error;
+            }
+            report.refused = trackerRefuses;
+            report.status = findings.refusals.empty() && !trackerRefuses ? ExitStatus::Ok : ExitStatus::Refused;
         });
     });
 }

@@ -12,9 +12,14 @@ struct BatchOptions {
     bool errIsTerminal = false;    // a progress line is drawn on a terminal only
 };
 
+struct CheckOptions {
+    bool json = false;
+    bool tracker = false; // the Parts Tracker's rules too
+};
+
 // check: every save check on every file (folders searched for part files), without writing.
-int RunCheck(const std::vector<std::string>& arguments, bool json, const BatchOptions& batch, std::ostream& out,
-             std::ostream& err);
+int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& options, const BatchOptions& batch,
+             std::ostream& out, std::ostream& err);
 
 struct SaveOptions {
     bool backup = true;

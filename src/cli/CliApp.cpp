@@ -32,12 +32,15 @@ int RunCli(int argc, const char* const* argv, std::ostream& out, std::ostream& e
     };
 
     std::vector<std::string> checkFiles;
-    bool checkJson = false;
+    CheckOptions checkOptions;
     auto* check = app.add_subcommand(
         "check", "Run every save check on each FILE, or each part file (*.dat) below a FOLDER, without writing: "
                  "refusals, a missing user name, and the fix-ups a save would offer; then a summary on standard "
                  "error. Exit status 1 when any file would be refused, 2 when one cannot be read.");
-    check->add_flag("--json", checkJson, "One JSON object per file and line");
+    check->add_flag("--json", checkOptions.json, "One JSON object per file and line");
+    check->add_flag("--tracker", checkOptions.tracker,
+                    "Check the Parts Tracker's header rules too (an error there refuses the file). Rules that need "
+                    "the Tracker's database (registered authors, duplicates, held subfiles) are not checked.");
     addBatchOptions(check);
     check->add_option("FILE", checkFiles, "Part files or folders to check")->required();
 
@@ -66,7 +69,7 @@ int RunCli(int argc, const char* const* argv, std::ostream& out, std::ostream& e
     if (*fields)
         return RunFields(fieldsFiles, dialogs, out, err);
     if (*check)
-        return RunCheck(checkFiles, checkJson, batch, out, err);
+        return RunCheck(checkFiles, checkOptions, batch, out, err);
     if (*save) {
         saveOptions.backup = !noBackup;
         return RunSave(saveFiles, saveOptions, batch, out, err);

@@ -7,13 +7,15 @@ void Summary::add(const FileReport& report)
         ++unreadable_;
         return;
     }
-    refused_ += report.refusals.empty() ? 0 : 1;
+    refused_ += report.refused || !report.refusals.empty() ? 1 : 0;
     for (const auto& reason : report.refusals)
         ++reasons_[reason];
     missingUserName_ += report.missingUserName ? 1 : 0;
     for (const auto& [offered, what] : FixUpNames(report.fixups))
         if (offered)
             ++fixups_[what];
+    for (const auto& id : report.trackerIds)
+        ++trackerIds_[id];
     saving_ = saving_ || report.saving != FileReport::Saving::NotAsked;
     saved_ += report.saving == FileReport::Saving::Saved ? 1 : 0;
     skipped_ += report.saving == FileReport::Saving::Skipped ? 1 : 0;
@@ -31,4 +33,6 @@ void Summary::print(std::ostream& err) const
         err << "  refused: " << reason << ": " << count << '\n';
     for (const auto& [what, count] : fixups_)
         err << "  fix-up offered: " << what << ": " << count << '\n';
+    for (const auto& [id, count] : trackerIds_)
+        err << "  tracker " << id << ": " << count << '\n';
 }

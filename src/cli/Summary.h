@@ -19,5 +19,6 @@ private:
     std::size_t saved_ = 0, skipped_ = 0, failed_ = 0;
     std::map<std::string, std::size_t> reasons_;
     std::map<std::string, std::size_t> fixups_;
+    std::map<std::string, std::size_t> trackerIds_;
     bool saving_ = false;
 };

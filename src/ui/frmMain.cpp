@@ -135,6 +135,7 @@ void frmMain::createMenus()
     };
     MDateiOeffnen = action(MDatei, "MDateiOeffnen", "O&pen", &frmMain::MDateiOeffnen_Click);
     MDateiSpeichern = action(MDatei, "MDateiSpeichern", "&Save", &frmMain::MDateiSpeichern_Click);
+    MTrackerCheck = action(MDatei, "MTrackerCheck", "Check for the Parts &Tracker", &frmMain::MTrackerCheck_Click);
     MDatei->addSeparator()->setObjectName("MDateiTrenner2");
     MDateiBeenden = action(MDatei, "MDateiBeenden", "E&xit", &QWidget::close);
     MRecentFile[0] = MDatei->addSeparator();
@@ -184,6 +185,7 @@ void frmMain::EnableControls()
              cmdHistoryEdit, cmdCommentsAdd, cmdCommentsDelete, cmdCommentsEdit, cmdSetPreferences})
         control->setEnabled(enabled);
     MDateiSpeichern->setEnabled(enabled);
+    MTrackerCheck->setEnabled(enabled);
     // The file name is only shown: it never takes input once the program runs.
     txFileName->setEnabled(false);
 }

@@ -37,6 +37,7 @@ public:
 
     void MDateiOeffnen_Click();
     void MDateiSpeichern_Click();
+    void MTrackerCheck_Click();
     void OpenFile(const std::string& path);
     void MInfo_Click();
     void MRecentFile_Click(int index);
@@ -159,6 +160,7 @@ private:
 
     QAction* MDateiOeffnen;
     QAction* MDateiSpeichern;
+    QAction* MTrackerCheck;
     QAction* MDateiBeenden;
     std::array<QAction*, 11> MRecentFile;
     QAction* MEditCategory;

@@ -8,6 +8,7 @@
 #include "frmList.h"
 #include "frmMain.h"
 #include "frmOption.h"
+#include "frmTracker.h"
 
 namespace {
 
@@ -50,6 +51,15 @@ void frmMain::editStandardList(ListKind kind, QComboBox& combo, const char* hand
     } catch (const std::exception& error) {
         ReportError(services_.dialogs, ErrorOf(error), {handler, OwnerKind::Formular, "frmMain"});
     }
+}
+
+void frmMain::MTrackerCheck_Click()
+{
+    if (openInProgress())
+        return;
+    const auto findings = CheckRecordForTracker(app_.Header, newHeaderText_, EntriesOf(app_.Lists, ListKind::Category));
+    frmTracker dialog(findings, this);
+    dialog.exec();
 }
 
 void frmMain::MEinstellDefault_Click()

@@ -7,6 +7,7 @@
 #include <QListWidget>
 #include <QMimeData>
 #include <QPushButton>
+#include <QTableWidget>
 #include <QTest>
 #include <filesystem>
 
@@ -14,6 +15,7 @@
 #include "WindowFixture.h"
 #include "frmList.h"
 #include "frmOption.h"
+#include "frmTracker.h"
 
 namespace {
 
@@ -118,6 +120,22 @@ TEST_F(ListMenuTest, EscapePressesCloseWhichAsksAfterAnUpdate)
 
 // Every caption shows whole in the window font: its text is no wider than the room the control
 // leaves it.
+TEST_F(ListMenuTest, TrackerCheckShowsTheFindingsAndChangesNothing)
+{
+    const auto before = app.Header;
+    whenDialogShows<frmTracker>([](frmTracker& dialog) {
+        auto* table = dialog.findChild<QTableWidget*>("tbFindings");
+        ASSERT_EQ(table->rowCount(), 1);
+        EXPECT_EQ(table->item(0, 0)->text(), "warning");
+        EXPECT_EQ(table->item(0, 1)->text(), "warning.descriptionnumbers");
+        EXPECT_NE(dialog.findChild<QLabel*>("lblVerdict")->text().indexOf("accept"), -1);
+        dialog.findChild<QPushButton*>("cmdClose")->click();
+    });
+    child<QAction>("MTrackerCheck")->trigger();
+    EXPECT_EQ(app.Header.Body, before.Body);
+    EXPECT_FALSE(app.Header.FileChanged);
+}
+
 TEST_F(WindowTest, EveryCaptionOfTheThreeWindowsShowsWhole)
 {
     startUp();

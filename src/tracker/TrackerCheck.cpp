@@ -1,0 +1,294 @@
+#include "TrackerCheck.h"
+
+#include <QRegularExpression>
+
+#include "HeaderFacts.h"
+#include "Text.h"
+
+namespace {
+
+const QStringList KnownTypes = {"Part", "Subpart", "Primitive", "8_Primitive", "48_Primitive", "Shortcut", "Helper"};
+const QStringList RetiredCategories = {"Minifig", "Pov-RAY", "Lever", "Grab", "Forklift"};
+const QStringList ApprovedLicences = {"Licensed under CC BY 4.0 : see CAreadme.txt",
+                                      "Licensed under CC BY 2.0 and CC BY 4.0 : see CAreadme.txt",
+                                      "Marked with CC0 1.0 : see CAreadme.txt"};
+const QStringList PreviewRotations = {"1 0 0 0 1 0 0 0 1",  "1 0 0 0 0 1 0 -1 0",  "1 0 0 0 0 -1 0 1 0",
+                                      "1 0 0 0 -1 0 0 0 -1", "0 0 1 0 1 0 -1 0 0", "0 0 -1 0 1 0 1 0 0",
+                                      "-1 0 0 0 1 0 0 0 -1", "0 -1 0 1 0 0 0 0 1", "0 1 0 -1 0 0 0 0 1",
+                                      "-1 0 0 0 -1 0 0 0 1"};
+
+struct Part {
+    HeaderFacts facts;
+    QString fileName;  // the file's own name
+    QString baseName;  // lower case, without ".dat"
+    QString plainType; // the type without "Unofficial_"
+    bool partsType = false; // Part or Shortcut
+    bool pattern = false;   // a parts-type file whose last suffix starts with "p"
+    QStringList categories;
+
+    bool inCategory(std::initializer_list<const char*> names) const
+    {
+        for (const char* name : names)
+            if (facts.category.compare(QLatin1String(name), Qt::CaseInsensitive) == 0)
+                return true;
+        return false;
+    }
+};
+
+class Findings {
+public:
+    void error(const char* id, const QString& text) { list_.push_back({id, FindingLevel::Error, text.toStdString()}); }
+    void warning(const char* id, const QString& text)
+    {
+        list_.push_back({id, FindingLevel::Warning, text.toStdString()});
+    }
+    std::vector<TrackerFinding> take() { return std::move(list_); }
+
+private:
+    std::vector<TrackerFinding> list_;
+};
+
+QString quoted(const QString& text) { return "\"" + text + "\""; }
+
+bool hasControlCharacters(const QString& text)
+{
+    for (const QChar c : text) {
+        const auto category = c.category();
+        if (category == QChar::Other_Control || category == QChar::Separator_Line ||
+            category == QChar::Separator_Paragraph)
+            return true;
+    }
+    return false;
+}
+
+// "Real Name [username]"; either part alone is accepted.
+bool authorWellFormed(const QString& author)
+{
+    static const QRegularExpression form(QStringLiteral("^(?:[^\\[\\]]*[^\\[\\]\\s])?\\s*(?:\\[[A-Za-z0-9_.-]+\\])?$"));
+    return !author.isEmpty() && form.match(author).hasMatch();
+}
+
+// The presence rule: when it fails, no other rule runs.
+bool checkPresence(const Part& part, Findings& findings)
+{
+    const auto& f = part.facts;
+    const std::pair<bool, const char*> needs[] = {
+        {!f.description.isEmpty(), "The description (line 1) is missing."},
+        {f.hasName, "The \"0 Name:\" line is missing or empty."},
+        {f.hasType && KnownTypes.contains(part.plainType), "The \"0 !LDRAW_ORG\" line is missing or names no known type."},
+        {f.hasLicense, "The \"0 !LICENSE\" line is missing."},
+        {f.hasAuthor && authorWellFormed(f.author),
+         "The \"0 Author:\" line is missing or not of the form \"Real Name [username]\"."},
+    };
+    bool complete = true;
+    for (const auto& [present, text] : needs)
+        if (!present) {
+            findings.error("missing", text);
+            complete = false;
+        }
+    return complete;
+}
+
+void checkLicenceAndCategory(const Part& part, Findings& findings)
+{
+    const auto& f = part.facts;
+    if (!ApprovedLicences.contains(f.license))
+        findings.error("license.approved", "The licence " + quoted(f.license) + " is not one the library accepts.");
+    if (f.qualifier == "Physical_Colour" && !part.inCategory({"Obsolete"}))
+        findings.error("type.phycolor", "Physical_Colour is only allowed in category Obsolete, not " +
+                                            quoted(f.category) + ".");
+    if (part.partsType && !part.categories.contains(f.category) && !RetiredCategories.contains(f.category))
+        findings.error("category.invalid", "The category " + quoted(f.category) + " is not an official one.");
+    if (RetiredCategories.contains(f.category))
+        findings.warning("warning.minifigcategory", "The category " + quoted(f.category) + " is retired.");
+}
+
+void checkHistory(const Part& part, Findings& findings)
+{
+    static const QRegularExpression form(
+        QStringLiteral("^0 !HISTORY \\d{4}-\\d{2}-\\d{2} (?:\\[[^\\]]+\\]|\\{[^}]+\\}) +\\S"));
+    for (const auto& line : part.facts.historyLines)
+        if (!form.match(line).hasMatch())
+            findings.error("history.invalid", "The history line " + quoted(line) +
+                                                  " is not \"0 !HISTORY YYYY-MM-DD [user] comment\".");
+}
+
+// The folder that a type's files carry in their "Name:".
+QString folderOfType(const QString& plainType)
+{
+    if (plainType == "Subpart")
+        return "s\\";
+    if (plainType == "8_Primitive")
+        return "8\\";
+    if (plainType == "48_Primitive")
+        return "48\\";
+    if (plainType == "Helper")
+        return "helpers\\";
+    return "";
+}
+
+void checkName(const Part& part, Findings& findings)
+{
+    const auto& f = part.facts;
+    if (hasControlCharacters(f.name))
+        findings.error("name.invalidchars", "The name " + quoted(f.name) + " holds control characters.");
+    if (part.baseName.startsWith('x'))
+        findings.error("name.xparts", "The file name " + quoted(part.fileName) + " starts with \"x\".");
+    const auto folder = f.name.left(f.name.lastIndexOf('\\') + 1);
+    const auto wanted = folderOfType(part.plainType);
+    if (folder.compare(wanted, Qt::CaseInsensitive) != 0)
+        findings.error("type.path", "A " + part.plainType + " is named " + quoted(wanted + "name.dat") + ", not " +
+                                        quoted(f.name) + ".");
+    const auto ownName = f.name.mid(folder.size());
+    if (ownName.compare(part.fileName, Qt::CaseInsensitive) != 0)
+        findings.warning("name.filename", "The name " + quoted(ownName) + " is not the file's name " +
+                                              quoted(part.fileName) + ".");
+}
+
+void checkDescriptionPrefix(const Part& part, Findings& findings)
+{
+    const auto& f = part.facts;
+    const auto& prefix = f.prefix;
+    if (part.plainType == "Subpart" && !prefix.startsWith('~'))
+        findings.error("description.subpartdesc", "A subpart's description must start with \"~\": " + quoted(f.description));
+    else if (part.partsType && part.inCategory({"Moved", "Obsolete"}) && !prefix.startsWith('~'))
+        findings.error("description.movedorobsolete",
+                       "A moved or obsolete part's description must start with \"~\": " + quoted(f.description));
+    else if (f.qualifier == "Alias" && !prefix.contains('='))
+        findings.error("description.aliasdesc", "An alias's description must start with \"=\": " + quoted(f.description));
+    else if (part.partsType && part.baseName.startsWith('t') && !prefix.contains('|'))
+        findings.error("description.thirdpartydesc",
+                       "A third-party part's description must start with \"|\": " + quoted(f.description));
+}
+
+void checkDescription(const Part& part, Findings& findings)
+{
+    const auto& f = part.facts;
+    if (hasControlCharacters(f.description))
+        findings.error("description.invalidchars", "The description " + quoted(f.description) +
+                                                       " holds control characters.");
+    checkDescriptionPrefix(part, findings);
+    static const QRegularExpression single(QStringLiteral("(\\S+) (\\d)(?= |$)(?: (\\S+))?"));
+    for (auto it = single.globalMatch(f.description); it.hasNext();) {
+        const auto match = it.next();
+        const auto before = match.captured(1), after = match.captured(3);
+        if (before.endsWith(' ') || QStringList{"Type", "Phase", "Functions"}.contains(before) ||
+            QStringList{"Ball", "Balls", "Stripe", "Stripes", "White"}.contains(after))
+            continue;
+        findings.warning("warning.descriptionnumbers",
+                         "The number " + match.captured(2) + " in " + quoted(f.description) +
+                             " has one blank before it; the library writes two (\"Brick  1 x  2\").");
+        break;
+    }
+}
+
+void checkPattern(const Part& part, Findings& findings)
+{
+    const auto& f = part.facts;
+    if (!part.pattern)
+        return;
+    static const QRegularExpression patternWord(QStringLiteral("pattern(?:\\s*\\([^)]*\\))?$"),
+                                                QRegularExpression::CaseInsensitiveOption);
+    if (!part.inCategory({"Moved", "Sticker", "Sticker Shortcut"}) && !f.keywords.contains("Colour Combination") &&
+        !patternWord.match(f.description).hasMatch())
+        findings.error("description.patternword", "A pattern's description must end in \"Pattern\": " +
+                                                      quoted(f.description));
+    if (part.inCategory({"Modulex", "Moved"}))
+        return;
+    for (const auto& keyword : f.keywords)
+        for (const char* start : {"set ", "cmf", "build-a-minifigure"})
+            if (keyword.startsWith(QLatin1String(start), Qt::CaseInsensitive))
+                return;
+    findings.error("keywords.patternset",
+                   "A pattern needs a keyword starting with \"Set \", \"CMF\" or \"Build-A-Minifigure\".");
+}
+
+void checkTypeQualifiers(const Part& part, Findings& findings)
+{
+    const auto& f = part.facts;
+    if (f.qualifier == "Alias" && part.plainType != "Part" && part.plainType != "Shortcut")
+        findings.error("type.alias", "Alias is only allowed on a Part or Shortcut, not a " + part.plainType + ".");
+    if (f.qualifier != "Flexible_Section")
+        return;
+    if (part.plainType != "Part")
+        findings.error("type.flex", "Flexible_Section is only allowed on a Part, not a " + part.plainType + ".");
+    static const QRegularExpression flexName(QStringLiteral("k[0-9a-z]{2}$"));
+    if (!part.inCategory({"Moved", "Obsolete"}) && !flexName.match(part.baseName).hasMatch())
+        findings.error("name.flex", "A flexible section's name must end in \"k\" and two characters: " +
+                                        quoted(part.fileName));
+}
+
+void checkBody(const Part& part, Findings& findings)
+{
+    const auto& f = part.facts;
+    if (f.firstBfcLine != "0 BFC CERTIFY CCW")
+        findings.error("bfc", "The first BFC line is " + quoted(f.firstBfcLine) + ", not \"0 BFC CERTIFY CCW\".");
+    const bool markedObsolete = f.description.contains("(Obsolete)") || f.description.startsWith("~Obsolete");
+    if (part.partsType && part.inCategory({"Obsolete"}) != markedObsolete)
+        findings.error("obsoleteimproper", markedObsolete ? "The description " + quoted(f.description) +
+                                                                " marks the part obsolete, but its category is " +
+                                                                quoted(f.category) + ", not Obsolete."
+                                                          : "The category is Obsolete, but the description " +
+                                                                quoted(f.description) + " does not say so.");
+    for (const auto& line : f.subfileLines) {
+        const auto file = line.section(' ', 14, -1, QString::SectionSkipEmpty);
+        if (file.compare(f.name, Qt::CaseInsensitive) == 0)
+            findings.error("circularreference", "The file uses itself: " + quoted(line));
+    }
+    for (const auto& line : f.previewLines) {
+        const auto words = line.split(' ', Qt::SkipEmptyParts);
+        if (words.size() != 15 || !PreviewRotations.contains(words.mid(6).join(' ')))
+            findings.warning("warning.previewinvalid", "The preview line " + quoted(line) + " is not allowed.");
+    }
+}
+
+// "3626bp01" is a pattern; "-f1" at the end of a name is passed over.
+bool isPatternName(const QString& baseName)
+{
+    static const QRegularExpression pattern(QStringLiteral("^.+p[0-9a-z]{2,4}(?:-f\\d*)?$"));
+    return pattern.match(baseName).hasMatch();
+}
+
+QString fromFile(std::string_view bytes)
+{
+    return IsValidUtf8(bytes) ? QString::fromUtf8(bytes.data(), static_cast<qsizetype>(bytes.size()))
+                              : QString::fromLatin1(bytes.data(), static_cast<qsizetype>(bytes.size()));
+}
+
+} // namespace
+
+const char* LevelText(FindingLevel level) { return level == FindingLevel::Error ? "error" : "warning"; }
+
+std::vector<TrackerFinding> CheckForTracker(std::string_view text, const std::string& fileName,
+                                            const StringList& categories)
+{
+    Part part;
+    part.facts = ReadHeaderFacts(fromFile(text));
+    part.fileName = fromFile(fileName);
+    part.baseName = part.fileName.toLower().section('.', 0, 0);
+    part.plainType = PlainType(part.facts.type);
+    part.partsType = part.plainType == "Part" || part.plainType == "Shortcut";
+    part.pattern = part.partsType && isPatternName(part.baseName);
+    for (const auto& category : categories)
+        if (category != "<none>")
+            part.categories << fromFile(category);
+    Findings findings;
+    if (checkPresence(part, findings)) {
+        checkLicenceAndCategory(part, findings);
+        checkHistory(part, findings);
+        checkName(part, findings);
+        checkDescription(part, findings);
+        checkPattern(part, findings);
+        checkTypeQualifiers(part, findings);
+        checkBody(part, findings);
+    }
+    return findings.take();
+}
+
+std::vector<TrackerFinding> CheckRecordForTracker(const HeaderData& header, const std::string& composedHeader,
+                                                  const StringList& categories)
+{
+    const auto slash = header.FilePath.rfind('/');
+    const auto fileName = slash == std::string::npos ? header.FilePath : header.FilePath.substr(slash + 1);
+    return CheckForTracker(composedHeader + header.Body + "\r\n", fileName, categories);
+}
