@@ -175,38 +175,27 @@ TEST_F(WindowTest, PreferencesWindowWithAnEmptyStore)
     EXPECT_FALSE(app.Prefs.LimitDescription);
 }
 
-TEST_F(WindowTest, SetPreferencesPutsTheDefaultsIntoTheHeader)
+TEST_F(WindowTest, SetPreferencesPutsTheDefaultsIntoTheHeaderOnYes)
 {
     store.write(DefaultGroup, "RealName", "Jane Doe");
-    store.write(DefaultGroup, "UserName", "jdoe");
     store.write(DefaultGroup, "Liscense", "Marked with CC0 1.0 : see CAreadme.txt");
-    startUp();
-    openThroughPendingFile(part("3001.dat", GoodPart));
-    dialogs.expectMessage(Answer::Yes);
-    window->cmdSetPreferences_Click();
-    EXPECT_EQ(dialogs.messages.back().title, "Default Values");
-    EXPECT_EQ(app.Header.AuthorRealName, "Jane Doe");
-    EXPECT_EQ(app.Header.AuthorUserName, "jdoe");
-    EXPECT_EQ(app.Header.License, "Marked with CC0 1.0 : see CAreadme.txt");
-    EXPECT_EQ(child<QComboBox>("cbLicenses")->currentText(), "Marked with CC0 1.0 : see CAreadme.txt");
-    EXPECT_NE(window->newHeaderText().find("0 Author: Jane Doe [jdoe]\r\n"), std::string::npos);
-    EXPECT_TRUE(app.Header.FileChanged);
-}
-
-TEST_F(WindowTest, SetPreferencesKeepsALicenceThatNoEntryMatches)
-{
-    store.write(DefaultGroup, "RealName", "Jane Doe");
-    store.write(DefaultGroup, "Liscense", "Unknown licence");
     startUp();
     openThroughPendingFile(part("3001.dat", GoodPart));
     dialogs.expectMessage(Answer::No);
     window->cmdSetPreferences_Click();
+    EXPECT_EQ(dialogs.messages.back().title, "Default Values");
     EXPECT_EQ(app.Header.AuthorRealName, "Sam Sample");
     dialogs.expectMessage(Answer::Yes);
     window->cmdSetPreferences_Click();
-    EXPECT_EQ(app.Header.AuthorRealName, "Jane Doe");
     EXPECT_EQ(app.Header.AuthorUserName, "");
-    EXPECT_EQ(app.Header.License, "Licensed under CC BY 4.0 : see CAreadme.txt");
+    EXPECT_EQ(child<QComboBox>("cbLicenses")->currentText(), "Marked with CC0 1.0 : see CAreadme.txt");
+    EXPECT_NE(window->newHeaderText().find("0 Author: Jane Doe\r\n"), std::string::npos);
+    EXPECT_TRUE(app.Header.FileChanged);
+    // A stored licence that no entry matches leaves the record's licence as it is.
+    store.write(DefaultGroup, "Liscense", "Unknown licence");
+    dialogs.expectMessage(Answer::Yes);
+    window->cmdSetPreferences_Click();
+    EXPECT_EQ(app.Header.License, "Marked with CC0 1.0 : see CAreadme.txt");
 }
 
 TEST_F(WindowTest, RecentFilesMenuNewestFirstAndAClickOpens)
