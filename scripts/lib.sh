@@ -5,7 +5,7 @@ QUILLMARK_ROOT="$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd)"
 
 # The packages every build needs; scripts add their own.
 QUILLMARK_PACKAGES=(cmake ninja-build g++ qt6-base-dev libcli11-dev nlohmann-json3-dev libgtest-dev libgmock-dev
-                    libgl-dev fonts-dejavu-core)
+                    libgl-dev fonts-dejavu-core help2man desktop-file-utils libxml2-utils appstream)
 
 ensure_packages() {
     local missing=()

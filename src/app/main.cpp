@@ -1,22 +1,53 @@
 // Quillmark: the window program.
 #include <QApplication>
-
-#include "EventLoop.h"
+#include <cstring>
+#include <iostream>
 
 #include "AppState.h"
 #include "Clock.h"
+#include "EventLoop.h"
 #include "IniSettingsStore.h"
+#include "ListFolder.h"
 #include "QtDialogs.h"
 #include "WindowFont.h"
 #include "frmMain.h"
 
+namespace {
+
+// --help and --version answer without a display; any other first argument is the file to open.
+bool answeredOnTheCommandLine(int argc, char** argv)
+{
+    if (argc < 2)
+        return false;
+    if (std::strcmp(argv[1], "--version") == 0) {
+        std::cout << "quillmark " << QUILLMARK_VERSION << '\n';
+        return true;
+    }
+    if (std::strcmp(argv[1], "--help") == 0) {
+        std::cout << "Usage: quillmark [FILE]\n"
+                     "Edit the header of an LDraw part file (*.dat): the window opens FILE when it is given.\n\n"
+                     "  --help     show this text and exit\n"
+                     "  --version  show the version and exit\n\n"
+                     "quillmark-cli runs the same checks and saves from the command line.\n";
+        return true;
+    }
+    return false;
+}
+
+} // namespace
+
 int main(int argc, char** argv)
 {
+    if (answeredOnTheCommandLine(argc, argv))
+        return 0;
     UseLeanEventLoop();
     QApplication application(argc, argv); // takes Qt's own options (-platform, -style, ...) out of argv
+    QApplication::setApplicationName("Quillmark");
     UseWindowFont();
     AppState app;
-    app.ProgramFolder = QCoreApplication::applicationDirPath().toStdString();
+    const auto programFolder = QCoreApplication::applicationDirPath().toStdString();
+    app.ProgramFolder = ListFolderOfThisProgram(programFolder);
+    app.FirstOpenFolder = FirstOpenFolder(programFolder, app.ProgramFolder);
     IniSettingsStore store;
     QtDialogs dialogs;
     const SystemClock clock;

@@ -13,6 +13,7 @@
 #include "Composer.h"
 #include "ConsoleDialogs.h"
 #include "FileSave.h"
+#include "ListFolder.h"
 #include "PartFileList.h"
 #include "QmError.h"
 #include "StandardLists.h"
@@ -24,12 +25,12 @@ namespace {
 
 using TrackerFindings = std::vector<TrackerFinding>;
 
-// The official categories, from the category list beside the program.
+// The official categories, from the category list the window uses.
 bool readCategories(StringList& categories, std::ostream& err)
 {
     std::error_code error;
-    const auto folder = std::filesystem::read_symlink("/proc/self/exe", error).parent_path().string();
-    const auto path = ListFilePath(folder, ListKind::Category);
+    const auto programFolder = std::filesystem::read_symlink("/proc/self/exe", error).parent_path().string();
+    const auto path = ListFilePath(ListFolderOfThisProgram(programFolder), ListKind::Category);
     try {
         categories = ReadListFile(path);
         return true;

@@ -10,6 +10,7 @@ int RunCli(int argc, const char* const* argv, std::ostream& out, std::ostream& e
 {
     CLI::App app{"quillmark-cli: reads LDraw part files (*.dat) the way the Quillmark editor opens them."};
     app.name("quillmark-cli");
+    app.set_version_flag("--version", std::string("quillmark-cli ") + QUILLMARK_VERSION);
     app.require_subcommand(1);
 
     std::vector<std::string> fieldsFiles;

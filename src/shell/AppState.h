@@ -19,6 +19,7 @@ struct AppState {
     RecentFilesMenu Recent;
     std::string PendingFile; // a path the Open command opens instead of asking
     std::string ProgramFolder; // where the list files live
+    std::string FirstOpenFolder; // the Open dialog's folder until "LastPath" is stored; empty: ProgramFolder
 };
 
 // What the program talks to outside itself.

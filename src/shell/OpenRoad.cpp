@@ -10,7 +10,8 @@ void StartUpState(AppState& app, Services& services)
     app.Prefs.LimitDescription = StoredDescriptionLimit(services.store);
     app.Header.FileLoaded = false;
     app.Header.FileChanged = false;
-    app.Header.FileFolder = StartFolder(services.store, app.ProgramFolder);
+    app.Header.FileFolder =
+        StartFolder(services.store, app.FirstOpenFolder.empty() ? app.ProgramFolder : app.FirstOpenFolder);
     app.Recent.MaxRecentFiles = 9;
     ShowRecentFiles(app.Recent, services.store);
     LoadStandardLists(app.Lists, app.ProgramFolder, services.dialogs);

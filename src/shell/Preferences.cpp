@@ -57,9 +57,9 @@ void SavePreferencesForm(const PreferencesForm& form, Preferences& preferences, 
     preferences.LimitDescription = form.descriptionLimit;
 }
 
-std::string StartFolder(const SettingsStore& store, const std::string& programFolder)
+std::string StartFolder(const SettingsStore& store, const std::string& firstFolder)
 {
-    return store.read(DefaultGroup, "LastPath", programFolder);
+    return store.read(DefaultGroup, "LastPath", firstFolder);
 }
 
 void StoreLastPath(SettingsStore& store, const std::string& folder) { store.write(DefaultGroup, "LastPath", folder); }

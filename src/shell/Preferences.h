@@ -39,6 +39,6 @@ PreferencesForm OpenPreferencesForm(Preferences& preferences, const SettingsStor
 // MakeBackup and LimitDescription.
 void SavePreferencesForm(const PreferencesForm& form, Preferences& preferences, SettingsStore& store);
 
-// The folder the Open dialog starts in: "LastPath", or the program's folder on the first run.
-std::string StartFolder(const SettingsStore& store, const std::string& programFolder);
+// The folder the Open dialog starts in: "LastPath", or firstFolder on the first run.
+std::string StartFolder(const SettingsStore& store, const std::string& firstFolder);
 void StoreLastPath(SettingsStore& store, const std::string& folder);
