@@ -72,7 +72,7 @@ private:
     QPlainTextEdit* headerBox(const char* name, int left, int top, int width, int height);
 
     // Opening.
-    bool saveChangesBeforeOpen();
+    bool saveWithChecks(); // the Save command's checks and save; true when saved
     // Opens the file that takeFile names; a failure is reported for procedure, and a close
     // requested meanwhile is carried out at the end.
     void openChosenFile(const std::function<void()>& takeFile, bool removeTabs, const Procedure& procedure);

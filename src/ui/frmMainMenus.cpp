@@ -3,6 +3,7 @@
 #include <QLineEdit>
 
 #include "Dialogs.h"
+#include "DocumentQuestions.h"
 #include "ErrorReport.h"
 #include "FileText.h"
 #include "frmList.h"
@@ -32,16 +33,8 @@ void frmMain::MEditLicense_Click() { editStandardList(ListKind::License, *cbLice
 
 void frmMain::editStandardList(ListKind kind, QComboBox& combo, const char* handler)
 {
-    if (openInProgress())
+    if (openInProgress() || !MayEditList(kind, services_.dialogs))
         return;
-    if (kind == ListKind::Category) {
-        const auto answer = services_.dialogs.message(
-            {"To change the category can result in an non LDraw conform part. Please change the category only if "
-             "there is an official statement from LSC.\r\nDo you want to proceed?",
-             "Category Change", Buttons::YesNo, Icon::Exclamation, Answer::No});
-        if (answer != Answer::Yes)
-            return;
-    }
     try {
         frmList dialog(kind, EntriesOf(app_.Lists, kind), app_.ProgramFolder, services_.dialogs, this);
         dialog.exec();
@@ -75,28 +68,11 @@ void frmMain::MEinstellDefault_Click()
 
 void frmMain::cmdSetPreferences_Click()
 {
-    const auto answer = services_.dialogs.message(QuestionBox(
-        "Are you sure to subsitute the existing Real Name, Username and License Type with your values set in the "
-        "preferences?",
-        "Default Values"));
-    if (answer != Answer::Yes)
+    if (!TakePreferencesIntoRecord(app_, services_, [this](const std::string& utf8) { return toFile(utf8); }))
         return;
-    LadeDefaults(app_.Prefs, services_.store);
-    const std::pair<QLineEdit*, std::string*> names[] = {{txAuthorRealName, &app_.Prefs.DefaultRealName},
-                                                         {txAuthorUserName, &app_.Prefs.DefaultUserName}};
-    for (const auto& [box, value] : names)
-        box->setText(QString::fromStdString(*value));
-    updateTextField(*txAuthorRealName, app_.Header.AuthorRealName);
-    updateTextField(*txAuthorUserName, app_.Header.AuthorUserName);
-    const auto license = QString::fromStdString(app_.Prefs.DefaultLicense);
-    for (int i = 0; i < cbLicenses->count(); ++i) {
-        if (cbLicenses->itemText(i) != license)
-            continue;
-        if (cbLicenses->currentIndex() == i)
-            updateComboField(*cbLicenses, app_.Header.License); // chosen again: the same as a new choice
-        else
-            cbLicenses->setCurrentIndex(i);
-        break;
-    }
+    const auto encoding = app_.Header.Encoding;
+    txAuthorRealName->setText(ToWidget(app_.Header.AuthorRealName, encoding));
+    txAuthorUserName->setText(ToWidget(app_.Header.AuthorUserName, encoding));
+    SelectComboItem(*cbLicenses, app_.Header.License);
     MakeNewHeader();
 }

