@@ -47,7 +47,10 @@ std::string geometryLine(std::size_t index, Numbers& numbers)
     const int type = static_cast<int>(index % 5) + 1;
     std::string line = std::to_string(type) + " 16";
     switch (type) {
-    case 1: appendNumbers(line, numbers, 12); line += " stud.dat"; break;
+    case 1:
+        appendNumbers(line, numbers, 12);
+        line += " stud.dat";
+        break;
     case 2: appendNumbers(line, numbers, 6); break;
     case 3: appendNumbers(line, numbers, 9); break;
     case 4: appendNumbers(line, numbers, 12); break;

@@ -9,8 +9,8 @@
 #include <cstdio>
 
 #include "AppState.h"
-#include "Dialogs.h"
 #include "Clock.h"
+#include "Dialogs.h"
 #include "IniSettingsStore.h"
 #include "frmMain.h"
 

@@ -55,7 +55,8 @@ std::string checkJson(const HeaderData& header, const SaveFindings& findings, co
     if (tracker != nullptr) {
         json["tracker"] = nlohmann::ordered_json::array();
         for (const auto& finding : *tracker)
-            json["tracker"].push_back({{"id", finding.id}, {"level", LevelText(finding.level)}, {"text", finding.text}});
+            json["tracker"].push_back(
+                {{"id", finding.id}, {"level", LevelText(finding.level)}, {"text", finding.text}});
     }
     return json.dump() + '\n';
 }
@@ -108,8 +109,8 @@ FileReport reportOn(const std::string& path, ConsoleDialogs::Answerer answerer,
     return report;
 }
 
-int runBatch(const std::vector<std::string>& arguments, const BatchOptions& batch, std::ostream& out,
-             std::ostream& err, const std::function<FileReport(const std::string&)>& work)
+int runBatch(const std::vector<std::string>& arguments, const BatchOptions& batch, std::ostream& out, std::ostream& err,
+             const std::function<FileReport(const std::string&)>& work)
 {
     const auto files = ExpandPartFiles(arguments);
     Summary summary;
@@ -161,8 +162,7 @@ std::string savedLine(const std::string& path, const SaveOptions& options, const
         return "failed " + path + ": " +
                (dialogs.lastTitle() == ChangedOnDiskTitle ? "changed while saving" : dialogs.lastMessage()) + '\n';
     case SaveOutcome::Refused:
-    case SaveOutcome::DescriptionTooLong:
-        break;
+    case SaveOutcome::DescriptionTooLong: break;
     }
     report.saving = FileReport::Saving::Skipped;
     report.status = ExitStatus::Refused;
@@ -214,8 +214,9 @@ int RunSave(const std::vector<std::string>& arguments, const SaveOptions& option
     return runBatch(arguments, batch, out, err, [&](const std::string& path) {
         const std::lock_guard lock(locks.of(path));
         return reportOn(path, answer, [&](HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
-            const SaveContext context{dialogs, clock, options.backup, [&header] { return ComposeHeader(header); },
-                                      [] {}, batch.limitDescription};
+            const SaveContext context{dialogs,        clock,
+                                      options.backup, [&header] { return ComposeHeader(header); },
+                                      [] {},          batch.limitDescription};
             report.out = savedLine(header.FilePath, options, CheckHeaderAndSave(header, context), dialogs, report);
         });
     });

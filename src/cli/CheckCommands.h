@@ -6,10 +6,10 @@
 
 // How check and save work through many files.
 struct BatchOptions {
-    unsigned threads = 0;          // 0: one per core
-    bool quiet = false;            // no summary at the end
-    bool limitDescription = true;  // the description's 64 characters
-    bool errIsTerminal = false;    // a progress line is drawn on a terminal only
+    unsigned threads = 0;         // 0: one per core
+    bool quiet = false;           // no summary at the end
+    bool limitDescription = true; // the description's 64 characters
+    bool errIsTerminal = false;   // a progress line is drawn on a terminal only
 };
 
 struct CheckOptions {

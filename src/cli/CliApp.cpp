@@ -2,8 +2,8 @@
 
 #include <CLI/CLI.hpp>
 
-#include "ConsoleDialogs.h"
 #include "CheckCommands.h"
+#include "ConsoleDialogs.h"
 #include "PrintCommands.h"
 
 int RunCli(int argc, const char* const* argv, std::ostream& out, std::ostream& err, bool errIsTerminal)

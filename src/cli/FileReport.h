@@ -13,7 +13,7 @@ struct FileReport {
     std::string err; // for standard error
     int status = 0;  // the file's exit status
     bool unreadable = false;
-    bool refused = false; // by a save check, or by an error of the Parts Tracker's rules
+    bool refused = false;              // by a save check, or by an error of the Parts Tracker's rules
     std::vector<std::string> refusals; // the first line of each stop text
     bool missingUserName = false;
     FixUpOffers fixups;

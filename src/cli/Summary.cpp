@@ -24,8 +24,8 @@ void Summary::add(const FileReport& report)
 
 void Summary::print(std::ostream& err) const
 {
-    err << files_ << " files, " << refused_ << " refused, " << missingUserName_ << " without user name, "
-        << unreadable_ << " unreadable";
+    err << files_ << " files, " << refused_ << " refused, " << missingUserName_ << " without user name, " << unreadable_
+        << " unreadable";
     if (saving_)
         err << "; " << saved_ << " saved, " << skipped_ << " skipped, " << failed_ << " failed";
     err << '\n';

@@ -26,8 +26,8 @@ std::size_t sizeBound(const HeaderData& h)
 {
     constexpr std::size_t perLine = 32; // the longest keyword with its blanks and CR LF, and then some
     std::size_t size = 512;
-    for (const std::string* field : {&h.PartDescription, &h.PartName, &h.AuthorRealName, &h.AuthorUserName,
-                                     &h.PartType, &h.UpdateTag, &h.License, &h.Bfc, &h.Category})
+    for (const std::string* field : {&h.PartDescription, &h.PartName, &h.AuthorRealName, &h.AuthorUserName, &h.PartType,
+                                     &h.UpdateTag, &h.License, &h.Bfc, &h.Category})
         size += field->size() + perLine;
     for (const StringList* list : {&h.HelpLines, &h.Keywords, &h.CmdLines, &h.History, &h.Comments, &h.ColorLines})
         for (const auto& entry : *list)

@@ -1,9 +1,6 @@
 #include "Dialogs.h"
 
-MessageBox StopBox(std::string text)
-{
-    return {std::move(text), ProgramTitle, Buttons::Ok, Icon::None, Answer::Ok};
-}
+MessageBox StopBox(std::string text) { return {std::move(text), ProgramTitle, Buttons::Ok, Icon::None, Answer::Ok}; }
 
 MessageBox InformationBox(std::string text)
 {

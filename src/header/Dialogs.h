@@ -33,8 +33,7 @@ public:
     virtual ~Dialogs() = default;
     virtual Answer message(const MessageBox& box) = 0;
     // The typed text, or "" when the user cancelled.
-    virtual std::string input(const std::string& prompt, const std::string& title,
-                              const std::string& defaultText) = 0;
+    virtual std::string input(const std::string& prompt, const std::string& title, const std::string& defaultText) = 0;
     // The chosen path, or nullopt when the user cancelled.
     virtual std::optional<std::string> openFile(const OpenFileRequest& request) = 0;
 };

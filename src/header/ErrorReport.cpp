@@ -18,8 +18,8 @@ const char* ownerWord(OwnerKind kind)
 
 std::string ErrorReportText(const QmError& error, const Procedure& procedure)
 {
-    return "Error " + std::to_string(error.number()) + " (" + error.description() + ") in procedure " +
-           procedure.name + ownerWord(procedure.kind) + procedure.owner;
+    return "Error " + std::to_string(error.number()) + " (" + error.description() + ") in procedure " + procedure.name +
+           ownerWord(procedure.kind) + procedure.owner;
 }
 
 void ReportError(Dialogs& dialogs, const QmError& error, const Procedure& procedure)

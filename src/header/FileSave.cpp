@@ -21,8 +21,9 @@ std::string stampText(const LocalDateTime& t)
 
 MessageBox changedOnDiskBox(const std::string& path)
 {
-    return {"The file " + path + " was changed by another program after it was opened.\r\n"
-            "Save anyway and overwrite those changes?",
+    return {"The file " + path +
+                " was changed by another program after it was opened.\r\n"
+                "Save anyway and overwrite those changes?",
             ChangedOnDiskTitle, Buttons::YesNo, Icon::Exclamation, Answer::No};
 }
 

@@ -6,7 +6,10 @@
 
 bool HasCertifyInvertNext(std::string_view body) { return ContainsIgnoreCase(body, "0 BFC CERTIFY INVERTNEXT"); }
 
-void FixCertifyInvertNext(std::string& body) { body = ReplaceAll(body, "0 BFC CERTIFY INVERTNEXT", "0 BFC INVERTNEXT"); }
+void FixCertifyInvertNext(std::string& body)
+{
+    body = ReplaceAll(body, "0 BFC CERTIFY INVERTNEXT", "0 BFC INVERTNEXT");
+}
 
 bool HasRotationLines(std::string_view body) { return ContainsIgnoreCase(body, "0 ROTATION "); }
 

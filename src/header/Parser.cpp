@@ -22,9 +22,9 @@ const Procedure GetGlobalContentProcedure{"GetGlobalContent", OwnerKind::Modul, 
 // The keywords of the header lines the parser knows; a two-word line with one of these carries
 // nothing and is dropped.
 constexpr std::array<std::string_view, 23> KnownKeywords = {
-    "Name:", "Author:", "CATEGORY", "!CATEGORY", "BFC", "COLOR", "Unofficial", "unofficial",
-    "UNOFFICIAL", "Original", "original", "!LDRAW_ORG", "LDRAW_ORG", "!LDRAW", "!CMDLINE",
-    "CMDLINE", "!KEYWORDS", "KEYWORDS", "!HELP", "!LICENSE", "HISTORY", "!HISTORY", "//"};
+    "Name:",      "Author:",  "CATEGORY", "!CATEGORY",  "BFC",       "COLOR",    "Unofficial", "unofficial",
+    "UNOFFICIAL", "Original", "original", "!LDRAW_ORG", "LDRAW_ORG", "!LDRAW",   "!CMDLINE",   "CMDLINE",
+    "!KEYWORDS",  "KEYWORDS", "!HELP",    "!LICENSE",   "HISTORY",   "!HISTORY", "//"};
 
 template <std::size_t N>
 bool isOneOf(std::string_view word, const std::array<std::string_view, N>& forms)
@@ -350,7 +350,8 @@ void GetGlobalContent(HeaderData& header, Dialogs& dialogs, ParseProgress& progr
         ReportError(dialogs, error, IsUnixLineEndProcedure);
         const bool missing = error.number() == ErrorNumber::FileNotFound || error.number() == ErrorNumber::PathNotFound;
         if (missing)
-            dialogs.message({"File " + header.FilePath + " not found!", "Error", Buttons::Ok, Icon::Exclamation, Answer::Ok});
+            dialogs.message(
+                {"File " + header.FilePath + " not found!", "Error", Buttons::Ok, Icon::Exclamation, Answer::Ok});
         else
             ReportError(dialogs, error, GetGlobalContentProcedure);
         return;

@@ -21,8 +21,8 @@ void ensureRoomFor(std::size_t size)
 {
     const auto pages = ::sysconf(_SC_PHYS_PAGES);
     const auto pageSize = ::sysconf(_SC_PAGESIZE);
-    std::size_t room = pages > 0 && pageSize > 0 ? static_cast<std::size_t>(pages) * static_cast<std::size_t>(pageSize)
-                                                 : SIZE_MAX;
+    std::size_t room =
+        pages > 0 && pageSize > 0 ? static_cast<std::size_t>(pages) * static_cast<std::size_t>(pageSize) : SIZE_MAX;
     struct rlimit limit {};
     if (::getrlimit(RLIMIT_AS, &limit) == 0 && limit.rlim_cur != RLIM_INFINITY)
         room = std::min(room, static_cast<std::size_t>(limit.rlim_cur));

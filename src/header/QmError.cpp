@@ -45,20 +45,14 @@ QmError OsError(int errnoValue, const std::string& path)
         if (folderOfPathExists(path))
             return {ErrorNumber::FileNotFound, "File not found"};
         return {ErrorNumber::PathNotFound, "Path not found"};
-    case ENOTDIR:
-        return {ErrorNumber::PathNotFound, "Path not found"};
-    case EEXIST:
-        return {ErrorNumber::FileAlreadyExists, "File already exists"};
+    case ENOTDIR: return {ErrorNumber::PathNotFound, "Path not found"};
+    case EEXIST: return {ErrorNumber::FileAlreadyExists, "File already exists"};
     case EACCES:
     case EPERM:
-    case EROFS:
-        return {ErrorNumber::PermissionDenied, "Permission denied"};
+    case EROFS: return {ErrorNumber::PermissionDenied, "Permission denied"};
     case ENOSPC:
-    case EDQUOT:
-        return {ErrorNumber::DiskFull, "Disk full"};
-    case EIO:
-        return {ErrorNumber::DeviceIoError, "Device I/O error"};
-    default:
-        return PathFileAccessError();
+    case EDQUOT: return {ErrorNumber::DiskFull, "Disk full"};
+    case EIO: return {ErrorNumber::DeviceIoError, "Device I/O error"};
+    default: return PathFileAccessError();
     }
 }

@@ -35,7 +35,8 @@ std::string folderOf(const std::string& path)
 std::string uniqueNameIn(const std::string& folder, std::string_view prefix)
 {
     static thread_local std::mt19937_64 random{std::random_device{}()};
-    return folder + "/" + std::string(prefix) + std::to_string(::getpid()) + "-" + std::to_string(random() % 1000000007);
+    return folder + "/" + std::string(prefix) + std::to_string(::getpid()) + "-" +
+           std::to_string(random() % 1000000007);
 }
 
 void reach(const ReplaceStepHook& afterStep, ReplaceStep step)

@@ -7,7 +7,10 @@
 
 namespace {
 
-bool descriptionTooLong(const HeaderData& h) { return CharacterCount(h.PartDescription, h.Encoding) > DescriptionLimit; }
+bool descriptionTooLong(const HeaderData& h)
+{
+    return CharacterCount(h.PartDescription, h.Encoding) > DescriptionLimit;
+}
 bool missingUserName(const HeaderData& h) { return h.AuthorUserName.empty(); }
 
 // One step of the save's checks: a rule that stops the save with its sentence, or the question
@@ -20,8 +23,7 @@ struct Check {
 
 // The checks in the one order in which a save makes them and a check lists them.
 const Check Checks[] = {
-    {"Length of the part description is limited to 64 character!", descriptionTooLong,
-     SaveOutcome::DescriptionTooLong},
+    {"Length of the part description is limited to 64 character!", descriptionTooLong, SaveOutcome::DescriptionTooLong},
     {"You need to mention the Author!", [](const HeaderData& h) { return h.AuthorRealName.empty(); }},
     {nullptr, missingUserName},
     {"You need to set the BFC type!", [](const HeaderData& h) { return h.Bfc.empty(); }},

@@ -8,8 +8,7 @@ std::vector<std::string> SplitText(std::string_view text, std::string_view separ
     if (separator.empty())
         return {std::string(text)};
     std::size_t pieceStart = 0;
-    for (auto found = text.find(separator); found != std::string_view::npos;
-         found = text.find(separator, pieceStart)) {
+    for (auto found = text.find(separator); found != std::string_view::npos; found = text.find(separator, pieceStart)) {
         pieces.emplace_back(text.substr(pieceStart, found - pieceStart));
         pieceStart = found + separator.size();
     }

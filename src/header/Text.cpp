@@ -26,10 +26,20 @@ std::size_t utf8SequenceLength(std::string_view s, std::size_t i)
     std::size_t length = 0;
     unsigned min = 0;
     unsigned codePoint = 0;
-    if ((lead & 0xE0) == 0xC0) { length = 2; min = 0x80; codePoint = lead & 0x1F; }
-    else if ((lead & 0xF0) == 0xE0) { length = 3; min = 0x800; codePoint = lead & 0x0F; }
-    else if ((lead & 0xF8) == 0xF0) { length = 4; min = 0x10000; codePoint = lead & 0x07; }
-    else return 0;
+    if ((lead & 0xE0) == 0xC0) {
+        length = 2;
+        min = 0x80;
+        codePoint = lead & 0x1F;
+    } else if ((lead & 0xF0) == 0xE0) {
+        length = 3;
+        min = 0x800;
+        codePoint = lead & 0x0F;
+    } else if ((lead & 0xF8) == 0xF0) {
+        length = 4;
+        min = 0x10000;
+        codePoint = lead & 0x07;
+    } else
+        return 0;
     if (i + length > s.size())
         return 0;
     for (std::size_t k = 1; k < length; ++k) {
@@ -79,8 +89,8 @@ bool ContainsIgnoreCase(std::string_view text, std::string_view needle)
         // A first byte without case ("0 WRITE") lets memchr skip to the candidates, so a body of
         // megabytes is not folded byte by byte.
         if (!firstHasCase) {
-            const auto* found = static_cast<const char*>(
-                std::memchr(text.data() + pos, first, text.size() - needle.size() + 1 - pos));
+            const auto* found =
+                static_cast<const char*>(std::memchr(text.data() + pos, first, text.size() - needle.size() + 1 - pos));
             if (found == nullptr)
                 return false;
             pos = static_cast<std::size_t>(found - text.data());
@@ -120,9 +130,8 @@ std::size_t CharacterCount(std::string_view text, TextEncoding encoding)
 {
     if (encoding == TextEncoding::Latin1 || !IsValidUtf8(text))
         return text.size();
-    return static_cast<std::size_t>(std::count_if(text.begin(), text.end(), [](char c) {
-        return (static_cast<unsigned char>(c) & 0xC0) != 0x80;
-    }));
+    return static_cast<std::size_t>(
+        std::count_if(text.begin(), text.end(), [](char c) { return (static_cast<unsigned char>(c) & 0xC0) != 0x80; }));
 }
 
 std::string Latin1ToUtf8(std::string_view bytes)

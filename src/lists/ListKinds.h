@@ -12,7 +12,7 @@ struct ListKindInfo {
     const char* captionSuffix; // appended to the list dialog's caption "List"
     const char* addPrompt;
     const char* addTitle;
-    const char* loaderName;    // the loader named in its error report
+    const char* loaderName; // the loader named in its error report
 };
 
 const ListKindInfo& InfoOf(ListKind kind);

@@ -17,8 +17,8 @@ struct AppState {
     StandardLists Lists;
     Preferences Prefs;
     RecentFilesMenu Recent;
-    std::string PendingFile; // a path the Open command opens instead of asking
-    std::string ProgramFolder; // where the list files live
+    std::string PendingFile;     // a path the Open command opens instead of asking
+    std::string ProgramFolder;   // where the list files live
     std::string FirstOpenFolder; // the Open dialog's folder until "LastPath" is stored; empty: ProgramFolder
 };
 

@@ -9,12 +9,12 @@ struct HeaderFacts {
     QString description; // line 1 without its "0 "
     QString prefix;      // the description's leading run of "~", "_", "=" and "|"
     bool hasName = false, hasAuthor = false, hasLicense = false, hasType = false;
-    QString name;        // "0 Name:" value, with its folder ("s\\3001s01.dat")
-    QString author;      // "0 Author:" value
-    QString license;     // "0 !LICENSE" value, runs of blanks collapsed
-    QString type;        // "Part", "Unofficial_Subpart", ...
-    QString qualifier;   // "Alias", "Flexible_Section", "Physical_Colour" or empty
-    QString category;    // the first "0 !CATEGORY", otherwise the description's first word
+    QString name;      // "0 Name:" value, with its folder ("s\\3001s01.dat")
+    QString author;    // "0 Author:" value
+    QString license;   // "0 !LICENSE" value, runs of blanks collapsed
+    QString type;      // "Part", "Unofficial_Subpart", ...
+    QString qualifier; // "Alias", "Flexible_Section", "Physical_Colour" or empty
+    QString category;  // the first "0 !CATEGORY", otherwise the description's first word
     QStringList keywords;
     QStringList historyLines; // whole lines
     QStringList previewLines; // whole lines

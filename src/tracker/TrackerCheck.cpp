@@ -12,16 +12,15 @@ const QStringList RetiredCategories = {"Minifig", "Pov-RAY", "Lever", "Grab", "F
 const QStringList ApprovedLicences = {"Licensed under CC BY 4.0 : see CAreadme.txt",
                                       "Licensed under CC BY 2.0 and CC BY 4.0 : see CAreadme.txt",
                                       "Marked with CC0 1.0 : see CAreadme.txt"};
-const QStringList PreviewRotations = {"1 0 0 0 1 0 0 0 1",  "1 0 0 0 0 1 0 -1 0",  "1 0 0 0 0 -1 0 1 0",
-                                      "1 0 0 0 -1 0 0 0 -1", "0 0 1 0 1 0 -1 0 0", "0 0 -1 0 1 0 1 0 0",
-                                      "-1 0 0 0 1 0 0 0 -1", "0 -1 0 1 0 0 0 0 1", "0 1 0 -1 0 0 0 0 1",
-                                      "-1 0 0 0 -1 0 0 0 1"};
+const QStringList PreviewRotations = {
+    "1 0 0 0 1 0 0 0 1",  "1 0 0 0 0 1 0 -1 0",  "1 0 0 0 0 -1 0 1 0", "1 0 0 0 -1 0 0 0 -1", "0 0 1 0 1 0 -1 0 0",
+    "0 0 -1 0 1 0 1 0 0", "-1 0 0 0 1 0 0 0 -1", "0 -1 0 1 0 0 0 0 1", "0 1 0 -1 0 0 0 0 1",  "-1 0 0 0 -1 0 0 0 1"};
 
 struct Part {
     HeaderFacts facts;
-    QString fileName;  // the file's own name
-    QString baseName;  // lower case, without ".dat"
-    QString plainType; // the type without "Unofficial_"
+    QString fileName;       // the file's own name
+    QString baseName;       // lower case, without ".dat"
+    QString plainType;      // the type without "Unofficial_"
     bool partsType = false; // Part or Shortcut
     bool pattern = false;   // a parts-type file whose last suffix starts with "p"
     QStringList categories;
@@ -75,7 +74,8 @@ bool checkPresence(const Part& part, Findings& findings)
     const std::pair<bool, const char*> needs[] = {
         {!f.description.isEmpty(), "The description (line 1) is missing."},
         {f.hasName, "The \"0 Name:\" line is missing or empty."},
-        {f.hasType && KnownTypes.contains(part.plainType), "The \"0 !LDRAW_ORG\" line is missing or names no known type."},
+        {f.hasType && KnownTypes.contains(part.plainType),
+         "The \"0 !LDRAW_ORG\" line is missing or names no known type."},
         {f.hasLicense, "The \"0 !LICENSE\" line is missing."},
         {f.hasAuthor && authorWellFormed(f.author),
          "The \"0 Author:\" line is missing or not of the form \"Real Name [username]\"."},
@@ -95,8 +95,8 @@ void checkLicenceAndCategory(const Part& part, Findings& findings)
     if (!ApprovedLicences.contains(f.license))
         findings.error("license.approved", "The licence " + quoted(f.license) + " is not one the library accepts.");
     if (f.qualifier == "Physical_Colour" && !part.inCategory({"Obsolete"}))
-        findings.error("type.phycolor", "Physical_Colour is only allowed in category Obsolete, not " +
-                                            quoted(f.category) + ".");
+        findings.error("type.phycolor",
+                       "Physical_Colour is only allowed in category Obsolete, not " + quoted(f.category) + ".");
     if (part.partsType && !part.categories.contains(f.category) && !RetiredCategories.contains(f.category))
         findings.error("category.invalid", "The category " + quoted(f.category) + " is not an official one.");
     if (RetiredCategories.contains(f.category))
@@ -109,8 +109,8 @@ void checkHistory(const Part& part, Findings& findings)
         QStringLiteral("^0 !HISTORY \\d{4}-\\d{2}-\\d{2} (?:\\[[^\\]]+\\]|\\{[^}]+\\}) +\\S"));
     for (const auto& line : part.facts.historyLines)
         if (!form.match(line).hasMatch())
-            findings.error("history.invalid", "The history line " + quoted(line) +
-                                                  " is not \"0 !HISTORY YYYY-MM-DD [user] comment\".");
+            findings.error("history.invalid",
+                           "The history line " + quoted(line) + " is not \"0 !HISTORY YYYY-MM-DD [user] comment\".");
 }
 
 // The folder that a type's files carry in their "Name:".
@@ -141,8 +141,8 @@ void checkName(const Part& part, Findings& findings)
                                         quoted(f.name) + ".");
     const auto ownName = f.name.mid(folder.size());
     if (ownName.compare(part.fileName, Qt::CaseInsensitive) != 0)
-        findings.warning("name.filename", "The name " + quoted(ownName) + " is not the file's name " +
-                                              quoted(part.fileName) + ".");
+        findings.warning("name.filename",
+                         "The name " + quoted(ownName) + " is not the file's name " + quoted(part.fileName) + ".");
 }
 
 void checkDescriptionPrefix(const Part& part, Findings& findings)
@@ -150,12 +150,14 @@ void checkDescriptionPrefix(const Part& part, Findings& findings)
     const auto& f = part.facts;
     const auto& prefix = f.prefix;
     if (part.plainType == "Subpart" && !prefix.startsWith('~'))
-        findings.error("description.subpartdesc", "A subpart's description must start with \"~\": " + quoted(f.description));
+        findings.error("description.subpartdesc",
+                       "A subpart's description must start with \"~\": " + quoted(f.description));
     else if (part.partsType && part.inCategory({"Moved", "Obsolete"}) && !prefix.startsWith('~'))
         findings.error("description.movedorobsolete",
                        "A moved or obsolete part's description must start with \"~\": " + quoted(f.description));
     else if (f.qualifier == "Alias" && !prefix.contains('='))
-        findings.error("description.aliasdesc", "An alias's description must start with \"=\": " + quoted(f.description));
+        findings.error("description.aliasdesc",
+                       "An alias's description must start with \"=\": " + quoted(f.description));
     else if (part.partsType && part.baseName.startsWith('t') && !prefix.contains('|'))
         findings.error("description.thirdpartydesc",
                        "A third-party part's description must start with \"|\": " + quoted(f.description));
@@ -165,8 +167,8 @@ void checkDescription(const Part& part, Findings& findings)
 {
     const auto& f = part.facts;
     if (hasControlCharacters(f.description))
-        findings.error("description.invalidchars", "The description " + quoted(f.description) +
-                                                       " holds control characters.");
+        findings.error("description.invalidchars",
+                       "The description " + quoted(f.description) + " holds control characters.");
     checkDescriptionPrefix(part, findings);
     static const QRegularExpression single(QStringLiteral("(\\S+) (\\d)(?= |$)(?: (\\S+))?"));
     for (auto it = single.globalMatch(f.description); it.hasNext();) {
@@ -191,8 +193,8 @@ void checkPattern(const Part& part, Findings& findings)
                                                 QRegularExpression::CaseInsensitiveOption);
     if (!part.inCategory({"Moved", "Sticker", "Sticker Shortcut"}) && !f.keywords.contains("Colour Combination") &&
         !patternWord.match(f.description).hasMatch())
-        findings.error("description.patternword", "A pattern's description must end in \"Pattern\": " +
-                                                      quoted(f.description));
+        findings.error("description.patternword",
+                       "A pattern's description must end in \"Pattern\": " + quoted(f.description));
     if (part.inCategory({"Modulex", "Moved"}))
         return;
     for (const auto& keyword : f.keywords)
@@ -214,8 +216,8 @@ void checkTypeQualifiers(const Part& part, Findings& findings)
         findings.error("type.flex", "Flexible_Section is only allowed on a Part, not a " + part.plainType + ".");
     static const QRegularExpression flexName(QStringLiteral("k[0-9a-z]{2}$"));
     if (!part.inCategory({"Moved", "Obsolete"}) && !flexName.match(part.baseName).hasMatch())
-        findings.error("name.flex", "A flexible section's name must end in \"k\" and two characters: " +
-                                        quoted(part.fileName));
+        findings.error("name.flex",
+                       "A flexible section's name must end in \"k\" and two characters: " + quoted(part.fileName));
 }
 
 void checkBody(const Part& part, Findings& findings)

@@ -33,7 +33,8 @@ frmList::frmList(ListKind kind, const StringList& entries, const std::string& pr
         editor_.select(chosen.isEmpty() ? std::nullopt : std::optional<std::size_t>(lsValues->row(chosen.first())));
         txUpdate->setText(ListEntryToWidget(editor_.updateText()));
     });
-    connect(txUpdate, &QLineEdit::textEdited, this, [this](const QString& text) { editor_.setUpdateText(text.toStdString()); });
+    connect(txUpdate, &QLineEdit::textEdited, this,
+            [this](const QString& text) { editor_.setUpdateText(text.toStdString()); });
     connect(cmdAdd, &QPushButton::clicked, this, [this] {
         editor_.add();
         showEntries();

@@ -2,10 +2,10 @@
 
 #include <QComboBox>
 #include <QFile>
-#include <QLayout>
 #include <QFrame>
 #include <QIcon>
 #include <QLabel>
+#include <QLayout>
 #include <QLineEdit>
 #include <QListWidget>
 #include <QMenuBar>
@@ -50,7 +50,7 @@ frmMain::frmMain(AppState& app, Services& services, QWidget* parent)
     setTabOrder();
     progress_ = std::make_unique<WindowProgress>(*lblStatuszeile);
     for (QWidget* field : std::initializer_list<QWidget*>{txPartDescription, txAuthorRealName, txAuthorUserName,
-                                                         cbPartTypes, cbLicenses, cbBFCStatement, cbCategory})
+                                                          cbPartTypes, cbLicenses, cbBFCStatement, cbCategory})
         field->installEventFilter(this);
     layout()->setSizeConstraint(QLayout::SetFixedSize);
 }
@@ -91,7 +91,8 @@ void frmMain::createControls()
     cbPartTypes = fieldCombo("cbPartTypes", 1560, 1200, 7575, 315);
     Label2[3] = PlaceCaptioned<QLabel>(centralWidget(), "Label2_3", "Liscense Type:", 120, 1560, 1335, 255);
     cbLicenses = fieldCombo("cbLicenses", 1560, 1560, 6135, 315);
-    cmdSetPreferences = PlaceCaptioned<QPushButton>(centralWidget(), "cmdSetPreferences", "Set Preferences", 7800, 1560, 1335, 255);
+    cmdSetPreferences =
+        PlaceCaptioned<QPushButton>(centralWidget(), "cmdSetPreferences", "Set Preferences", 7800, 1560, 1335, 255);
     Label6 = PlaceCaptioned<QLabel>(centralWidget(), "Label6", "BFC Statement", 120, 1920, 1335, 255);
     cbBFCStatement = fieldCombo("cbBFCStatement", 1560, 1920, 7575, 315);
     Label8 = PlaceCaptioned<QLabel>(centralWidget(), "Label8", "Category", 120, 2280, 1335, 255);
@@ -110,7 +111,8 @@ void frmMain::createControls()
     cmdHistoryDelete = PlaceCaptioned<QPushButton>(centralWidget(), "cmdHistoryDelete", "Delete", 5520, 4200, 735, 255);
     cmdCommentsEdit = PlaceCaptioned<QPushButton>(centralWidget(), "cmdCommentsEdit", "Edit", 6480, 4200, 735, 255);
     cmdCommentsAdd = PlaceCaptioned<QPushButton>(centralWidget(), "cmdCommentsAdd", "Add", 7440, 4200, 735, 255);
-    cmdCommentsDelete = PlaceCaptioned<QPushButton>(centralWidget(), "cmdCommentsDelete", "Delete", 8400, 4200, 735, 255);
+    cmdCommentsDelete =
+        PlaceCaptioned<QPushButton>(centralWidget(), "cmdCommentsDelete", "Delete", 8400, 4200, 735, 255);
     Label7 = PlaceCaptioned<QLabel>(centralWidget(), "Label7", "New Header:", 120, 4680, 1335, 255);
     txNewHeader = headerBox("txNewHeader", 1560, 4560, 7575, 1815);
     Label5 = PlaceCaptioned<QLabel>(centralWidget(), "Label5", "Old Header:", 120, 6600, 1335, 255);
@@ -167,10 +169,11 @@ void frmMain::createMenus()
 
 void frmMain::setTabOrder()
 {
-    ChainTabOrder({txPartDescription, txFileName, txAuthorRealName, txAuthorUserName, cbPartTypes, cbLicenses,
-                   cbBFCStatement, cbCategory, txOldHeader, txNewHeader, lsKeyWords, cmdAdd, cmdDelete, cmdEdit,
-                   cmdSetPreferences, lsHistory, cmdHistoryEdit, cmdHistoryDelete, cmdHistoryAdd, lsComments,
-                   cmdCommentsEdit, cmdCommentsAdd, cmdCommentsDelete});
+    ChainTabOrder({txPartDescription, txFileName,     txAuthorRealName, txAuthorUserName, cbPartTypes,
+                   cbLicenses,        cbBFCStatement, cbCategory,       txOldHeader,      txNewHeader,
+                   lsKeyWords,        cmdAdd,         cmdDelete,        cmdEdit,          cmdSetPreferences,
+                   lsHistory,         cmdHistoryEdit, cmdHistoryDelete, cmdHistoryAdd,    lsComments,
+                   cmdCommentsEdit,   cmdCommentsAdd, cmdCommentsDelete});
     for (QLabel* text : {Label1, lblLength, Label4, Label3, Label6, Label8, Label9, Label11, Label10, Label7, Label5,
                          lblStatuszeile, Label2[0], Label2[1], Label2[2], Label2[3]})
         text->setFocusPolicy(Qt::NoFocus);
@@ -204,7 +207,8 @@ void frmMain::StartUp(const QStringList& arguments)
     lblStatuszeile->setText("Welcome to Quillmark programm.");
     // The shell hands the arguments over already split: the first one is the path, blanks and all.
     // It is remembered in full, so that the recent files still find it from another folder.
-    app_.PendingFile = arguments.isEmpty() ? std::string() : AbsolutePath(QFile::encodeName(arguments.first()).toStdString());
+    app_.PendingFile =
+        arguments.isEmpty() ? std::string() : AbsolutePath(QFile::encodeName(arguments.first()).toStdString());
     show();
     if (!app_.PendingFile.empty())
         MDateiOeffnen_Click();

@@ -31,8 +31,7 @@ bool leftForAnotherControl(QEvent* event)
     if (event->type() != QEvent::FocusOut)
         return false;
     const auto reason = static_cast<QFocusEvent*>(event)->reason();
-    return reason != Qt::ActiveWindowFocusReason && reason != Qt::PopupFocusReason &&
-           reason != Qt::MenuBarFocusReason;
+    return reason != Qt::ActiveWindowFocusReason && reason != Qt::PopupFocusReason && reason != Qt::MenuBarFocusReason;
 }
 
 } // namespace
@@ -40,9 +39,9 @@ bool leftForAnotherControl(QEvent* event)
 void frmMain::connectHandlers()
 {
     const std::pair<QComboBox*, std::string HeaderData::*> combos[] = {{cbPartTypes, &HeaderData::PartType},
-                                                                      {cbLicenses, &HeaderData::License},
-                                                                      {cbBFCStatement, &HeaderData::Bfc},
-                                                                      {cbCategory, &HeaderData::Category}};
+                                                                       {cbLicenses, &HeaderData::License},
+                                                                       {cbBFCStatement, &HeaderData::Bfc},
+                                                                       {cbCategory, &HeaderData::Category}};
     for (const auto& [combo, field] : combos)
         connect(combo, &QComboBox::currentIndexChanged, this, [this, combo = combo, field = field](int index) {
             if (index >= 0)
@@ -75,10 +74,9 @@ void frmMain::connectHandlers()
 
 bool frmMain::eventFilter(QObject* watched, QEvent* event)
 {
-    const std::pair<QLineEdit*, std::string HeaderData::*> boxes[] = {
-        {txPartDescription, &HeaderData::PartDescription},
-        {txAuthorRealName, &HeaderData::AuthorRealName},
-        {txAuthorUserName, &HeaderData::AuthorUserName}};
+    const std::pair<QLineEdit*, std::string HeaderData::*> boxes[] = {{txPartDescription, &HeaderData::PartDescription},
+                                                                      {txAuthorRealName, &HeaderData::AuthorRealName},
+                                                                      {txAuthorUserName, &HeaderData::AuthorUserName}};
     if (event->type() == QEvent::KeyPress) {
         const auto key = static_cast<QKeyEvent*>(event)->key();
         keysPressedInBox_.insert({watched, key});
@@ -106,10 +104,13 @@ bool frmMain::typedIntoBox(QObject* watched, QEvent* event)
 
 void frmMain::moveFocusOnEnter(QObject* watched)
 {
-    const std::pair<QWidget*, QWidget*> chain[] = {
-        {txPartDescription, txAuthorRealName}, {txAuthorRealName, txAuthorUserName}, {txAuthorUserName, cbPartTypes},
-        {cbPartTypes, cbLicenses},             {cbLicenses, cbBFCStatement},         {cbBFCStatement, cbCategory},
-        {cbCategory, lsKeyWords}};
+    const std::pair<QWidget*, QWidget*> chain[] = {{txPartDescription, txAuthorRealName},
+                                                   {txAuthorRealName, txAuthorUserName},
+                                                   {txAuthorUserName, cbPartTypes},
+                                                   {cbPartTypes, cbLicenses},
+                                                   {cbLicenses, cbBFCStatement},
+                                                   {cbBFCStatement, cbCategory},
+                                                   {cbCategory, lsKeyWords}};
     for (const auto& [from, to] : chain)
         if (watched == from) {
             // Keyboard focus shows its frame, as after Tab.

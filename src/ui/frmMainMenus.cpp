@@ -25,10 +25,7 @@ QStringList displayTexts(const StringList& entries)
 
 void frmMain::MEditCategory_Click() { editStandardList(ListKind::Category, *cbCategory, "MEditCategory_Click"); }
 void frmMain::MEditPartTyps_Click() { editStandardList(ListKind::PartType, *cbPartTypes, "MEditPartTyps_Click"); }
-void frmMain::MEditBFCStatement_Click()
-{
-    editStandardList(ListKind::Bfc, *cbBFCStatement, "MEditBFCStatement_Click");
-}
+void frmMain::MEditBFCStatement_Click() { editStandardList(ListKind::Bfc, *cbBFCStatement, "MEditBFCStatement_Click"); }
 void frmMain::MEditLicense_Click() { editStandardList(ListKind::License, *cbLicenses, "MEditLicense_Click"); }
 
 void frmMain::editStandardList(ListKind kind, QComboBox& combo, const char* handler)

@@ -11,8 +11,8 @@
 #include <QPlainTextEdit>
 
 #include "DescriptionTabs.h"
-#include "DocumentQuestions.h"
 #include "Dialogs.h"
+#include "DocumentQuestions.h"
 #include "ErrorReport.h"
 #include "FileSave.h"
 #include "FileText.h"
@@ -46,8 +46,8 @@ void frmMain::MDateiOeffnen_Click()
     std::string path = app_.PendingFile;
     app_.PendingFile.clear();
     if (path.empty()) {
-        const auto chosen = services_.dialogs.openFile(
-            {"Load DAT-File", "LDraw DAT-File (*.dat)", "dat", app_.Header.FileFolder});
+        const auto chosen =
+            services_.dialogs.openFile({"Load DAT-File", "LDraw DAT-File (*.dat)", "dat", app_.Header.FileFolder});
         if (!chosen)
             return; // Cancel: the file the user was working on stays open
         path = *chosen;
@@ -177,10 +177,7 @@ void frmMain::SelectComboItem(QComboBox& combo, const std::string& text)
     combo.repaint();
 }
 
-void frmMain::showCaption()
-{
-    setWindowTitle(QString::fromStdString(CaptionFor(baseTitle_, app_.Header.PartName)));
-}
+void frmMain::showCaption() { setWindowTitle(QString::fromStdString(CaptionFor(baseTitle_, app_.Header.PartName))); }
 
 void frmMain::showRecentFiles()
 {
@@ -206,12 +203,9 @@ void frmMain::MDateiSpeichern_Click()
 
 SaveResult frmMain::checkHeaderAndSave()
 {
-    const SaveContext context{services_.dialogs,
-                              services_.clock,
-                              app_.Prefs.MakeBackup,
-                              [this] { return newHeaderText_; },
-                              [this] { MakeNewHeader(); },
-                              app_.Prefs.LimitDescription};
+    const SaveContext context{services_.dialogs,           services_.clock,
+                              app_.Prefs.MakeBackup,       [this] { return newHeaderText_; },
+                              [this] { MakeNewHeader(); }, app_.Prefs.LimitDescription};
     const auto result = CheckHeaderAndSave(app_.Header, context);
     if (result.outcome == SaveOutcome::DescriptionTooLong)
         showDescriptionTooLong();

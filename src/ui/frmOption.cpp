@@ -8,8 +8,7 @@
 
 #include "TwipLayout.h"
 
-frmOption::frmOption(const PreferencesForm& form, const QStringList& sortedLicenses, QWidget* parent)
-    : QDialog(parent)
+frmOption::frmOption(const PreferencesForm& form, const QStringList& sortedLicenses, QWidget* parent) : QDialog(parent)
 {
     setObjectName("frmOption");
     setWindowTitle("Preferences");

@@ -18,7 +18,8 @@ namespace {
 
 const std::string GoodPart = "0 Brick\r\n0 Author: Sam Sample [ssample]\r\n0 !LDRAW_ORG Part\r\n0 !LICENSE L\r\n"
                              "0 BFC CERTIFY CCW\r\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat\r\n";
-const std::string NoBfcLongPart = "0 " + std::string(70, 'x') + "\r\n0 Author: Sam\r\n0 !LDRAW_ORG Part\r\n"
+const std::string NoBfcLongPart = "0 " + std::string(70, 'x') +
+                                  "\r\n0 Author: Sam\r\n0 !LDRAW_ORG Part\r\n"
                                   "0 !LICENSE L\r\n0 WRITE hello\r\n";
 
 TEST(CliBatch, FoldersGivePartFilesOfAnyCaseInPathOrderWithoutFollowingLinkedFolders)
@@ -35,8 +36,8 @@ TEST(CliBatch, FoldersGivePartFilesOfAnyCaseInPathOrderWithoutFollowingLinkedFol
     fs::create_directory_symlink(dir.path() / "elsewhere", lib + "/link");
     const auto single = dir.write("z.txt", GoodPart);
     const auto run = RunCliWith({"check", "--quiet", single, lib});
-    EXPECT_EQ(run.out, single + ": ok\n" + lib + "/c.Dat: ok\n" + lib + "/parts/a.dat: ok\n" + lib +
-                           "/parts/s/b.DAT: ok\n");
+    EXPECT_EQ(run.out,
+              single + ": ok\n" + lib + "/c.Dat: ok\n" + lib + "/parts/a.dat: ok\n" + lib + "/parts/s/b.DAT: ok\n");
 }
 
 TEST(CliBatch, SummaryCountsEachFindingAndTheLengthLimitCanBeLifted)

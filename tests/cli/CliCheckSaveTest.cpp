@@ -10,9 +10,10 @@ namespace fs = std::filesystem;
 
 namespace {
 
-const std::string GoodPart = "0 Brick 2 x 4\r\n0 Name: 3001.dat\r\n0 Author: Sam Sample [ssample]\r\n"
-                             "0 !LDRAW_ORG Part UPDATE 2004-01\r\n0 !LICENSE Licensed under CC BY 4.0 : see CAreadme.txt\r\n"
-                             "0 BFC CERTIFY CCW\r\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat\r\n";
+const std::string GoodPart =
+    "0 Brick 2 x 4\r\n0 Name: 3001.dat\r\n0 Author: Sam Sample [ssample]\r\n"
+    "0 !LDRAW_ORG Part UPDATE 2004-01\r\n0 !LICENSE Licensed under CC BY 4.0 : see CAreadme.txt\r\n"
+    "0 BFC CERTIFY CCW\r\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat\r\n";
 const std::string NoAuthorPart = "0 Brick\r\n0 COLOR 4 red\r\n0 ROTATION CENTER 0 0 0\r\n1 16 a.dat\r\n";
 const std::string NoUserPart = "0 Brick\r\n0 Author: Sam Sample\r\n0 !LDRAW_ORG Part\r\n0 !LICENSE L\r\n"
                                "0 BFC CERTIFY CCW\r\n0 WRITE hello\r\n1 16 a.dat\r\n";
@@ -43,7 +44,8 @@ TEST(CliCheck, JsonObjectPerFile)
     EXPECT_EQ(json["refusals"].size(), 4u);
     EXPECT_EQ(json["refusals"][0], "You need to mention the Author!\r\nSaving the file is not possible");
     EXPECT_EQ(json["missing_username"], true);
-    EXPECT_EQ(json["fixups"], (nlohmann::json{{"certify_invertnext", false}, {"rotation", true}, {"write", false}, {"color", true}}));
+    EXPECT_EQ(json["fixups"],
+              (nlohmann::json{{"certify_invertnext", false}, {"rotation", true}, {"write", false}, {"color", true}}));
 }
 
 TEST(CliCheck, GoodFilesExitZeroUnreadableTwo)

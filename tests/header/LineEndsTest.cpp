@@ -99,7 +99,8 @@ TEST_F(PartFileParse, EmptyFileGivesEmptyRecordAndTheLineEndCheckReport)
     const auto h = open("");
     EXPECT_EQ(h.OldHeader, "");
     ASSERT_EQ(dialogs.messages.size(), 1u);
-    EXPECT_EQ(dialogs.messages[0].text, "Error 62 (Input past end of file) in procedure IsUnixLineEnd of Modul modUNIX");
+    EXPECT_EQ(dialogs.messages[0].text,
+              "Error 62 (Input past end of file) in procedure IsUnixLineEnd of Modul modUNIX");
 }
 
 TEST_F(PartFileParse, FileOfLineEndsOnly)

@@ -134,8 +134,8 @@ TEST(ParserRows, CommentsAndDatedLines)
 
 TEST(ParserRows, FormsThatAreNotKeywordsStayInTheBody)
 {
-    const auto h = parseLines({"0 d", "0 HELP me", "0 Category Brick", "0 !COLOR x y", "0 ROTATION CENTER 0 0 0",
-                               "0 !CATEGORY Brick"});
+    const auto h = parseLines(
+        {"0 d", "0 HELP me", "0 Category Brick", "0 !COLOR x y", "0 ROTATION CENTER 0 0 0", "0 !CATEGORY Brick"});
     EXPECT_EQ(h.Body, "0 HELP me\r\n0 Category Brick\r\n0 !COLOR x y\r\n0 ROTATION CENTER 0 0 0");
     EXPECT_EQ(h.Category, "Brick");
 }
@@ -181,7 +181,8 @@ TEST(ParserBlanks, EmptyWordsAndLeadingBlanks)
 
 TEST(ParserEndOfHeader, BodyTrimsLinesAndKeepsInnerEmptyLines)
 {
-    const auto h = parseLines({"0 d", "", "0 FOO bar", "   1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat   ", "", "2 24 0 0 0 1 1 1"});
+    const auto h =
+        parseLines({"0 d", "", "0 FOO bar", "   1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat   ", "", "2 24 0 0 0 1 1 1"});
     EXPECT_EQ(h.Body, "0 FOO bar\r\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat\r\n\r\n2 24 0 0 0 1 1 1");
     EXPECT_EQ(h.OldHeader, "0 d\r\n0 FOO bar");
 }
@@ -248,9 +249,9 @@ TEST(ParserProgress, EveryTenthLineAndBusyAroundTheParse)
     HeaderData header;
     RecordingProgress progress;
     ParseHeaderText(header, text, progress);
-    EXPECT_EQ(progress.captions, (std::vector<std::string>{"Parsing file. Line 0. Please wait...",
-                                                           "Parsing file. Line 10. Please wait...",
-                                                           "Parsing file. Line 20. Please wait..."}));
+    EXPECT_EQ(progress.captions,
+              (std::vector<std::string>{"Parsing file. Line 0. Please wait...", "Parsing file. Line 10. Please wait...",
+                                        "Parsing file. Line 20. Please wait..."}));
     EXPECT_EQ(progress.busyChanges, (std::vector<bool>{true, false}));
 }
 

@@ -59,7 +59,8 @@ TEST_F(SaveChecks, DescriptionOfSixtyFiveCharactersIsRefusedUnlessTheLimitIsOff)
     limitDescription = false;
     EXPECT_EQ(save().outcome, SaveOutcome::Saved);
     h.Bfc.clear();
-    EXPECT_EQ(EvaluateSaveChecks(h, false).refusals, std::vector<std::string>{RefusalText("You need to set the BFC type!")});
+    EXPECT_EQ(EvaluateSaveChecks(h, false).refusals,
+              std::vector<std::string>{RefusalText("You need to set the BFC type!")});
 }
 
 TEST_F(SaveChecks, DescriptionLengthCountsCharactersOfAUtf8File)
@@ -86,10 +87,12 @@ TEST_F(SaveChecks, ChecksStopAtTheFirstFailureInTheirOneOrder)
     h.Bfc.clear();
     h.License.clear();
     h.PartType.clear();
-    const std::vector<std::string> order = {
-        "Length of the part description is limited to 64 character!", "You need to mention the Author!",
-        "You need to set the BFC type!", "You need to set the Liscense type!", "You need to set the Part type!",
-        "Parts with 'needs work' in title needs a proper comment!"};
+    const std::vector<std::string> order = {"Length of the part description is limited to 64 character!",
+                                            "You need to mention the Author!",
+                                            "You need to set the BFC type!",
+                                            "You need to set the Liscense type!",
+                                            "You need to set the Part type!",
+                                            "Parts with 'needs work' in title needs a proper comment!"};
     std::vector<std::string> listed;
     for (const auto& sentence : order)
         listed.push_back(sentence + NotPossible);
@@ -98,8 +101,9 @@ TEST_F(SaveChecks, ChecksStopAtTheFirstFailureInTheirOneOrder)
 
     // Each save names the first failure; mending it lets the next one show.
     const std::vector<std::function<void()>> mend = {
-        [&] { h.PartDescription = "Brick"; }, [&] { h.AuthorRealName = "Jane"; }, [&] { h.Bfc = "CERTIFY CCW"; },
-        [&] { h.License = "L"; },           [&] { h.PartType = "Part"; },       [&] { h.Comments = {"// rough"}; }};
+        [&] { h.PartDescription = "Brick"; }, [&] { h.AuthorRealName = "Jane"; },
+        [&] { h.Bfc = "CERTIFY CCW"; },       [&] { h.License = "L"; },
+        [&] { h.PartType = "Part"; },         [&] { h.Comments = {"// rough"}; }};
     for (std::size_t i = 0; i < order.size(); ++i) {
         dialogs = ScriptedDialogs();
         if (i >= 2)

@@ -41,7 +41,10 @@ Function* realFunction(const char* name)
 extern "C" {
 int fsync(int fd) { return intercept("fsync", realFunction<int(int)>("fsync"), fd); }
 int close(int fd) { return intercept("close", realFunction<int(int)>("close"), fd); }
-int fchmod(int fd, mode_t mode) noexcept { return intercept("fchmod", realFunction<int(int, mode_t)>("fchmod"), fd, mode); }
+int fchmod(int fd, mode_t mode) noexcept
+{
+    return intercept("fchmod", realFunction<int(int, mode_t)>("fchmod"), fd, mode);
+}
 int rename(const char* from, const char* to) noexcept
 {
     return intercept("rename", realFunction<int(const char*, const char*)>("rename"), from, to);

@@ -12,7 +12,10 @@ namespace {
 
 class ListEditing : public ::testing::Test {
 protected:
-    ListEditor editor(ListKind kind, const StringList& entries) { return ListEditor(kind, entries, dir.path().string(), dialogs); }
+    ListEditor editor(ListKind kind, const StringList& entries)
+    {
+        return ListEditor(kind, entries, dir.path().string(), dialogs);
+    }
     TempDir dir;
     ScriptedDialogs dialogs;
 };
@@ -178,7 +181,8 @@ TEST_F(ListEditing, UnwritableFileIsReportedAndTheDialogStays)
     dialogs.expectMessage(Answer::Yes);
     dialogs.expectMessage(Answer::Ok);
     EXPECT_FALSE(list.close());
-    EXPECT_EQ(dialogs.messages.back().text, "Error 70 (Permission denied) in procedure cmdClose_Click of Formular frmList");
+    EXPECT_EQ(dialogs.messages.back().text,
+              "Error 70 (Permission denied) in procedure cmdClose_Click of Formular frmList");
     EXPECT_EQ(ReadBytes(path), "A\r\n");
     EXPECT_TRUE(list.ListChanged());
 }

@@ -40,7 +40,8 @@ std::vector<std::string> nonEmptyLinesAfterTheHeader(std::string content)
     while (!reader.atEnd()) {
         const auto line = reader.nextLine();
         const auto trimmed = TrimBlanks(line);
-        const bool invertNext = line.rfind("0 BFC INVERTNEXT", 0) == 0 || line.rfind("0 BFC CERTIFY INVERTNEXT", 0) == 0;
+        const bool invertNext =
+            line.rfind("0 BFC INVERTNEXT", 0) == 0 || line.rfind("0 BFC CERTIFY INVERTNEXT", 0) == 0;
         const bool metaLine = line == "0" || line.rfind("0 ", 0) == 0;
         if (!line.empty() && (!metaLine || invertNext))
             headerEnded = true;
@@ -89,8 +90,7 @@ TEST_F(Corpus, NothingOfTheBodyIsLost)
 {
     for (const auto& file : files) {
         const auto content = ReadBytes(file.string());
-        EXPECT_TRUE(containsInOrder(opened(file.string(), content).Body, nonEmptyLinesAfterTheHeader(content)))
-            << file;
+        EXPECT_TRUE(containsInOrder(opened(file.string(), content).Body, nonEmptyLinesAfterTheHeader(content))) << file;
     }
 }
 
@@ -110,10 +110,10 @@ TEST_F(Corpus, AComposedHeaderReadsBackAsTheSameRecord)
             };
             const auto author = h.AuthorRealName.empty() ? std::string("Unknown") : h.AuthorRealName;
             return std::tuple(settled(h.PartDescription), ToLowerAscii(h.PartName), settled(author),
-                              settled(h.AuthorUserName), settled(h.PartType), settled(h.UpdateTag),
-                              settled(h.License), settled(h.Bfc), settled(h.Category), settledAll(h.Keywords),
-                              settledAll(h.History), settledAll(h.Comments), settledAll(h.HelpLines),
-                              settledAll(h.CmdLines), settledAll(h.ColorLines));
+                              settled(h.AuthorUserName), settled(h.PartType), settled(h.UpdateTag), settled(h.License),
+                              settled(h.Bfc), settled(h.Category), settledAll(h.Keywords), settledAll(h.History),
+                              settledAll(h.Comments), settledAll(h.HelpLines), settledAll(h.CmdLines),
+                              settledAll(h.ColorLines));
         };
         EXPECT_TRUE(fields(first) == fields(again)) << file;
     }

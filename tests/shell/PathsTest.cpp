@@ -5,7 +5,6 @@
 
 namespace {
 
-
 TEST(PathHelpers, NameAndFolder)
 {
     ScriptedDialogs dialogs;
@@ -26,7 +25,8 @@ TEST(PathHelpers, BlankPathHasNoNameAndIsReported)
     dialogs.expectMessage(Answer::Ok);
     EXPECT_EQ(DateiNurName(" ", dialogs), "");
     ASSERT_EQ(dialogs.messages.size(), 1u);
-    EXPECT_EQ(dialogs.messages[0].text, "Error 9 (Subscript out of range) in procedure DateiNurName of Modul modFunctions");
+    EXPECT_EQ(dialogs.messages[0].text,
+              "Error 9 (Subscript out of range) in procedure DateiNurName of Modul modFunctions");
     EXPECT_EQ(dialogs.messages[0].title, "Quillmark");
     EXPECT_EQ(DateiNurPfad(""), "");
 }

@@ -17,7 +17,7 @@ TEST_F(PreferencesStore, ChoicesAreOnWhenMissingAndOnlyForTrueOrWahr)
 {
     EXPECT_TRUE(StoredBackupChoice(store));
     EXPECT_TRUE(StoredDescriptionLimit(store));
-    const std::pair<const char*, bool> cases[] = {{"True", true}, {" True ", true}, {"Wahr", true},
+    const std::pair<const char*, bool> cases[] = {{"True", true},  {" True ", true}, {"Wahr", true},
                                                   {"true", false}, {"False", false}, {"", false}};
     for (const auto& [stored, on] : cases) {
         store.write(DefaultGroup, "Backup", stored);

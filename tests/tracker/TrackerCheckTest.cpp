@@ -76,7 +76,8 @@ TEST(TrackerRules, TypeQualifiersAndPaths)
 
 TEST(TrackerRules, DescriptionPrefixesAndCharacters)
 {
-    EXPECT_EQ(idsOf(cleanPart("Brick Sub", "s\\3001s01.dat", "Subpart"), "3001s01.dat"), Ids{"description.subpartdesc"});
+    EXPECT_EQ(idsOf(cleanPart("Brick Sub", "s\\3001s01.dat", "Subpart"), "3001s01.dat"),
+              Ids{"description.subpartdesc"});
     EXPECT_EQ(idsOf(cleanPart("Brick", "3001.dat", "Part Alias")), Ids{"description.aliasdesc"});
     EXPECT_EQ(idsOf(cleanPart("Brick", "t3001.dat"), "t3001.dat"), Ids{"description.thirdpartydesc"});
     EXPECT_EQ(idsOf(cleanPart("|Brick", "t3001.dat"), "t3001.dat"), Ids{});
@@ -130,12 +131,30 @@ TEST(TrackerRules, EveryCorpusFileGivesOnlyKnownIds)
     const auto files = CorpusPartFiles();
     if (files.empty())
         GTEST_SKIP() << "no corpus folder beside the project";
-    const Ids known = {"missing", "license.approved", "type.phycolor", "category.invalid", "history.invalid",
-                       "name.invalidchars", "name.xparts", "type.path", "description.invalidchars",
-                       "description.subpartdesc", "description.movedorobsolete", "description.aliasdesc",
-                       "description.thirdpartydesc", "description.patternword", "keywords.patternset",
-                       "type.alias", "type.flex", "name.flex", "bfc", "obsoleteimproper", "circularreference",
-                       "warning.previewinvalid", "warning.descriptionnumbers", "warning.minifigcategory",
+    const Ids known = {"missing",
+                       "license.approved",
+                       "type.phycolor",
+                       "category.invalid",
+                       "history.invalid",
+                       "name.invalidchars",
+                       "name.xparts",
+                       "type.path",
+                       "description.invalidchars",
+                       "description.subpartdesc",
+                       "description.movedorobsolete",
+                       "description.aliasdesc",
+                       "description.thirdpartydesc",
+                       "description.patternword",
+                       "keywords.patternset",
+                       "type.alias",
+                       "type.flex",
+                       "name.flex",
+                       "bfc",
+                       "obsoleteimproper",
+                       "circularreference",
+                       "warning.previewinvalid",
+                       "warning.descriptionnumbers",
+                       "warning.minifigcategory",
                        "name.filename"};
     for (const auto& file : files)
         for (const auto& id : idsOf(ReadBytes(file.string()), file.filename().string()))

@@ -1,11 +1,11 @@
 #include <QAction>
 #include <QComboBox>
+#include <QKeyEvent>
 #include <QLabel>
 #include <QLineEdit>
 #include <QListWidget>
 #include <QPlainTextEdit>
 #include <QPushButton>
-#include <QKeyEvent>
 #include <QTest>
 #include <QTimer>
 
@@ -85,7 +85,8 @@ TEST_F(WindowTest, ValuesMissingFromTheListsStayUnselectedButTheHeaderIsComposed
     for (const char* combo : {"cbPartTypes", "cbLicenses", "cbBFCStatement", "cbCategory"})
         EXPECT_EQ(child<QComboBox>(combo)->currentIndex(), -1) << combo;
     EXPECT_NE(window->newHeaderText().find("0 !LDRAW_ORG Strange\r\n"), std::string::npos);
-    EXPECT_NE(child<QPlainTextEdit>("txNewHeader")->toPlainText().toStdString().find("0 !LICENSE Mine"), std::string::npos);
+    EXPECT_NE(child<QPlainTextEdit>("txNewHeader")->toPlainText().toStdString().find("0 !LICENSE Mine"),
+              std::string::npos);
     EXPECT_FALSE(app.Header.FileChanged);
 }
 
@@ -348,14 +349,16 @@ TEST_F(WindowTest, AFailureInsideAnOpenOrASaveIsReportedAndEndsIt)
     dialogs.failNextMessage(); // the box about the removed TAB
     dialogs.expectMessage(Answer::Ok);
     openThroughPendingFile(part("tab.dat", "0 Brick\t2 x 4\r\n0 Author: A\r\n"));
-    EXPECT_EQ(dialogs.messages.back().text, "Error 51 (Internal error) in procedure MDateiOeffnen_Click of Formular frmMain");
+    EXPECT_EQ(dialogs.messages.back().text,
+              "Error 51 (Internal error) in procedure MDateiOeffnen_Click of Formular frmMain");
     EXPECT_FALSE(app.Header.Loading);
     EXPECT_EQ(text("lblStatuszeile"), "");
 
     dialogs.failNextMessage(); // the question about the missing user name
     dialogs.expectMessage(Answer::Ok);
     window->MDateiSpeichern_Click();
-    EXPECT_EQ(dialogs.messages.back().text, "Error 51 (Internal error) in procedure MDateiSpeichern_Click of Formular frmMain");
+    EXPECT_EQ(dialogs.messages.back().text,
+              "Error 51 (Internal error) in procedure MDateiSpeichern_Click of Formular frmMain");
 }
 
 TEST_F(WindowTest, TabsInTheDescriptionAreRemovedOnOpen)

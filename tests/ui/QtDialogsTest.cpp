@@ -35,9 +35,8 @@ TEST_F(WindowTest, QtMessageBoxesShowWhatWasAskedAndAnswerWhatWasPressed)
          QMessageBox::No, QMessageBox::Yes, Answer::Yes},
         {Buttons::YesNo, Icon::Question, Answer::Yes, QMessageBox::Yes | QMessageBox::No, QMessageBox::Question,
          QMessageBox::Yes, QMessageBox::NoButton, Answer::No},
-        {Buttons::YesNoCancel, Icon::Critical, Answer::Cancel,
-         QMessageBox::Yes | QMessageBox::No | QMessageBox::Cancel, QMessageBox::Critical, QMessageBox::Cancel,
-         QMessageBox::No, Answer::No},
+        {Buttons::YesNoCancel, Icon::Critical, Answer::Cancel, QMessageBox::Yes | QMessageBox::No | QMessageBox::Cancel,
+         QMessageBox::Critical, QMessageBox::Cancel, QMessageBox::No, Answer::No},
         {Buttons::YesNoCancel, Icon::Question, Answer::Yes, QMessageBox::Yes | QMessageBox::No | QMessageBox::Cancel,
          QMessageBox::Question, QMessageBox::Yes, QMessageBox::NoButton, Answer::Cancel},
     };
