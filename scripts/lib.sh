@@ -5,7 +5,7 @@ QUILLMARK_ROOT="$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd)"
 
 # The packages every build needs; scripts add their own.
 QUILLMARK_PACKAGES=(cmake ninja-build g++ qt6-base-dev libcli11-dev nlohmann-json3-dev libgtest-dev libgmock-dev
-                    libgl-dev fonts-dejavu-core help2man desktop-file-utils libxml2-utils appstream)
+                    libgl-dev fonts-dejavu-core help2man desktop-file-utils libxml2-utils appstream clang-format)
 
 ensure_packages() {
     local missing=()
@@ -27,4 +27,21 @@ configure_and_build() {
     shift
     cmake -S "$QUILLMARK_ROOT" -B "$build_dir" -G Ninja "$@" >&2
     cmake --build "$build_dir" >&2
+}
+
+# cpp_files [find actions...]: every C++ source and header of the project.
+cpp_files() {
+    find "$QUILLMARK_ROOT/src" "$QUILLMARK_ROOT/tests" "$QUILLMARK_ROOT/bench" "$QUILLMARK_ROOT/fuzz" \
+        \( -name '*.cpp' -o -name '*.h' \) "$@"
+}
+
+# Fails with the files to format when any file is not formatted as .clang-format says.
+check_format() {
+    local unformatted
+    unformatted=$(cpp_files -exec clang-format --dry-run --Werror {} + 2>&1 | grep -o '^[^:]*\.\(cpp\|h\)' | sort -u || true)
+    if [ -n "$unformatted" ]; then
+        echo "These files are not formatted; run scripts/format:" >&2
+        echo "$unformatted" >&2
+        return 1
+    fi
 }

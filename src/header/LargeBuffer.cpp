@@ -6,7 +6,7 @@
 void AdviseLargeBuffer(void* buffer, std::size_t size)
 {
 #ifdef MADV_HUGEPAGE
-    constexpr std::uintptr_t LargePage = 2 * 1024 * 1024;
+    constexpr std::uintptr_t LargePage = std::uintptr_t{2} * 1024 * 1024;
     const auto start = reinterpret_cast<std::uintptr_t>(buffer);
     const auto alignedStart = (start + LargePage - 1) & ~(LargePage - 1);
     const auto alignedEnd = (start + size) & ~(LargePage - 1);

@@ -348,7 +348,9 @@ std::string ResolveLinks(const std::string& path)
         if (length < 0)
             return resolved;
         target.resize(static_cast<std::size_t>(length));
-        resolved = target.front() == '/' ? target : resolved.substr(0, resolved.rfind('/') + 1) + target;
+        if (target.empty() || target.front() != '/')
+            target.insert(0, resolved.substr(0, resolved.rfind('/') + 1));
+        resolved = std::move(target);
     }
     throw OsError(ELOOP, path);
 }

@@ -1,5 +1,7 @@
 #include "ListKinds.h"
 
+#include <iterator>
+
 #include "Text.h"
 
 namespace {

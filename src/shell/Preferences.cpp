@@ -6,16 +6,16 @@
 namespace {
 
 // A stored text, or empty when it is blank after trimming.
-std::string storedText(const SettingsStore& store, const char* key)
+std::string storedText(const SettingsStore& store, Setting setting)
 {
-    auto value = store.read(DefaultGroup, key, "");
+    auto value = store.read(DefaultGroup, SettingName(setting), "");
     return TrimBlanks(value).empty() ? std::string() : value;
 }
 
 // A stored choice: "True" or "Wahr" after trimming means on, a missing key too.
-bool storedChoice(const SettingsStore& store, const char* key)
+bool storedChoice(const SettingsStore& store, Setting setting)
 {
-    const auto value = store.read(DefaultGroup, key, "True");
+    const auto value = store.read(DefaultGroup, SettingName(setting), "True");
     const auto trimmed = TrimBlanks(value);
     return trimmed == "True" || trimmed == "Wahr";
 }
@@ -26,19 +26,19 @@ const char* choiceText(bool on) { return on ? "True" : "False"; }
 
 void LadeDefaults(Preferences& preferences, const SettingsStore& store)
 {
-    preferences.DefaultRealName = storedText(store, "RealName");
-    preferences.DefaultUserName = storedText(store, "UserName");
-    preferences.DefaultLicense = storedText(store, "Liscense");
+    preferences.DefaultRealName = storedText(store, Setting::RealName);
+    preferences.DefaultUserName = storedText(store, Setting::UserName);
+    preferences.DefaultLicense = storedText(store, Setting::License);
 }
 
-bool StoredBackupChoice(const SettingsStore& store) { return storedChoice(store, "Backup"); }
+bool StoredBackupChoice(const SettingsStore& store) { return storedChoice(store, Setting::Backup); }
 
-bool StoredDescriptionLimit(const SettingsStore& store) { return storedChoice(store, "DescriptionLimit"); }
+bool StoredDescriptionLimit(const SettingsStore& store) { return storedChoice(store, Setting::DescriptionLimit); }
 
 PreferencesForm OpenPreferencesForm(Preferences& preferences, const SettingsStore& store)
 {
-    PreferencesForm form{storedText(store, "RealName"), storedText(store, "UserName"), storedText(store, "Liscense"),
-                         StoredBackupChoice(store), StoredDescriptionLimit(store)};
+    PreferencesForm form{storedText(store, Setting::RealName), storedText(store, Setting::UserName),
+                         storedText(store, Setting::License), StoredBackupChoice(store), StoredDescriptionLimit(store)};
     if (!form.license.empty())
         preferences.DefaultLicense = form.license;
     preferences.MakeBackup = form.backup;
@@ -48,18 +48,21 @@ PreferencesForm OpenPreferencesForm(Preferences& preferences, const SettingsStor
 
 void SavePreferencesForm(const PreferencesForm& form, Preferences& preferences, SettingsStore& store)
 {
-    store.write(DefaultGroup, "RealName", std::string(TrimBlanks(form.realName)));
-    store.write(DefaultGroup, "UserName", std::string(TrimBlanks(form.userName)));
-    store.write(DefaultGroup, "Liscense", std::string(TrimBlanks(form.license)));
-    store.write(DefaultGroup, "Backup", choiceText(form.backup));
-    store.write(DefaultGroup, "DescriptionLimit", choiceText(form.descriptionLimit));
+    store.write(DefaultGroup, SettingName(Setting::RealName), std::string(TrimBlanks(form.realName)));
+    store.write(DefaultGroup, SettingName(Setting::UserName), std::string(TrimBlanks(form.userName)));
+    store.write(DefaultGroup, SettingName(Setting::License), std::string(TrimBlanks(form.license)));
+    store.write(DefaultGroup, SettingName(Setting::Backup), choiceText(form.backup));
+    store.write(DefaultGroup, SettingName(Setting::DescriptionLimit), choiceText(form.descriptionLimit));
     preferences.MakeBackup = form.backup;
     preferences.LimitDescription = form.descriptionLimit;
 }
 
 std::string StartFolder(const SettingsStore& store, const std::string& firstFolder)
 {
-    return store.read(DefaultGroup, "LastPath", firstFolder);
+    return store.read(DefaultGroup, SettingName(Setting::LastPath), firstFolder);
 }
 
-void StoreLastPath(SettingsStore& store, const std::string& folder) { store.write(DefaultGroup, "LastPath", folder); }
+void StoreLastPath(SettingsStore& store, const std::string& folder)
+{
+    store.write(DefaultGroup, SettingName(Setting::LastPath), folder);
+}

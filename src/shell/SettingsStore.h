@@ -1,5 +1,6 @@
 #pragma once
 
+#include <iterator>
 #include <optional>
 #include <string>
 #include <utility>
@@ -22,3 +23,16 @@ public:
 
 inline constexpr const char* DefaultGroup = "DEFAULT";
 inline constexpr const char* RecentFilesGroup = "Recent Files";
+
+// The settings of the "DEFAULT" group.
+enum class Setting { RealName, UserName, License, Backup, DescriptionLimit, LastPath };
+inline constexpr Setting AllSettings[] = {Setting::RealName, Setting::UserName,         Setting::License,
+                                          Setting::Backup,   Setting::DescriptionLimit, Setting::LastPath};
+
+// The names the settings file has always used for them ("Liscense" included: stored files rely on it).
+constexpr const char* SettingName(Setting setting)
+{
+    constexpr const char* names[] = {"RealName", "UserName", "Liscense", "Backup", "DescriptionLimit", "LastPath"};
+    static_assert(std::size(names) == std::size(AllSettings), "one name for each setting");
+    return names[static_cast<int>(setting)];
+}

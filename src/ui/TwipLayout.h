@@ -2,6 +2,7 @@
 
 #include <QWidget>
 #include <initializer_list>
+#include <variant>
 
 // The windows were laid out in twips; at 15 twips per pixel.
 constexpr int Pixels(int twips) { return twips / 15; }
@@ -31,6 +32,38 @@ Widget* PlaceCaptioned(QWidget* parent, const char* name, const char* caption, i
         widget->setText(caption);
     WidenToShowCaption(*widget);
     return widget;
+}
+
+// One control of a window's table: the member that holds it (its type says which control it
+// is), its name, its caption (nullptr for controls without one) and its place in twips.
+template <typename Window, typename... Widgets>
+struct ControlRow {
+    std::variant<Widgets * Window::*...> member;
+    const char* name;
+    const char* caption;
+    int left, top, width, height;
+};
+
+// Builds every control of rows (ControlRows of Window) on parent, each into its member of window.
+template <typename Window, typename Rows>
+void BuildControls(Window& window, QWidget* parent, const Rows& rows)
+{
+    for (const auto& row : rows)
+        std::visit(
+            [&](auto member) {
+                using Widget = std::remove_pointer_t<std::remove_reference_t<decltype(window.*member)>>;
+                constexpr bool captioned = requires(Widget * w) { w->setText(QString()); }
+                || requires(Widget * w) { w->setTitle(QString()); };
+                if constexpr (captioned) {
+                    if (row.caption != nullptr) {
+                        window.*member = PlaceCaptioned<Widget>(parent, row.name, row.caption, row.left, row.top,
+                                                                row.width, row.height);
+                        return;
+                    }
+                }
+                window.*member = PlaceChild<Widget>(parent, row.name, row.left, row.top, row.width, row.height);
+            },
+            row.member);
 }
 
 // The order in which Tab moves through the controls.

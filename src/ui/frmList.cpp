@@ -17,14 +17,19 @@ frmList::frmList(ListKind kind, const StringList& entries, const std::string& pr
     setWindowTitle(QString("List") + InfoOf(kind).captionSuffix);
     setModal(true);
     setFixedSize(Pixels(6645), Pixels(4155));
-    Frame1 = PlaceCaptioned<QGroupBox>(this, "Frame1", "Current Values", 120, 840, 4935, 3255);
-    lsValues = PlaceChild<QListWidget>(Frame1, "lsValues", 120, 240, 4695, 2790);
-    cmdChange = PlaceCaptioned<QPushButton>(this, "cmdChange", "Update", 5160, 480, 1335, 375);
-    cmdAdd = PlaceCaptioned<QPushButton>(this, "cmdAdd", "Add", 5160, 1200, 1335, 375);
-    cmdClose = PlaceCaptioned<QPushButton>(this, "cmdClose", "Close", 5160, 2160, 1335, 375);
+    using Row = ControlRow<frmList, QGroupBox, QListWidget, QPushButton, QLineEdit>;
+    static const Row rows[] = {
+        {&frmList::Frame1, "Frame1", "Current Values", 120, 840, 4935, 3255},
+        {&frmList::lsValues, "lsValues", nullptr, 120, 240, 4695, 2790}, // inside Frame1
+        {&frmList::cmdChange, "cmdChange", "Update", 5160, 480, 1335, 375},
+        {&frmList::cmdAdd, "cmdAdd", "Add", 5160, 1200, 1335, 375},
+        {&frmList::cmdClose, "cmdClose", "Close", 5160, 2160, 1335, 375},
+        {&frmList::txUpdate, "txUpdate", nullptr, 240, 480, 4695, 285},
+        {&frmList::cmdDelete, "cmdDelete", "Delete", 5160, 1680, 1335, 375},
+    };
+    BuildControls(*this, this, rows);
+    lsValues->setParent(Frame1); // its place is inside the frame
     cmdClose->setDefault(true);
-    txUpdate = PlaceChild<QLineEdit>(this, "txUpdate", 240, 480, 4695, 285);
-    cmdDelete = PlaceCaptioned<QPushButton>(this, "cmdDelete", "Delete", 5160, 1680, 1335, 375);
     ChainTabOrder({Frame1, lsValues, cmdChange, cmdAdd, cmdClose, txUpdate, cmdDelete});
 
     // Choosing an entry, by mouse or keyboard, copies its text into txUpdate.

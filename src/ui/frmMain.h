@@ -17,6 +17,7 @@ class QFrame;
 class QLabel;
 class QLineEdit;
 class QListWidget;
+class QMenu;
 class QPlainTextEdit;
 class QPushButton;
 class WindowProgress;
@@ -37,6 +38,7 @@ public:
 
     void MDateiOeffnen_Click();
     void MDateiSpeichern_Click();
+    void MDateiBeenden_Click() { close(); }
     void MTrackerCheck_Click();
     void OpenFile(const std::string& path);
     void MInfo_Click();
@@ -66,10 +68,9 @@ private:
     // Building the window.
     void createControls();
     void createMenus();
+    void addRecentFileItems(QMenu& menu);
     void setTabOrder();
     void connectHandlers();
-    QComboBox* fieldCombo(const char* name, int left, int top, int width, int height);
-    QPlainTextEdit* headerBox(const char* name, int left, int top, int width, int height);
 
     // Opening.
     bool saveWithChecks(); // the Save command's checks and save; true when saved
@@ -122,7 +123,10 @@ private:
     QLabel* Label1;
     QLineEdit* txPartDescription;
     QLabel* lblLength;
-    std::array<QLabel*, 4> Label2;
+    QLabel* Label2_0;
+    QLabel* Label2_1;
+    QLabel* Label2_2;
+    QLabel* Label2_3;
     QLineEdit* txFileName;
     QLabel* Label4;
     QLineEdit* txAuthorRealName;

@@ -206,7 +206,7 @@ SaveResult frmMain::checkHeaderAndSave()
     const SaveContext context{services_.dialogs,           services_.clock,
                               app_.Prefs.MakeBackup,       [this] { return newHeaderText_; },
                               [this] { MakeNewHeader(); }, app_.Prefs.LimitDescription};
-    const auto result = CheckHeaderAndSave(app_.Header, context);
+    auto result = CheckHeaderAndSave(app_.Header, context);
     if (result.outcome == SaveOutcome::DescriptionTooLong)
         showDescriptionTooLong();
     return result;

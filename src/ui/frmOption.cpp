@@ -14,18 +14,22 @@ frmOption::frmOption(const PreferencesForm& form, const QStringList& sortedLicen
     setWindowTitle("Preferences");
     setModal(true);
     setFixedSize(Pixels(7455), Pixels(2250));
-    Label1 = PlaceCaptioned<QLabel>(this, "Label1", "Your Real Name", 120, 240, 1215, 255);
-    txRealName = PlaceChild<QLineEdit>(this, "txRealName", 1560, 240, 4455, 285);
-    Label2_0 = PlaceCaptioned<QLabel>(this, "Label2_0", "Your Username", 120, 600, 1215, 255);
-    txUserName = PlaceChild<QLineEdit>(this, "txUserName", 1560, 600, 4455, 285);
-    cmdSave = PlaceCaptioned<QPushButton>(this, "cmdSave", "&Save", 6240, 240, 1095, 375);
+    using Row = ControlRow<frmOption, QLabel, QLineEdit, QPushButton, QComboBox, QCheckBox>;
+    static const Row rows[] = {
+        {&frmOption::Label1, "Label1", "Your Real Name", 120, 240, 1215, 255},
+        {&frmOption::txRealName, "txRealName", nullptr, 1560, 240, 4455, 285},
+        {&frmOption::Label2_0, "Label2_0", "Your Username", 120, 600, 1215, 255},
+        {&frmOption::txUserName, "txUserName", nullptr, 1560, 600, 4455, 285},
+        {&frmOption::cmdSave, "cmdSave", "&Save", 6240, 240, 1095, 375},
+        {&frmOption::cmdCancel, "cmdCancel", "&Cancel", 6240, 720, 1095, 375},
+        {&frmOption::cbLicenses, "cbLicenses", nullptr, 1560, 960, 4455, 315},
+        {&frmOption::Label2_3, "Label2_3", "Liscense Type:", 120, 960, 1335, 255},
+        {&frmOption::chkBackup, "chkBackup", "Backup file", 120, 1440, 1695, 255},
+        {&frmOption::chkDescriptionLimit, "chkDescriptionLimit", "Limit Part Description to 64 characters", 120, 1800,
+         4455, 255},
+    };
+    BuildControls(*this, this, rows);
     cmdSave->setDefault(true);
-    cmdCancel = PlaceCaptioned<QPushButton>(this, "cmdCancel", "&Cancel", 6240, 720, 1095, 375);
-    cbLicenses = PlaceChild<QComboBox>(this, "cbLicenses", 1560, 960, 4455, 315);
-    Label2_3 = PlaceCaptioned<QLabel>(this, "Label2_3", "Liscense Type:", 120, 960, 1335, 255);
-    chkBackup = PlaceCaptioned<QCheckBox>(this, "chkBackup", "Backup file", 120, 1440, 1695, 255);
-    chkDescriptionLimit = PlaceCaptioned<QCheckBox>(this, "chkDescriptionLimit",
-                                                    "Limit Part Description to 64 characters", 120, 1800, 4455, 255);
     ChainTabOrder({txRealName, txUserName, cmdSave, cmdCancel, cbLicenses, chkBackup, chkDescriptionLimit});
 
     txRealName->setText(QString::fromStdString(form.realName));
