@@ -4,7 +4,6 @@
 #include <map>
 #include <mutex>
 #include <nlohmann/json.hpp>
-#include <optional>
 #include <sstream>
 
 #include "Batch.h"
@@ -71,8 +70,9 @@ std::string findingLines(const std::string& path, const SaveFindings& findings, 
     for (const auto& [offered, what] : FixUpNames(findings.fixups))
         if (offered)
             lines += path + ": fix-up offered: " + what + '\n';
-    for (const auto& finding : tracker ? *tracker : TrackerFindings{})
-        lines += path + ": tracker " + LevelText(finding.level) + " " + finding.id + ": " + finding.text + '\n';
+    if (tracker != nullptr)
+        for (const auto& finding : *tracker)
+            lines += path + ": tracker " + LevelText(finding.level) + " " + finding.id + ": " + finding.text + '\n';
     return lines.empty() ? path + ": ok\n" : lines;
 }
 
@@ -181,15 +181,15 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
     return runBatch(arguments, batch, out, err, [&](const std::string& path) {
         return reportOn(path, {}, [&](HeaderData& header, ConsoleDialogs&, FileReport& report) {
             const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
-            std::optional<TrackerFindings> tracker;
+            TrackerFindings tracker; // empty unless asked for
             if (options.tracker)
                 tracker = CheckRecordForTracker(header, ComposeHeader(header), categories);
-            const auto* trackerFindings = tracker ? &*tracker : nullptr;
+            const auto* trackerFindings = options.tracker ? &tracker : nullptr;
             report.out = options.json ? checkJson(header, findings, trackerFindings)
                                       : findingLines(header.FilePath, findings, trackerFindings);
             noteFindings(report, findings);
             bool trackerRefuses = false;
-            for (const auto& finding : tracker.value_or(TrackerFindings{})) {
+            for (const auto& finding : tracker) {
                 report.trackerIds.push_back(finding.id);
                 trackerRefuses = trackerRefuses || finding.level == FindingLevel::Error;
             }

@@ -4,14 +4,14 @@
 #include <new>
 #include <sys/stat.h>
 
+#include "Text.h"
+
 namespace {
 
 bool folderOfPathExists(const std::string& path)
 {
-    const auto slash = path.rfind('/');
-    const std::string folder = slash == std::string::npos ? "." : (slash == 0 ? "/" : path.substr(0, slash));
     struct stat info {};
-    return ::stat(folder.c_str(), &info) == 0 && S_ISDIR(info.st_mode);
+    return ::stat(FolderOf(path).c_str(), &info) == 0 && S_ISDIR(info.st_mode);
 }
 
 } // namespace

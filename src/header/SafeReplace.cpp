@@ -14,6 +14,7 @@
 #include "FileDescriptor.h"
 #include "PartFile.h"
 #include "QmError.h"
+#include "Text.h"
 
 namespace {
 
@@ -23,14 +24,6 @@ constexpr std::string_view TemporaryPrefix = ".quillmark-save-";
 // The copy of a file that is rewritten in place; it outlives a save killed half-way through the
 // rewrite, as the one whole copy of the old bytes.
 constexpr std::string_view KeepPrefix = ".quillmark-keep-";
-
-std::string folderOf(const std::string& path)
-{
-    const auto slash = path.rfind('/');
-    if (slash == std::string::npos)
-        return ".";
-    return slash == 0 ? "/" : path.substr(0, slash);
-}
 
 std::string uniqueNameIn(const std::string& folder, std::string_view prefix)
 {
@@ -215,7 +208,7 @@ private:
 // system allows, the owner of original.
 void writeCopy(const std::string& path, std::string_view bytes, const struct stat& original)
 {
-    NewFile copy(folderOf(path), path);
+    NewFile copy(FolderOf(path), path);
     copy.write({bytes});
     if (!copy.takeOwnerAndModeOf(original))
         copy.setMode(original.st_mode & 07777);
@@ -277,7 +270,7 @@ void rewriteInPlace(const std::string& target, const struct stat& original,
                     const ReplaceStepHook& afterStep)
 {
     const FileBytes old(target);
-    const auto copyPath = backupPath ? *backupPath : uniqueNameIn(folderOf(target), KeepPrefix);
+    const auto copyPath = backupPath ? *backupPath : uniqueNameIn(FolderOf(target), KeepPrefix);
     writeCopy(copyPath, old.view(), original);
     Undo copy(copyPath);
     reach(afterStep, ReplaceStep::BackupMade);
@@ -302,7 +295,7 @@ bool replaceByRename(const std::string& target, const struct stat* original,
                      std::initializer_list<std::string_view> pieces, const std::optional<std::string>& backupPath,
                      const ReplaceStepHook& afterStep)
 {
-    NewFile file(folderOf(target), target);
+    NewFile file(FolderOf(target), target);
     file.write(pieces);
     if (original == nullptr)
         file.setMode(modeForNewFile());
@@ -326,7 +319,7 @@ bool replaceByRename(const std::string& target, const struct stat* original,
 // "models/../real.dat" as "/home/ann/real.dat", so that the backup's name reads plainly.
 std::string withCanonicalFolder(const std::string& path)
 {
-    char* folder = ::realpath(folderOf(path).c_str(), nullptr);
+    char* folder = ::realpath(FolderOf(path).c_str(), nullptr);
     if (folder == nullptr)
         return path;
     std::string canonical(folder);
@@ -363,7 +356,7 @@ void ReplaceFileSafely(const std::string& path, std::initializer_list<std::strin
     const bool exists = ::stat(target.c_str(), &original) == 0;
     if (exists)
         checkWritable(target, original);
-    const auto folder = folderOf(target);
+    const auto folder = FolderOf(target);
     removeStaleTemporaries(folder);
     const bool keepInode = exists && original.st_nlink > 1;
     if (keepInode || !replaceByRename(target, exists ? &original : nullptr, pieces, backupPath, afterStep))

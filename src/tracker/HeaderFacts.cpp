@@ -13,8 +13,6 @@ QString valueAfter(const QString& line, const QString& keyword)
     return line.mid(start.size()).trimmed();
 }
 
-QString collapseBlanks(const QString& text) { return text.simplified(); }
-
 void takeTypeLine(HeaderFacts& facts, const QString& value)
 {
     const auto words = value.split(' ', Qt::SkipEmptyParts);
@@ -46,7 +44,7 @@ void takeHeaderLine(HeaderFacts& facts, const QString& line, QString& firstCateg
         takeTypeLine(facts, v);
     } else if (v = valueAfter(line, "!LICENSE"); !v.isNull()) {
         facts.hasLicense = true;
-        facts.license = collapseBlanks(v);
+        facts.license = v.simplified(); // runs of blanks collapsed
     } else if (v = valueAfter(line, "!CATEGORY"); !v.isNull()) {
         if (firstCategory.isNull())
             firstCategory = v;
