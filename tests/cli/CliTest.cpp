@@ -153,8 +153,8 @@ TEST(CliBatch, ManyThreadsWriteWhatOneThreadWrites)
 {
     if (CorpusPartFiles().empty())
         GTEST_SKIP() << "no corpus folder beside the project";
-    const auto one = RunCliWith({"check", "--json", "-j", "1", QUILLMARK_CORPUS_DIR});
-    const auto many = RunCliWith({"check", "--json", "-j", "7", QUILLMARK_CORPUS_DIR});
+    const auto one = RunCliWith({"check", "--json", "--tracker", "-j", "1", QUILLMARK_CORPUS_DIR});
+    const auto many = RunCliWith({"check", "--json", "--tracker", "-j", "7", QUILLMARK_CORPUS_DIR});
     EXPECT_EQ(one.out, many.out);
     EXPECT_EQ(one.err, many.err);
     EXPECT_EQ(lineCount(one.out), CorpusPartFiles().size());

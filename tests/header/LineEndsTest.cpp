@@ -2,7 +2,6 @@
 
 #include <sys/stat.h>
 
-#include "LineEnds.h"
 #include "LineReader.h"
 #include "ParseProgress.h"
 #include "Parser.h"
@@ -33,22 +32,6 @@ TEST(LineReader, EndsLinesAtCrLfAndLoneCrOnly)
     EXPECT_EQ(readLines(std::string("a\0b\r\n", 5)), (Lines{std::string("a\0b", 3)}));
 }
 
-TEST(LineEnds, UnixFileIsRecognisedByItsFirstLine)
-{
-    EXPECT_TRUE(IsUnixLineEnd("0 a\n0 b\n"));
-    EXPECT_FALSE(IsUnixLineEnd("0 a\r\n0 b\n"));
-    EXPECT_TRUE(IsUnixLineEnd("0 a\n0 b\r\n"));
-    EXPECT_FALSE(IsUnixLineEnd("0 a"));
-    EXPECT_FALSE(IsUnixLineEnd(""));
-}
-
-TEST(LineEnds, LfToCrLfLeavesExistingCrLfAlone)
-{
-    EXPECT_EQ(LfToCrLf("a\nb\r\nc\n"), "a\r\nb\r\nc\r\n");
-    EXPECT_EQ(LfToCrLf("\n\n"), "\r\n\r\n");
-    EXPECT_EQ(LfToCrLf("a\rb"), "a\rb");
-}
-
 class PartFileParse : public ::testing::Test {
 protected:
     HeaderData open(const std::string& bytes)
@@ -75,22 +58,20 @@ TEST_F(PartFileParse, LfOnlyFileIsConvertedInMemoryOnly)
     EXPECT_EQ(ReadBytes(header.FilePath), bytes);
 }
 
-TEST_F(PartFileParse, MixedFileWithCrLfFirstLineKeepsLoneLfInsideLines)
+// The first line decides: a file whose first line ends in LF alone is converted to CR LF as a
+// whole; otherwise a lone LF stays inside its line and CR alone ends a line.
+TEST_F(PartFileParse, TheFirstLineEndDecidesHowTheFileIsRead)
 {
-    const auto h = open("0 Brick\r\n0 // Inner\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat\r\n");
-    EXPECT_EQ(h.Comments, (StringList{"// Inner\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat"}));
-}
-
-TEST_F(PartFileParse, MixedFileWithLfFirstLineIsConvertedWithoutExtraLines)
-{
-    const auto h = open("0 Brick\n0 Name: a.dat\r\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat\r\n2 24 0 0 0 1 1 1\n");
-    EXPECT_EQ(h.Body, "1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat\r\n2 24 0 0 0 1 1 1\r\n");
-}
-
-TEST_F(PartFileParse, NoFinalLineEndAndLoneCr)
-{
+    const std::string line = "1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat";
+    EXPECT_EQ(open("0 Brick\r\n0 // Inner\n" + line + "\r\n").Comments, (StringList{"// Inner\n" + line}));
+    EXPECT_EQ(open("0 Brick\n0 Name: a.dat\r\n" + line + "\r\n2 24 0 0 0 1 1 1\n").Body,
+              line + "\r\n2 24 0 0 0 1 1 1\r\n");
     EXPECT_EQ(open("0 Brick\r0 Name: b.dat\r1 x").Body, "1 x");
     EXPECT_EQ(header.PartName, "b.dat");
+    for (const auto* lineEndsOnly : {"\r\n\r\n\r", "\n\n"}) {
+        EXPECT_EQ(open(lineEndsOnly).OldHeader, "");
+        EXPECT_EQ(header.Body, "");
+    }
 }
 
 TEST_F(PartFileParse, EmptyFileGivesEmptyRecordAndTheLineEndCheckReport)
@@ -101,16 +82,6 @@ TEST_F(PartFileParse, EmptyFileGivesEmptyRecordAndTheLineEndCheckReport)
     ASSERT_EQ(dialogs.messages.size(), 1u);
     EXPECT_EQ(dialogs.messages[0].text,
               "Error 62 (Input past end of file) in procedure IsUnixLineEnd of Modul modUNIX");
-}
-
-TEST_F(PartFileParse, FileOfLineEndsOnly)
-{
-    auto h = open("\r\n\r\n\r");
-    EXPECT_EQ(h.PartDescription, "");
-    EXPECT_EQ(h.Body, "");
-    h = open("\n\n");
-    EXPECT_EQ(h.OldHeader, "");
-    EXPECT_EQ(h.Body, "");
 }
 
 TEST_F(PartFileParse, MissingFileIsReportedByTheLineEndCheckAndAsNotFound)
@@ -126,15 +97,7 @@ TEST_F(PartFileParse, MissingFileIsReportedByTheLineEndCheckAndAsNotFound)
         ASSERT_EQ(dialogs.messages.size(), 2u);
         EXPECT_EQ(dialogs.messages[0].text, report + " in procedure IsUnixLineEnd of Modul modUNIX");
         EXPECT_EQ(dialogs.messages[1].text, "File " + header.FilePath + " not found!");
-        EXPECT_EQ(dialogs.messages[1].title, "Error");
-        EXPECT_EQ(dialogs.messages[1].icon, Icon::Exclamation);
     }
-}
-
-TEST_F(PartFileParse, EmptyPathDoesNothing)
-{
-    GetGlobalContent(header, dialogs, progress);
-    EXPECT_TRUE(dialogs.messages.empty());
 }
 
 } // namespace

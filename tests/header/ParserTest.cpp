@@ -6,17 +6,22 @@
 
 namespace {
 
+HeaderData parseText(const std::string& text)
+{
+    HeaderData header;
+    ScriptedDialogs dialogs;
+    ParseProgress progress;
+    ParsePartFileContent(header, text, dialogs, progress);
+    return header;
+}
+
 // Parses lines joined by CR LF, as a CR LF part file holds them.
 HeaderData parseLines(std::initializer_list<std::string> lines)
 {
     std::string text;
     for (const auto& line : lines)
         text += line + "\r\n";
-    HeaderData header;
-    ScriptedDialogs dialogs;
-    ParseProgress progress;
-    ParsePartFileContent(header, text, dialogs, progress);
-    return header;
+    return parseText(text);
 }
 
 TEST(ParserDescription, FirstLineWithoutItsZeroIsTheDescription)
@@ -26,13 +31,9 @@ TEST(ParserDescription, FirstLineWithoutItsZeroIsTheDescription)
     EXPECT_EQ(parseLines({"0"}).PartDescription, "");
     EXPECT_EQ(parseLines({"0 "}).PartDescription, "");
     EXPECT_EQ(parseLines({"0 Name: 3001.dat"}).PartDescription, "Name: 3001.dat");
-}
-
-TEST(ParserDescription, EmptyFirstLineMeansNoDescription)
-{
-    const auto h = parseLines({"", "0 Brick 2 x 4"});
-    EXPECT_EQ(h.PartDescription, "");
-    EXPECT_EQ(h.Body, "0 Brick 2 x 4");
+    const auto emptyFirstLine = parseLines({"", "0 Brick 2 x 4"});
+    EXPECT_EQ(emptyFirstLine.PartDescription, "");
+    EXPECT_EQ(emptyFirstLine.Body, "0 Brick 2 x 4");
 }
 
 TEST(ParserDescription, NeedsWorkInAnyCaseAndOrder)
@@ -179,35 +180,20 @@ TEST(ParserBlanks, EmptyWordsAndLeadingBlanks)
     EXPECT_EQ(h.Body, "0\tBFC CERTIFY CCW");
 }
 
-TEST(ParserEndOfHeader, BodyTrimsLinesAndKeepsInnerEmptyLines)
+TEST(ParserEndOfHeader, BodyLinesAreTrimmedAndJoinedByCrLfKeepingInnerEmptyLines)
 {
     const auto h =
         parseLines({"0 d", "", "0 FOO bar", "   1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat   ", "", "2 24 0 0 0 1 1 1"});
     EXPECT_EQ(h.Body, "0 FOO bar\r\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat\r\n\r\n2 24 0 0 0 1 1 1");
     EXPECT_EQ(h.OldHeader, "0 d\r\n0 FOO bar");
-}
-
-TEST(ParserEndOfHeader, BodyLinesAreJoinedByCrLfWhateverTheirLineEnds)
-{
-    HeaderData h;
-    ScriptedDialogs dialogs;
-    ParseProgress progress;
-    ParsePartFileContent(h, "0 d\r\n1 a\r\n 2 b \r\n3 c\r4 d\r\n\r\n  \r\n5 e", dialogs, progress);
-    EXPECT_EQ(h.Body, "1 a\r\n2 b\r\n3 c\r\n4 d\r\n\r\n\r\n5 e");
-    ParsePartFileContent(h, "0 d\r\n \r\n\r\n1 a\r\n", dialogs, progress);
-    EXPECT_EQ(h.Body, "1 a");
-}
-
-TEST(ParserEndOfHeader, EmptyLinesBeforeAnyBodyAddNothing)
-{
-    const auto h = parseLines({"1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat"});
-    EXPECT_EQ(h.Body, "1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat");
-    EXPECT_EQ(h.PartDescription, "");
-    HeaderData blankBody;
-    ScriptedDialogs dialogs;
-    ParseProgress progress;
-    ParsePartFileContent(blankBody, "0 d\r\n   \r\n", dialogs, progress);
-    EXPECT_EQ(blankBody.Body, "");
+    EXPECT_EQ(parseText("0 d\r\n1 a\r\n 2 b \r\n3 c\r4 d\r\n\r\n  \r\n5 e").Body,
+              "1 a\r\n2 b\r\n3 c\r\n4 d\r\n\r\n\r\n5 e");
+    // Empty lines before any body line add nothing.
+    EXPECT_EQ(parseText("0 d\r\n \r\n\r\n1 a\r\n").Body, "1 a");
+    EXPECT_EQ(parseText("0 d\r\n   \r\n").Body, "");
+    const auto noHeader = parseLines({"1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat"});
+    EXPECT_EQ(noHeader.Body, "1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat");
+    EXPECT_EQ(noHeader.PartDescription, "");
 }
 
 TEST(ParserRecord, ASecondParseStartsFromEmptyLists)

@@ -17,23 +17,6 @@ TEST(ListFiles, OneEntryPerLineExactlyAsRead)
     EXPECT_EQ(ReadListFile(dir.write("e.txt", "")), StringList{});
 }
 
-TEST(ListFiles, LoadersReadTheProgramFolder)
-{
-    TempDir dir;
-    dir.write("category.txt", "<none>\r\nBrick\r\n");
-    dir.write("parttype.txt", "Part\r\n");
-    dir.write("bfc.txt", "CERTIFY CCW\r\n");
-    dir.write("licenses.txt", "L1\r\nL2\r\n");
-    ScriptedDialogs dialogs;
-    StandardLists lists;
-    LoadStandardLists(lists, dir.path().string(), dialogs);
-    EXPECT_EQ(EntriesOf(lists, ListKind::Category), (StringList{"<none>", "Brick"}));
-    EXPECT_EQ(lists.Categories.Item(2).Description, "Brick");
-    EXPECT_EQ(lists.PartTypes, (StringList{"Part"}));
-    EXPECT_EQ(lists.BfcStatements, (StringList{"CERTIFY CCW"}));
-    EXPECT_EQ(lists.Licenses, (StringList{"L1", "L2"}));
-}
-
 TEST(ListFiles, MissingFileIsReportedAndGivesAnEmptyList)
 {
     TempDir dir;

@@ -31,18 +31,6 @@ TEST_F(PreferencesStore, ChoicesAreOnWhenMissingAndOnlyForTrueOrWahr)
     }
 }
 
-TEST_F(PreferencesStore, SavingTrimsTheTexts)
-{
-    SavePreferencesForm({"  Jane Doe ", " jdoe", "L ", false, false}, preferences, store);
-    EXPECT_EQ(store.read(DefaultGroup, "RealName", ""), "Jane Doe");
-    EXPECT_EQ(store.read(DefaultGroup, "UserName", ""), "jdoe");
-    EXPECT_EQ(store.read(DefaultGroup, "Liscense", ""), "L");
-    EXPECT_EQ(store.read(DefaultGroup, "Backup", ""), "False");
-    EXPECT_EQ(store.read(DefaultGroup, "DescriptionLimit", ""), "False");
-    EXPECT_FALSE(preferences.MakeBackup);
-    EXPECT_FALSE(preferences.LimitDescription);
-}
-
 TEST_F(PreferencesStore, LadeDefaultsTakesTheStoredValuesAndBlankAsEmpty)
 {
     store.write(DefaultGroup, "RealName", "Jane");
@@ -55,14 +43,6 @@ TEST_F(PreferencesStore, LadeDefaultsTakesTheStoredValuesAndBlankAsEmpty)
     SavePreferencesForm({"", "", "", true}, preferences, store);
     LadeDefaults(preferences, store);
     EXPECT_EQ(preferences.DefaultRealName, "") << "a name cleared in the preferences is gone";
-}
-
-TEST_F(PreferencesStore, StoredLicenceBecomesTheDefaultWhenTheWindowOpens)
-{
-    store.write(DefaultGroup, "Liscense", "Not in any list");
-    const auto form = OpenPreferencesForm(preferences, store);
-    EXPECT_EQ(form.license, "Not in any list");
-    EXPECT_EQ(preferences.DefaultLicense, "Not in any list");
 }
 
 TEST_F(PreferencesStore, LastPathOrTheProgramFolder)

@@ -3,8 +3,6 @@
 
 #include <set>
 
-#include "Corpus.h"
-#include "TempDir.h"
 #include "TrackerCheck.h"
 
 namespace {
@@ -124,41 +122,6 @@ TEST(TrackerRules, HistoryPreviewAndSelfReference)
               Ids{"warning.previewinvalid"});
     EXPECT_EQ(idsOf(cleanPart("Brick", "3001.dat", "Part", "1 16 0 0 0 1 0 0 0 1 0 0 0 1 3001.DAT\r\n")),
               Ids{"circularreference"});
-}
-
-TEST(TrackerRules, EveryCorpusFileGivesOnlyKnownIds)
-{
-    const auto files = CorpusPartFiles();
-    if (files.empty())
-        GTEST_SKIP() << "no corpus folder beside the project";
-    const Ids known = {"missing",
-                       "license.approved",
-                       "type.phycolor",
-                       "category.invalid",
-                       "history.invalid",
-                       "name.invalidchars",
-                       "name.xparts",
-                       "type.path",
-                       "description.invalidchars",
-                       "description.subpartdesc",
-                       "description.movedorobsolete",
-                       "description.aliasdesc",
-                       "description.thirdpartydesc",
-                       "description.patternword",
-                       "keywords.patternset",
-                       "type.alias",
-                       "type.flex",
-                       "name.flex",
-                       "bfc",
-                       "obsoleteimproper",
-                       "circularreference",
-                       "warning.previewinvalid",
-                       "warning.descriptionnumbers",
-                       "warning.minifigcategory",
-                       "name.filename"};
-    for (const auto& file : files)
-        for (const auto& id : idsOf(ReadBytes(file.string()), file.filename().string()))
-            EXPECT_TRUE(known.count(id)) << id << " in " << file;
 }
 
 } // namespace
