@@ -1,6 +1,5 @@
 #pragma once
 
-#include <cstddef>
 #include <string>
 #include <vector>
 
@@ -10,13 +9,10 @@ struct clsCategory {
     std::string Description;
 };
 
-// The ordered collection of categories, numbered from 1.
+// The ordered collection of categories, in the order of the list file.
 class colCategory {
 public:
     clsCategory& Add(const std::string& Key, const std::string& Description);
-    // Throws QmError 9 when there is no such entry.
-    const clsCategory& Item(std::size_t position) const;
-    std::size_t Count() const { return entries_.size(); }
 
     auto begin() const { return entries_.begin(); }
     auto end() const { return entries_.end(); }

@@ -26,8 +26,6 @@ ListEditor::ListEditor(ListKind kind, const StringList& entries, std::string pro
 {
 }
 
-std::string ListEditor::ListMode() const { return InfoOf(kind_).modeKey; }
-
 void ListEditor::select(std::optional<std::size_t> row)
 {
     selected_ = row && *row < entries_.size() ? row : std::nullopt;

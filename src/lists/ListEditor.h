@@ -15,7 +15,6 @@ class ListEditor {
 public:
     ListEditor(ListKind kind, const StringList& entries, std::string programFolder, Dialogs& dialogs);
 
-    std::string ListMode() const;
     bool ListChanged() const { return changed_; }
     const StringList& entries() const { return entries_; }
     std::optional<std::size_t> selected() const { return selected_; }

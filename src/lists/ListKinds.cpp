@@ -7,11 +7,10 @@
 namespace {
 
 const ListKindInfo Infos[] = {
-    {"CATEGORY", "category.txt", " Category", "Please enter the new category", "New Category", "LoadCategories"},
-    {"PARTTYPE", "parttype.txt", " Part Types", "Please enter the new part type", "New Part Type", "LoadPartTypes"},
-    {"BFC", "bfc.txt", " BFC", "Please enter the new BFC Statement", "New BFC Statement", "LoadBFC"},
-    {"LICENSE", "licenses.txt", " License Types", "Please enter the new license type", "New License Type",
-     "LoadLicense"},
+    {"category.txt", " Category", "Please enter the new category", "New Category", "LoadCategories"},
+    {"parttype.txt", " Part Types", "Please enter the new part type", "New Part Type", "LoadPartTypes"},
+    {"bfc.txt", " BFC", "Please enter the new BFC Statement", "New BFC Statement", "LoadBFC"},
+    {"licenses.txt", " License Types", "Please enter the new license type", "New License Type", "LoadLicense"},
 };
 
 // "technic BEAM" becomes "Technic Beam": official categories have a capital on every word.

@@ -7,7 +7,6 @@ enum class ListKind { Category, PartType, Bfc, License };
 inline constexpr ListKind AllListKinds[] = {ListKind::Category, ListKind::PartType, ListKind::Bfc, ListKind::License};
 
 struct ListKindInfo {
-    const char* modeKey;       // ListMode: "CATEGORY", "PARTTYPE", "BFC", "LICENSE"
     const char* fileName;      // in the list folder
     const char* captionSuffix; // appended to the list dialog's caption "List"
     const char* addPrompt;
