@@ -49,7 +49,6 @@ TEST(RemoveDescriptionTabs, RemovesTabsAfterTellingTheUser)
     EXPECT_EQ(h.PartDescription, "Brick2 x 4");
     ASSERT_EQ(dialogs.messages.size(), 1u);
     EXPECT_EQ(dialogs.messages[0].text, "A TAB character was found in the Part Description and will be deleted");
-    EXPECT_EQ(dialogs.messages[0].icon, Icon::Information);
     EXPECT_FALSE(RemoveDescriptionTabs(h, dialogs));
 }
 

@@ -2,35 +2,12 @@
 
 #include <sys/stat.h>
 
-#include "LineReader.h"
 #include "ParseProgress.h"
 #include "Parser.h"
 #include "ScriptedDialogs.h"
 #include "TempDir.h"
 
 namespace {
-
-std::vector<std::string> readLines(std::string_view text)
-{
-    std::vector<std::string> lines;
-    LineReader reader(text);
-    while (!reader.atEnd())
-        lines.emplace_back(reader.nextLine());
-    return lines;
-}
-
-using Lines = std::vector<std::string>;
-
-TEST(LineReader, EndsLinesAtCrLfAndLoneCrOnly)
-{
-    EXPECT_EQ(readLines("a\r\nb\rc"), (Lines{"a", "b", "c"}));
-    EXPECT_EQ(readLines("a\nb\r\n"), (Lines{"a\nb"}));
-    EXPECT_EQ(readLines("a\r\n\r\n"), (Lines{"a", ""}));
-    EXPECT_EQ(readLines("a\r\r\n"), (Lines{"a", ""}));
-    EXPECT_EQ(readLines(""), Lines{});
-    EXPECT_EQ(readLines("\r\n"), (Lines{""}));
-    EXPECT_EQ(readLines(std::string("a\0b\r\n", 5)), (Lines{std::string("a\0b", 3)}));
-}
 
 class PartFileParse : public ::testing::Test {
 protected:

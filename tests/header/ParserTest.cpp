@@ -51,12 +51,6 @@ TEST(ParserRows, NameIsWordThreeLowerCased)
     EXPECT_EQ(parseLines({"0 d", "0 Name: my part.dat"}).PartName, "my");
 }
 
-TEST(ParserRows, CategoryKeepsAllItsWords)
-{
-    EXPECT_EQ(parseLines({"0 d", "0 !CATEGORY Minifig Accessory"}).Category, "Minifig Accessory");
-    EXPECT_EQ(parseLines({"0 d", "0 CATEGORY Brick"}).Category, "Brick");
-}
-
 TEST(ParserRows, AuthorNameAndUserName)
 {
     auto h = parseLines({"0 d", "0 Author: Jane Doe [jdoe]"});
@@ -114,9 +108,11 @@ TEST(ParserRows, PartTypeAndUpdateTag)
 TEST(ParserRows, ListLinesKeepTheirWordsJoined)
 {
     const auto h = parseLines({"0 d", "0 !KEYWORDS a,  b", "0 KEYWORDS c", "0 !HELP  x", "0 !CMDLINE -c4",
+                               "0 !CATEGORY Minifig Accessory",
                                "0 !LICENSE Redistributable under CCAL version 2.0 : see CAreadme.txt",
                                "0 !HISTORY 12.3.2004 text", "0 COLOR 4  red"});
     EXPECT_EQ(h.Keywords, (StringList{"a,  b", "c"}));
+    EXPECT_EQ(h.Category, "Minifig Accessory");
     EXPECT_EQ(h.HelpLines, (StringList{"x"}));
     EXPECT_EQ(h.CmdLines, (StringList{"-c4"}));
     EXPECT_EQ(h.License, "Redistributable under CCAL version 2.0 : see CAreadme.txt");
@@ -136,7 +132,7 @@ TEST(ParserRows, CommentsAndDatedLines)
 TEST(ParserRows, FormsThatAreNotKeywordsStayInTheBody)
 {
     const auto h = parseLines(
-        {"0 d", "0 HELP me", "0 Category Brick", "0 !COLOR x y", "0 ROTATION CENTER 0 0 0", "0 !CATEGORY Brick"});
+        {"0 d", "0 HELP me", "0 Category Brick", "0 !COLOR x y", "0 ROTATION CENTER 0 0 0", "0 CATEGORY Brick"});
     EXPECT_EQ(h.Body, "0 HELP me\r\n0 Category Brick\r\n0 !COLOR x y\r\n0 ROTATION CENTER 0 0 0");
     EXPECT_EQ(h.Category, "Brick");
 }

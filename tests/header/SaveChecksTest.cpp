@@ -132,13 +132,13 @@ TEST_F(SaveChecks, MissingUserNameQuestion)
     EXPECT_EQ(dialogs.messages.back().text, "You need to set the BFC type!" + NotPossible);
 }
 
-TEST_F(SaveChecks, FixUpQuestionsInOrderAndYesCorrectsExactCaseOnly)
+TEST_F(SaveChecks, FixUpQuestionsInOrderAndYesCorrectsExactCaseOnlyNoNothing)
 {
     h.Body = "0 BFC CERTIFY INVERTNEXT\r\n0 bfc certify invertnext\r\n0 ROTATION CENTER 0 0 0\r\n"
              "0 // see 0 ROTATION 1 0 0 90\r\n0 WRITE Hello\r\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat";
     h.ColorLines = {"0 COLOR 4 red"};
-    for (int i = 0; i < 4; ++i)
-        dialogs.expectMessage(Answer::Yes);
+    for (const auto answer : {Answer::Yes, Answer::Yes, Answer::No, Answer::Yes})
+        dialogs.expectMessage(answer);
     EXPECT_EQ(save().outcome, SaveOutcome::Saved);
     ASSERT_EQ(dialogs.messages.size(), 4u);
     EXPECT_EQ(dialogs.messages[0].title, "BFC CERTIFY INVERTNEXT");
@@ -150,22 +150,10 @@ TEST_F(SaveChecks, FixUpQuestionsInOrderAndYesCorrectsExactCaseOnly)
     EXPECT_EQ(dialogs.messages[3].title, "COLOR Entry");
     EXPECT_EQ(dialogs.messages[3].text, "Should the COLOR Entry be deleted?");
     EXPECT_EQ(h.Body, "0 BFC INVERTNEXT\r\n0 bfc certify invertnext\r\n0 // see 0 ROTATION 1 0 0 90\r\n"
-                      "0 Hello\r\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat");
+                      "0 WRITE Hello\r\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat");
     EXPECT_TRUE(h.ColorLines.empty());
     EXPECT_EQ(recomposed, 1);
     EXPECT_EQ(saved().find("COLOR"), std::string::npos);
-}
-
-TEST_F(SaveChecks, NoToEveryFixUpStillSaves)
-{
-    h.Body = "0 rotation x \r\n0 write y ";
-    h.ColorLines = {"0 COLOR 4 red"};
-    for (int i = 0; i < 3; ++i)
-        dialogs.expectMessage(Answer::No);
-    EXPECT_EQ(save().outcome, SaveOutcome::Saved);
-    EXPECT_EQ(dialogs.messages.size(), 3u);
-    EXPECT_EQ(h.Body, "0 rotation x \r\n0 write y ");
-    EXPECT_NE(saved().find("0 COLOR 4 red"), std::string::npos);
 }
 
 } // namespace

@@ -19,7 +19,7 @@ std::string failNext;
 int failErrno = EIO;
 
 template <typename Real, typename... Args>
-int intercept(const char* name, Real* real, Args... args)
+auto intercept(const char* name, Real* real, Args... args) -> decltype(real(args...))
 {
     calls.emplace_back(name);
     if (failNext == name) {
@@ -40,6 +40,14 @@ Function* realFunction(const char* name)
 
 extern "C" {
 int fsync(int fd) { return intercept("fsync", realFunction<int(int)>("fsync"), fd); }
+ssize_t write(int fd, const void* bytes, size_t size)
+{
+    return intercept("write", realFunction<ssize_t(int, const void*, size_t)>("write"), fd, bytes, size);
+}
+int ftruncate(int fd, off_t size) noexcept
+{
+    return intercept("ftruncate", realFunction<int(int, off_t)>("ftruncate"), fd, size);
+}
 int close(int fd) { return intercept("close", realFunction<int(int)>("close"), fd); }
 int fchmod(int fd, mode_t mode) noexcept
 {
@@ -68,6 +76,18 @@ const std::string NewBytes = "0 new\r\n";
 class SaveFaults : public ::testing::Test {
 protected:
     ~SaveFaults() override { failNext.clear(); }
+    // The number of the error a save reports when step fails with error, 0 when it succeeds.
+    int failureNumber(const char* step, int error, bool withBackup)
+    {
+        failNext = step;
+        failErrno = error;
+        try {
+            ReplaceFileSafely(path, {NewBytes}, withBackup ? std::optional(backup) : std::nullopt);
+            return 0;
+        } catch (const QmError& failure) {
+            return failure.number();
+        }
+    }
     TempDir dir;
     const std::string path = dir.write("3001.dat", OldBytes);
     const std::string backup = dir.file("3001_Backup.dat");
@@ -87,19 +107,24 @@ TEST_F(SaveFaults, TheNewTextIsOnDiskBeforeItTakesTheNameAndTheFolderAfter)
 
 TEST_F(SaveFaults, AFailingStepKeepsTheOldFileAndLeavesNothingBehind)
 {
-    for (const char* step : {"fchmod", "fsync", "linkat", "close", "rename", "link"}) {
+    for (const char* step : {"write", "fchmod", "fsync", "linkat", "close", "rename", "link"}) {
         for (const bool withBackup : {false, true}) {
             if (std::string(step) == "link" && !withBackup)
-                continue; // only the backup is made by link
-            failNext = step;
-            failErrno = EIO;
-            EXPECT_THROW(ReplaceFileSafely(path, {NewBytes}, withBackup ? std::optional(backup) : std::nullopt),
-                         QmError)
-                << step;
+                continue;                                                   // only the backup is made by link
+            EXPECT_EQ(failureNumber(step, ENOSPC, withBackup), 61) << step; // "Disk full"
             EXPECT_EQ(ReadBytes(path), OldBytes) << step;
             EXPECT_EQ(NamesIn(dir.path()), std::set<std::string>{"3001.dat"}) << step << " " << withBackup;
         }
     }
+}
+
+// A file with a second name is rewritten in place: when that fails, its old bytes come back.
+TEST_F(SaveFaults, AFailedRewriteInPlaceBringsBackTheOldBytes)
+{
+    std::filesystem::create_hard_link(path, dir.file("second.dat"));
+    EXPECT_EQ(failureNumber("ftruncate", EROFS, false), 70);
+    EXPECT_EQ(ReadBytes(dir.file("second.dat")), OldBytes);
+    EXPECT_EQ(NamesIn(dir.path()), (std::set<std::string>{"3001.dat", "second.dat"}));
 }
 
 TEST_F(SaveFaults, ABackupThatCannotBeASecondNameIsACopy)

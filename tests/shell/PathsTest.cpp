@@ -19,16 +19,4 @@ TEST(PathHelpers, NameAndFolder)
     EXPECT_TRUE(dialogs.messages.empty());
 }
 
-TEST(PathHelpers, BlankPathHasNoNameAndIsReported)
-{
-    ScriptedDialogs dialogs;
-    dialogs.expectMessage(Answer::Ok);
-    EXPECT_EQ(DateiNurName(" ", dialogs), "");
-    ASSERT_EQ(dialogs.messages.size(), 1u);
-    EXPECT_EQ(dialogs.messages[0].text,
-              "Error 9 (Subscript out of range) in procedure DateiNurName of Modul modFunctions");
-    EXPECT_EQ(dialogs.messages[0].title, "Quillmark");
-    EXPECT_EQ(DateiNurPfad(""), "");
-}
-
 } // namespace

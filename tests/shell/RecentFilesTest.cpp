@@ -55,12 +55,4 @@ TEST_F(RecentFiles, DifferentlyWrittenPathsAreDifferentEntries)
     EXPECT_EQ(shown().size(), 3u);
 }
 
-TEST_F(RecentFiles, EmptyFirstEntryShowsNothing)
-{
-    store.write(RecentFilesGroup, "RecentFile1", "");
-    store.write(RecentFilesGroup, "RecentFile2", "/p/b.dat");
-    ShowRecentFiles(menu, store);
-    EXPECT_TRUE(shown().empty());
-}
-
 } // namespace

@@ -33,9 +33,7 @@ TEST_F(WindowTest, StartsWithDisabledControlsAndEmptyLists)
     EXPECT_TRUE(child<QWidget>("lsKeyWords")->isEnabled());
     EXPECT_FALSE(child<QAction>("MDateiSpeichern")->isEnabled());
     EXPECT_FALSE(child<QAction>("MRecentFile_0")->isVisible());
-    EXPECT_EQ(child<QComboBox>("cbBFCStatement")->count(), 3);
     EXPECT_EQ(child<QComboBox>("cbBFCStatement")->currentIndex(), -1);
-    EXPECT_EQ(app.Header.FileFolder, app.ProgramFolder);
 }
 
 TEST_F(WindowTest, OpensTheFileNamedOnTheCommandLine)
@@ -48,7 +46,6 @@ TEST_F(WindowTest, OpensTheFileNamedOnTheCommandLine)
     EXPECT_EQ(child<QListWidget>("lsKeyWords")->item(0)->text(), "brick, stud");
     EXPECT_NE(child<QPlainTextEdit>("txOldHeader")->toPlainText().indexOf("0 !KEYWORDS brick, stud"), -1);
     EXPECT_FALSE(app.Header.FileChanged);
-    EXPECT_TRUE(child<QWidget>("txPartDescription")->isEnabled());
     EXPECT_EQ(store.read(DefaultGroup, "LastPath", ""), work.path().string());
     EXPECT_EQ(child<QAction>("MRecentFile_1")->text().toStdString(), path);
 }
@@ -78,9 +75,8 @@ TEST_F(WindowTest, ValuesMissingFromTheListsStayUnselectedButTheHeaderIsComposed
                                            "0 BFC CW\r\n0 !CATEGORY Nothing\r\n"));
     for (const char* combo : {"cbPartTypes", "cbLicenses", "cbBFCStatement", "cbCategory"})
         EXPECT_EQ(child<QComboBox>(combo)->currentIndex(), -1) << combo;
-    EXPECT_NE(window->newHeaderText().find("0 !LDRAW_ORG Strange\r\n"), std::string::npos);
-    EXPECT_NE(child<QPlainTextEdit>("txNewHeader")->toPlainText().toStdString().find("0 !LICENSE Mine"),
-              std::string::npos);
+    EXPECT_NE(window->newHeaderText().find("0 !LDRAW_ORG Strange\r\n0 !LICENSE Mine\r\n"), std::string::npos);
+    EXPECT_NE(child<QPlainTextEdit>("txNewHeader")->toPlainText().indexOf("0 !LICENSE Mine"), -1);
     EXPECT_FALSE(app.Header.FileChanged);
 }
 
@@ -178,13 +174,6 @@ protected:
         openThroughPendingFile(part("h.dat", "0 H\r\n0 !HISTORY X\r\n0 !HISTORY Y\r\n0 !HISTORY X\r\n"));
         history = child<QListWidget>("lsHistory");
     }
-    QStringList rows() const
-    {
-        QStringList shown;
-        for (int i = 0; i < history->count(); ++i)
-            shown << history->item(i)->text();
-        return shown;
-    }
     QListWidget* history = nullptr;
 };
 
@@ -199,10 +188,10 @@ TEST_F(LineListTest, EditAndDeleteActOnTheSelectedRowOnly)
     child<QPushButton>("cmdHistoryEdit")->click();
     EXPECT_EQ(dialogs.inputsShown[0].defaultText, "X");
     EXPECT_EQ(app.Header.History, (StringList{"X", "Y", "Z"}));
-    EXPECT_EQ(rows(), (QStringList{"X", "Y", "Z"}));
+    EXPECT_EQ(RowsOf(*history), (QStringList{"X", "Y", "Z"}));
     history->setCurrentRow(0);
     child<QPushButton>("cmdHistoryDelete")->click();
-    EXPECT_EQ(rows(), (QStringList{"Y", "Z"}));
+    EXPECT_EQ(RowsOf(*history), (QStringList{"Y", "Z"}));
     EXPECT_NE(window->newHeaderText().find("0 !HISTORY Y\r\n0 !HISTORY Z\r\n\r\n"), std::string::npos);
 }
 

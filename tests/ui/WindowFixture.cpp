@@ -39,6 +39,14 @@ void WindowTest::openThroughPendingFile(const std::string& path)
     window->MDateiOeffnen_Click();
 }
 
+QStringList RowsOf(const QListWidget& list)
+{
+    QStringList rows;
+    for (int i = 0; i < list.count(); ++i)
+        rows << list.item(i)->text();
+    return rows;
+}
+
 std::string WindowTest::text(const char* name) const
 {
     if (auto* box = window->findChild<QLineEdit*>(name))

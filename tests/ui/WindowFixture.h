@@ -1,6 +1,7 @@
 #pragma once
 
 #include <QApplication>
+#include <QListWidget>
 #include <QTimer>
 #include <functional>
 #include <gtest/gtest.h>
@@ -59,6 +60,9 @@ protected:
 private:
     void pollForDialog(std::function<bool(QWidget*)> act);
 };
+
+// The texts of a list's rows, top to bottom.
+QStringList RowsOf(const QListWidget& list);
 
 // A small, complete part file.
 extern const std::string GoodPart;
