@@ -10,6 +10,7 @@
 #include <unistd.h>
 
 #include "Dialogs.h"
+#include "ErrorNumber.h"
 #include "FileSave.h"
 #include "FixedClock.h"
 #include "QmError.h"
@@ -203,12 +204,7 @@ TEST(AnotherUsersFile, IsRefusedOrKeepsItsOwner)
     TempDir dir;
     fs::permissions(dir.path(), fs::perms::all);
     const auto saveStatus = [](const std::string& path) {
-        try {
-            ReplaceFileSafely(path, {NewHeader}, std::nullopt);
-            return 0;
-        } catch (const QmError& error) {
-            return error.number();
-        }
+        return ErrorNumberOf([&path] { ReplaceFileSafely(path, {NewHeader}, std::nullopt); });
     };
     const auto rootsOwn = dir.write("roots.dat", OldContent);
     ::chmod(rootsOwn.c_str(), 0644); // writable for root alone, in a folder everyone may write

@@ -215,26 +215,4 @@ TEST(ParserAnyInput, OddBytesAreJustText)
     EXPECT_EQ(longLine.Body.size(), 10u * 1024 * 1024 + 1);
 }
 
-class RecordingProgress : public ParseProgress {
-public:
-    void lineProgress(std::size_t linesRead) override { captions.push_back(ProgressCaption(linesRead)); }
-    void setBusy(bool busy) override { busyChanges.push_back(busy); }
-    std::vector<std::string> captions;
-    std::vector<bool> busyChanges;
-};
-
-TEST(ParserProgress, EveryTenthLineAndBusyAroundTheParse)
-{
-    std::string text;
-    for (int i = 0; i < 21; ++i)
-        text += "0 line\r\n";
-    HeaderData header;
-    RecordingProgress progress;
-    ParseHeaderText(header, text, progress);
-    EXPECT_EQ(progress.captions,
-              (std::vector<std::string>{"Parsing file. Line 0. Please wait...", "Parsing file. Line 10. Please wait...",
-                                        "Parsing file. Line 20. Please wait..."}));
-    EXPECT_EQ(progress.busyChanges, (std::vector<bool>{true, false}));
-}
-
 } // namespace

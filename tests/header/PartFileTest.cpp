@@ -7,8 +7,8 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
+#include "ErrorNumber.h"
 #include "PartFile.h"
-#include "QmError.h"
 #include "TempDir.h"
 
 namespace {
@@ -24,12 +24,7 @@ public:
 
 int readError(const std::string& path)
 {
-    try {
-        FileBytes bytes(path);
-        return 0;
-    } catch (const QmError& error) {
-        return error.number();
-    }
+    return ErrorNumberOf([&path] { const FileBytes bytes(path); });
 }
 
 TEST(ReadingFiles, OnlyRegularFilesAreRead)

@@ -8,7 +8,7 @@
 #include <sys/stat.h>
 #include <unistd.h>
 
-#include "QmError.h"
+#include "ErrorNumber.h"
 #include "SafeReplace.h"
 #include "TempDir.h"
 
@@ -81,12 +81,9 @@ protected:
     {
         failNext = step;
         failErrno = error;
-        try {
+        return ErrorNumberOf([this, withBackup] {
             ReplaceFileSafely(path, {NewBytes}, withBackup ? std::optional(backup) : std::nullopt);
-            return 0;
-        } catch (const QmError& failure) {
-            return failure.number();
-        }
+        });
     }
     TempDir dir;
     const std::string path = dir.write("3001.dat", OldBytes);

@@ -41,6 +41,7 @@ TEST_F(WindowTest, OpensTheFileNamedOnTheCommandLine)
     const auto path = part("3001.dat", GoodPart);
     startUp({QString::fromStdString(path)});
     EXPECT_EQ(caption(), "Quillmark 1.0.0 [3001.dat]");
+    EXPECT_EQ(QApplication::overrideCursor(), nullptr) << "the busy pointer is gone";
     EXPECT_EQ(text("txPartDescription"), "Brick  2 x 4");
     EXPECT_EQ(child<QComboBox>("cbCategory")->currentText(), "Brick");
     EXPECT_EQ(child<QListWidget>("lsKeyWords")->item(0)->text(), "brick, stud");
