@@ -6,10 +6,11 @@
 #include <filesystem>
 #include <nlohmann/json.hpp>
 #include <pty.h>
+#include <sstream>
 #include <sys/wait.h>
 #include <unistd.h>
 
-#include "CliRun.h"
+#include "CliApp.h"
 #include "Corpus.h"
 #include "TempDir.h"
 
@@ -26,6 +27,23 @@ const std::string NoUserPart = "0 " + std::string(70, 'x') +
 const std::string SamplePart = "0 Brick\t2 x 4\r\n0 Name: 3001.dat\r\n0 Author: Sam Sample [ssample]\r\n"
                                "0 BFC CERTIFY CCW\r\n0 !KEYWORDS a, b\r\n0 Caf\xe9\r\n"
                                "1 16 0 0 0 1 0 0 0 1 0 0 0 1 3001s01.dat\r\n";
+
+struct CliRun {
+    int status;
+    std::string out, err;
+};
+
+// Runs quillmark-cli in this process with the given arguments.
+CliRun RunCliWith(std::vector<std::string> args)
+{
+    args.insert(args.begin(), "quillmark-cli");
+    std::vector<const char*> argv;
+    for (const auto& arg : args)
+        argv.push_back(arg.c_str());
+    std::ostringstream out, err;
+    const int status = RunCli(static_cast<int>(argv.size()), argv.data(), out, err);
+    return {status, out.str(), err.str()};
+}
 
 std::size_t lineCount(const std::string& text)
 {

@@ -39,14 +39,6 @@ protected:
     bool limitDescription = true;
 };
 
-TEST_F(SaveChecks, CompleteHeaderIsSavedWithoutAQuestion)
-{
-    EXPECT_EQ(save().outcome, SaveOutcome::Saved);
-    EXPECT_EQ(saved(), ComposeHeader(h) + h.Body + "\r\n");
-    EXPECT_FALSE(h.FileChanged);
-    EXPECT_TRUE(dialogs.messages.empty());
-}
-
 TEST_F(SaveChecks, DescriptionOfSixtyFiveCharactersIsRefusedUnlessTheLimitIsOff)
 {
     h.PartDescription = std::string(64, 'x');

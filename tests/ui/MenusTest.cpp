@@ -147,7 +147,7 @@ TEST_F(WindowTest, SetPreferencesShowsTheDefaultsInTheWindow)
     EXPECT_TRUE(app.Header.FileChanged);
 }
 
-TEST_F(WindowTest, RecentFilesMenuNewestFirstAndAClickOpens)
+TEST_F(WindowTest, RecentFilesMenuShowsTheStoredFilesNewestFirstAndAClickOpens)
 {
     store.write(RecentFilesGroup, "RecentFile1", "/parts/from-an-earlier-run.dat");
     startUp();
@@ -160,7 +160,6 @@ TEST_F(WindowTest, RecentFilesMenuNewestFirstAndAClickOpens)
     EXPECT_EQ(child<QAction>("MRecentFile_3")->text(), QString::fromStdString(a).replace("&", "&&"));
     child<QAction>("MRecentFile_3")->trigger();
     EXPECT_EQ(text("txPartDescription"), "A");
-    EXPECT_EQ(child<QAction>("MRecentFile_1")->text().toStdString(), c);
 }
 
 TEST_F(WindowTest, RecentFileThatWasDeletedIsReportedAndStays)
