@@ -4,6 +4,7 @@
 #include <QLabel>
 #include <QPushButton>
 #include <QStyle>
+#include <algorithm>
 
 namespace {
 
@@ -26,6 +27,11 @@ int widthForCaption(const QWidget& control)
 void WidenToShowCaption(QWidget& control)
 {
     const int needed = widthForCaption(control);
-    if (needed > control.width())
-        control.resize(needed, control.height());
+    if (needed <= control.width())
+        return;
+    // It grows to the right, but where that would pass its window's edge, to the left instead.
+    int left = control.x();
+    if (const auto* parent = control.parentWidget())
+        left = std::max(0, std::min(left, parent->width() - needed));
+    control.setGeometry(left, control.y(), needed, control.height());
 }

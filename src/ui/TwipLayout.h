@@ -18,7 +18,8 @@ Widget* PlaceChild(QWidget* parent, const char* name, int left, int top, int wid
 }
 
 // Widens a label, button or check box whose twip width is too small for its caption in the
-// window font, just enough to show it whole; its place and the other controls stay.
+// window font, just enough to show it whole and never past its parent's right edge; the other
+// controls stay.
 void WidenToShowCaption(QWidget& control);
 
 // The same for a control that shows a caption (label, button, check box, frame).

@@ -94,13 +94,16 @@ TEST_F(ListMenuTest, TrackerCheckShowsTheFindingsAndChangesNothing)
 }
 
 // Every caption shows whole in the window font: its text is no wider than the room the control
-// leaves it.
+// leaves it, and the control lies inside its window.
 TEST_F(WindowTest, EveryCaptionOfTheThreeWindowsShowsWhole)
 {
     startUp();
     frmList list(ListKind::Category, {"<none>"}, app.ProgramFolder, dialogs);
     frmOption options(PreferencesForm{}, {});
     for (const QWidget* shown : std::initializer_list<const QWidget*>{window.get(), &list, &options}) {
+        for (const auto* control : shown->findChildren<QWidget*>())
+            EXPECT_LE(control->geometry().right(), control->parentWidget()->width() - 1)
+                << control->objectName().toStdString();
         for (const auto* label : shown->findChildren<QLabel*>())
             EXPECT_LE(label->fontMetrics().horizontalAdvance(label->text()), label->contentsRect().width())
                 << label->objectName().toStdString();
