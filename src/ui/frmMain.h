@@ -83,6 +83,7 @@ private:
     void fillCombo(QComboBox& combo, ListKind kind);
     void abandonOpen(const std::exception& error, const Procedure& procedure);
     void fillWindowFromRecord();
+    void showTextsFromTheirStart();
     void SelectComboItem(QComboBox& combo, const std::string& text);
     void showCaption();
     void showRecentFiles();

@@ -99,6 +99,7 @@ void frmMain::readChosenFile(const std::function<void()>& takeFile, bool removeT
     MakeNewHeader();
     if (removeTabs && RemoveDescriptionTabs(app_.Header, services_.dialogs)) {
         txPartDescription->setText(ToWidget(app_.Header.PartDescription, app_.Header.Encoding));
+        showTextsFromTheirStart();
         MakeNewHeader();
     }
     app_.Header.Loading = false;
@@ -158,6 +159,7 @@ void frmMain::fillWindowFromRecord()
     txFileName->setText(ToWidget(app_.Header.PartName, encoding));
     txAuthorRealName->setText(ToWidget(app_.Header.ParsedRealName, encoding));
     txAuthorUserName->setText(ToWidget(app_.Header.AuthorUserName, encoding));
+    showTextsFromTheirStart();
     app_.Header.AuthorRealName = app_.Header.ParsedRealName;
     refillLists();
     auto oldHeader = ToWidget(app_.Header.OldHeader, encoding);
@@ -166,6 +168,14 @@ void frmMain::fillWindowFromRecord()
     SelectComboItem(*cbCategory, app_.Header.Category);
     SelectComboItem(*cbLicenses, app_.Header.License);
     SelectComboItem(*cbPartTypes, app_.Header.PartType);
+}
+
+// A text longer than its box shows its start, as the file has it: the end alone would look like
+// a text that lost its first words.
+void frmMain::showTextsFromTheirStart()
+{
+    for (QLineEdit* box : {txPartDescription, txFileName, txAuthorRealName, txAuthorUserName})
+        box->setCursorPosition(0);
 }
 
 void frmMain::SelectComboItem(QComboBox& combo, const std::string& text)

@@ -43,6 +43,7 @@ TEST_F(WindowTest, OpensTheFileNamedOnTheCommandLine)
     EXPECT_EQ(caption(), "Quillmark 1.0.0 [3001.dat]");
     EXPECT_EQ(QApplication::overrideCursor(), nullptr) << "the busy pointer is gone";
     EXPECT_EQ(text("txPartDescription"), "Brick  2 x 4");
+    EXPECT_EQ(child<QLineEdit>("txPartDescription")->cursorPosition(), 0) << "a long text shows its start";
     EXPECT_EQ(child<QComboBox>("cbCategory")->currentText(), "Brick");
     EXPECT_EQ(child<QListWidget>("lsKeyWords")->item(0)->text(), "brick, stud");
     EXPECT_NE(child<QPlainTextEdit>("txOldHeader")->toPlainText().indexOf("0 !KEYWORDS brick, stud"), -1);
