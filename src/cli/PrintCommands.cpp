@@ -17,9 +17,9 @@ int RunPrint(const std::string& path, ConsoleDialogs& dialogs, std::ostream& out
 {
     return ForEachOpenedFile({path}, dialogs, err, [&out](HeaderData& header) {
         const auto newHeader = ComposeHeader(header);
-        out.write(newHeader.data(), static_cast<std::streamsize>(newHeader.size()));
-        out.write(header.Body.data(), static_cast<std::streamsize>(header.Body.size()));
-        out.write(CrLf.data(), static_cast<std::streamsize>(CrLf.size()));
+        for (const std::string_view piece :
+             {TextBeforeHeader(header), std::string_view(newHeader), std::string_view(header.Body), CrLf})
+            out.write(piece.data(), static_cast<std::streamsize>(piece.size()));
         return ExitStatus::Ok;
     });
 }

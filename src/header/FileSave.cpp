@@ -67,7 +67,7 @@ FileSaveResult FileSave(HeaderData& header, const std::string& newHeader, bool m
         std::optional<std::string> backupPath;
         if (makeBackup)
             backupPath = MakeBackupName(target, clock.now());
-        ReplaceFileSafely(target, {newHeader, header.Body, CrLf}, backupPath);
+        ReplaceFileSafely(target, {TextBeforeHeader(header), newHeader, header.Body, CrLf}, backupPath);
         header.ReadStamp = StampOfPath(target);
         header.FileChanged = false;
         result.saved = true;

@@ -37,6 +37,8 @@ struct HeaderData {
     std::string OldHeader;
     std::string Body;
     TextEncoding Encoding = TextEncoding::Utf8;
+    // The file began with a UTF-8 byte order mark: not part of the header, and written back.
+    bool ByteOrderMark = false;
     // The file at FilePath as it was read, or as the last save left it; none when nothing was read.
     std::optional<FileStamp> ReadStamp;
 

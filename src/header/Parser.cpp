@@ -326,6 +326,11 @@ void ParseHeaderText(HeaderData& header, std::string_view text, ParseProgress& p
 
 void ParsePartFileContent(HeaderData& header, std::string_view content, Dialogs& dialogs, ParseProgress& progress)
 {
+    // Editors that put a byte order mark before the first line would otherwise hide the whole
+    // header in the body, and a save would write a second, empty header above it.
+    header.ByteOrderMark = content.starts_with(Utf8ByteOrderMark);
+    if (header.ByteOrderMark)
+        content.remove_prefix(Utf8ByteOrderMark.size());
     if (content.empty())
         ReportError(dialogs, InputPastEndOfFileError(), IsUnixLineEndProcedure);
     if (!IsUnixLineEnd(content)) {

@@ -9,6 +9,13 @@
 // Text is bytes: "blank" is the space character alone, and case changes touch ASCII letters only.
 
 inline constexpr std::string_view CrLf = "\r\n";
+inline constexpr std::string_view Utf8ByteOrderMark = "\xEF\xBB\xBF";
+
+// What a save writes before the composed header: the byte order mark the file began with, if any.
+inline std::string_view TextBeforeHeader(const HeaderData& header)
+{
+    return header.ByteOrderMark ? Utf8ByteOrderMark : std::string_view();
+}
 
 std::string_view TrimBlanks(std::string_view text);
 

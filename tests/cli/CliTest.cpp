@@ -67,6 +67,7 @@ TEST(CliFields, OneJsonLinePerFileAndTheUnreadableNamedOnStandardError)
     EXPECT_NE(run.err.find("cannot read " + dir.file("missing.dat")), std::string::npos);
 }
 
+// A byte order mark before the first line is kept there, and the header after it is read.
 TEST(CliPrint, WritesTheComposedHeaderTheBodyAndOneCrLf)
 {
     TempDir dir;
@@ -75,6 +76,8 @@ TEST(CliPrint, WritesTheComposedHeaderTheBodyAndOneCrLf)
     EXPECT_EQ(run.out, "0 Brick2 x 4\r\n0 Name: 3001.dat\r\n0 Author: Sam Sample [ssample]\r\n\r\n"
                        "0 BFC CERTIFY CCW\r\n\r\n0 !KEYWORDS a, b\r\n\r\n"
                        "0 Caf\xe9\r\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 3001s01.dat\r\n");
+    const std::string mark = "\xEF\xBB\xBF";
+    EXPECT_EQ(RunCliWith({"print", dir.write("bom.dat", mark + SamplePart)}).out, mark + run.out);
 }
 
 TEST(CliCheck, ListsEveryFindingInLinesOrJsonAndNeverWrites)

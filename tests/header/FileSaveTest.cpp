@@ -82,10 +82,11 @@ TEST_F(FileSaving, WritesTheNewTextKeepingPermissionsAndTheOldInTheBackup)
     EXPECT_EQ(statOf(h.FilePath).st_mode & 0777, 0640u);
     TempDir::writeTo(h.FilePath, OldContent);
     h.ReadStamp.reset();
+    h.ByteOrderMark = true; // read before the first line, and written back there
     const auto result = save(true);
     EXPECT_EQ(result.backupPath, dir.file(BackupName));
     EXPECT_EQ(ReadBytes(result.backupPath), OldContent);
-    EXPECT_EQ(ReadBytes(h.FilePath), NewContent);
+    EXPECT_EQ(ReadBytes(h.FilePath), "\xEF\xBB\xBF" + NewContent);
 }
 
 TEST_F(FileSaving, ABackupNameIsNeverOverwritten)
