@@ -267,10 +267,10 @@ void overwrite(const std::string& target, std::initializer_list<std::string_view
 // then it is rewritten, and written back from the copy if that fails.
 void rewriteInPlace(const std::string& target, const struct stat& original,
                     std::initializer_list<std::string_view> pieces, const std::optional<std::string>& backupPath,
-                    const ReplaceStepHook& afterStep)
+                    const ReplaceStepHook& afterStep, const std::string& copyFolder)
 {
     const FileBytes old(target);
-    const auto copyPath = backupPath ? *backupPath : uniqueNameIn(FolderOf(target), KeepPrefix);
+    const auto copyPath = backupPath ? *backupPath : uniqueNameIn(copyFolder, KeepPrefix);
     writeCopy(copyPath, old.view(), original);
     Undo copy(copyPath);
     reach(afterStep, ReplaceStep::BackupMade);
@@ -358,8 +358,12 @@ void ReplaceFileSafely(const std::string& path, std::initializer_list<std::strin
         checkWritable(target, original);
     const auto folder = FolderOf(target);
     removeStaleTemporaries(folder);
-    const bool keepInode = exists && original.st_nlink > 1;
+    // A file this user may write in a folder where he may not create files can only be rewritten
+    // in place, with the copy of its old bytes in the temporary folder.
+    const bool folderWritable = ::faccessat(AT_FDCWD, folder.c_str(), W_OK | X_OK, AT_EACCESS) == 0;
+    const auto copyFolder = folderWritable ? folder : std::filesystem::temp_directory_path().string();
+    const bool keepInode = exists && (original.st_nlink > 1 || (!folderWritable && !backupPath));
     if (keepInode || !replaceByRename(target, exists ? &original : nullptr, pieces, backupPath, afterStep))
-        rewriteInPlace(target, original, pieces, backupPath, afterStep);
+        rewriteInPlace(target, original, pieces, backupPath, afterStep, copyFolder);
     syncFolder(folder);
 }

@@ -19,9 +19,9 @@ using ReplaceStepHook = std::function<void(ReplaceStep)>;
 // so that the file is never broken, never missing and never another user's:
 // - the new text goes to a temporary file in the same folder that has no name until it is
 //   complete and on disk, and then takes the file's name in one rename;
-// - a file with several hard links, or one whose owner a new file could not keep, is rewritten
-//   in place instead, after a copy of its old bytes is safe on disk, and restored from that copy
-//   if writing fails;
+// - a file with several hard links, one whose owner a new file could not keep, or one in a folder
+//   where this user may not create files, is rewritten in place instead, after a copy of its old
+//   bytes is safe on disk, and restored from that copy if writing fails;
 // - with a backup path, the old content ends under that name (a second name for the old file,
 //   or a copy of it);
 // - a file this user may not write, or that has no write permission at all, is refused.

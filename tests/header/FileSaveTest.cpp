@@ -217,6 +217,10 @@ TEST(AnotherUsersFile, IsRefusedOrKeepsItsOwner)
     EXPECT_EQ(ReadBytes(shared), NewHeader);
     EXPECT_EQ(statOf(shared).st_uid, 0u);
     EXPECT_EQ(NamesIn(dir.path()), (std::set<std::string>{"roots.dat", "shared.dat"}));
+    fs::permissions(dir.path(), fs::perms::owner_all | fs::perms::others_exec); // no new files for nobody
+    TempDir::writeTo(shared, OldContent);
+    EXPECT_EQ(asNobody([&] { return saveStatus(shared); }), 0);
+    EXPECT_EQ(ReadBytes(shared), NewHeader);
 }
 
 // A save killed right after each of its steps leaves the old or the new bytes under the part's
