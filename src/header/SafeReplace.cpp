@@ -103,26 +103,12 @@ void removeStaleTemporaries(const std::string& folder)
 // name that is removed again unless the file was put in place.
 class NewFile {
 public:
-    NewFile(const std::string& folder, const std::string& reportedPath) : folder_(folder), reportedPath_(reportedPath)
+    NewFile(const std::string& folder, const std::string& reportedPath)
+        : folder_(folder), reportedPath_(reportedPath), fd_(openInFolder())
     {
-        fd_ = ::open(folder.c_str(), O_TMPFILE | O_WRONLY | O_CLOEXEC, 0600);
-        if (fd_ >= 0)
-            return;
-        if (errno != EOPNOTSUPP && errno != EISDIR && errno != EINVAL)
-            throw OsError(errno, reportedPath);
-        for (;;) {
-            temporaryName_ = uniqueNameIn(folder, TemporaryPrefix);
-            fd_ = ::open(temporaryName_.c_str(), O_CREAT | O_EXCL | O_WRONLY | O_CLOEXEC, 0600);
-            if (fd_ >= 0)
-                return;
-            if (errno != EEXIST)
-                throw OsError(errno, reportedPath);
-        }
     }
     ~NewFile()
     {
-        if (fd_ >= 0)
-            ::close(fd_);
         if (!temporaryName_.empty())
             ::unlink(temporaryName_.c_str());
     }
@@ -132,16 +118,16 @@ public:
     void write(std::initializer_list<std::string_view> pieces)
     {
         for (const auto piece : pieces)
-            writeAll(fd_, piece, reportedPath_);
+            writeAll(fd_.get(), piece, reportedPath_);
     }
 
     // Gives the new file the permissions and, where the system allows, the owner of the file it
     // stands in for. False when owner or group would differ.
     bool takeOwnerAndModeOf(const struct stat& original)
     {
-        [[maybe_unused]] const int ignored = ::fchown(fd_, original.st_uid, original.st_gid);
+        [[maybe_unused]] const int ignored = ::fchown(fd_.get(), original.st_uid, original.st_gid);
         struct stat now {};
-        if (::fstat(fd_, &now) != 0)
+        if (::fstat(fd_.get(), &now) != 0)
             throw OsError(errno, reportedPath_);
         if (now.st_uid != original.st_uid || now.st_gid != original.st_gid)
             return false;
@@ -150,12 +136,12 @@ public:
     }
     void setMode(mode_t mode)
     {
-        if (::fchmod(fd_, mode) != 0)
+        if (::fchmod(fd_.get(), mode) != 0)
             throw OsError(errno, reportedPath_);
     }
     void sync()
     {
-        if (::fsync(fd_) != 0)
+        if (::fsync(fd_.get()) != 0)
             throw OsError(errno, reportedPath_);
     }
 
@@ -185,23 +171,38 @@ public:
     }
 
 private:
+    // Sets temporaryName_ when the file system has no unnamed files.
+    int openInFolder()
+    {
+        const int fd = ::open(folder_.c_str(), O_TMPFILE | O_WRONLY | O_CLOEXEC, 0600);
+        if (fd >= 0)
+            return fd;
+        if (errno != EOPNOTSUPP && errno != EISDIR && errno != EINVAL)
+            throw OsError(errno, reportedPath_);
+        for (;;) {
+            temporaryName_ = uniqueNameIn(folder_, TemporaryPrefix);
+            const int named = ::open(temporaryName_.c_str(), O_CREAT | O_EXCL | O_WRONLY | O_CLOEXEC, 0600);
+            if (named >= 0)
+                return named;
+            if (errno != EEXIST)
+                throw OsError(errno, reportedPath_);
+        }
+    }
     int linkUnnamed(const std::string& path) const
     {
-        const auto self = "/proc/self/fd/" + std::to_string(fd_);
+        const auto self = "/proc/self/fd/" + std::to_string(fd_.get());
         return ::linkat(AT_FDCWD, self.c_str(), AT_FDCWD, path.c_str(), AT_SYMLINK_FOLLOW);
     }
     void closeChecked()
     {
-        const int fd = fd_;
-        fd_ = -1;
-        if (::close(fd) != 0)
+        if (::close(fd_.release()) != 0)
             throw OsError(errno, reportedPath_);
     }
 
     std::string folder_;
     std::string reportedPath_;
-    std::string temporaryName_;
-    int fd_ = -1;
+    std::string temporaryName_; // set by openInFolder while fd_ is made, so declared before it
+    FileDescriptor fd_;
 };
 
 // A new file at path (which must not exist) holding bytes, on disk, with the mode and, where the
