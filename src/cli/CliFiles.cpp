@@ -7,9 +7,14 @@
 #include "ParseProgress.h"
 #include "PartFile.h"
 #include "QmError.h"
+#include "TextFile.h"
 
 void ReportUnreadable(const std::string& path, const std::exception& failure, std::ostream& err)
 {
+    if (dynamic_cast<const NotTextFileError*>(&failure) != nullptr) {
+        err << "quillmark-cli: " << failure.what() << '\n'; // it names the file itself
+        return;
+    }
     err << "quillmark-cli: cannot read " << path << ": " << ErrorOf(failure).description() << '\n';
 }
 

@@ -69,6 +69,7 @@ FileSaveResult FileSave(HeaderData& header, const std::string& newHeader, bool m
             backupPath = MakeBackupName(target, clock.now());
         ReplaceFileSafely(target, {TextBeforeHeader(header), newHeader, header.Body, CrLf}, backupPath);
         header.ReadStamp = StampOfPath(target);
+        header.HeaderAtOpenOrSave = newHeader;
         header.FileChanged = false;
         result.saved = true;
         result.backupPath = backupPath.value_or(std::string());

@@ -41,6 +41,9 @@ struct HeaderData {
     bool ByteOrderMark = false;
     // The file at FilePath as it was read, or as the last save left it; none when nothing was read.
     std::optional<FileStamp> ReadStamp;
+    // The composed header as the open or the last save left it: the file counts as changed only
+    // while the header composed now differs from it.
+    std::string HeaderAtOpenOrSave;
 
     bool FileChanged = false;
     bool FileLoaded = false;

@@ -12,6 +12,7 @@
 #include "ParseProgress.h"
 #include "PartFile.h"
 #include "Text.h"
+#include "TextFile.h"
 #include "Words.h"
 
 namespace {
@@ -324,34 +325,34 @@ void ParseHeaderText(HeaderData& header, std::string_view text, ParseProgress& p
         body.add(nextLine());
 }
 
-void ParsePartFileContent(HeaderData& header, std::string_view content, Dialogs& dialogs, ParseProgress& progress)
+bool ParsePartFileContent(HeaderData& header, std::string_view content, Dialogs& dialogs, ParseProgress& progress)
 {
+    EnsureTextFile(content, header.FilePath);
     // Editors that put a byte order mark before the first line would otherwise hide the whole
     // header in the body, and a save would write a second, empty header above it.
     header.ByteOrderMark = content.starts_with(Utf8ByteOrderMark);
     if (header.ByteOrderMark)
         content.remove_prefix(Utf8ByteOrderMark.size());
-    if (content.empty())
+    const bool empty = content.empty();
+    if (empty)
         ReportError(dialogs, InputPastEndOfFileError(), IsUnixLineEndProcedure);
     if (!IsUnixLineEnd(content)) {
         ParseHeaderText(header, content, progress);
-        return;
+        return !empty;
     }
     auto converted = LfToCrLf(content);
     converted += CrLf;
     ParseHeaderText(header, converted, progress);
+    return !empty;
 }
 
-void GetGlobalContent(HeaderData& header, Dialogs& dialogs, ParseProgress& progress)
+bool GetGlobalContent(HeaderData& header, Dialogs& dialogs, ParseProgress& progress)
 {
-    if (header.FilePath.empty())
-        return;
     progress.processEvents();
     std::optional<FileBytes> content;
     try {
         content.emplace(header.FilePath);
     } catch (const QmError& error) {
-        header.ReadStamp = StampOfPath(header.FilePath);
         ReportError(dialogs, error, IsUnixLineEndProcedure);
         const bool missing = error.number() == ErrorNumber::FileNotFound || error.number() == ErrorNumber::PathNotFound;
         if (missing)
@@ -359,12 +360,17 @@ void GetGlobalContent(HeaderData& header, Dialogs& dialogs, ParseProgress& progr
                 {"File " + header.FilePath + " not found!", "Error", Buttons::Ok, Icon::Exclamation, Answer::Ok});
         else
             ReportError(dialogs, error, GetGlobalContentProcedure);
-        return;
+        return false;
     }
     try {
-        ParsePartFileContent(header, content->view(), dialogs, progress);
+        if (!ParsePartFileContent(header, content->view(), dialogs, progress))
+            return false;
         header.ReadStamp = content->stamp();
+        return true;
+    } catch (const NotTextFileError& notText) {
+        dialogs.message({notText.what(), ProgramTitle, Buttons::Ok, Icon::Exclamation, Answer::Ok});
     } catch (const std::exception& failure) {
         ReportError(dialogs, ErrorOf(failure), GetGlobalContentProcedure);
     }
+    return false;
 }

@@ -12,11 +12,13 @@ class ParseProgress;
 // Body. Replaces the lists and OldHeader and Body first, so a parse never adds to an earlier one.
 void ParseHeaderText(HeaderData& header, std::string_view text, ParseProgress& progress);
 
-// The content of the part file as read: the line-end check (an empty file is reported as the
-// check always has), the conversion of an LF-only file in memory, then the parse. The file on
-// disk is never touched.
-void ParsePartFileContent(HeaderData& header, std::string_view content, Dialogs& dialogs, ParseProgress& progress);
+// The content of the part file as read: the text check (NotTextFileError for a binary file), the
+// line-end check (an empty file is reported as the check always has), the conversion of an
+// LF-only file in memory, then the parse. The file on disk is never touched. False when the file
+// was empty.
+bool ParsePartFileContent(HeaderData& header, std::string_view content, Dialogs& dialogs, ParseProgress& progress);
 
-// Reads and parses the file named by FilePath; does nothing when FilePath is empty. Failures are
-// reported through dialogs, and the record keeps what the lines before the failure gave it.
-void GetGlobalContent(HeaderData& header, Dialogs& dialogs, ParseProgress& progress);
+// Reads and parses the file named by FilePath into header, a record of its own. Failures (no such
+// file, no regular file, an empty or binary file, a failed parse) are reported through dialogs
+// and give false: the caller then drops the record.
+bool GetGlobalContent(HeaderData& header, Dialogs& dialogs, ParseProgress& progress);

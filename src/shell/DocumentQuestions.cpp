@@ -17,11 +17,6 @@ bool MayCloseWindow(AppState& app, Services& services, const std::string& newHea
     return FileSave(app.Header, newHeader, app.Prefs.MakeBackup, services.clock, services.dialogs).saved;
 }
 
-bool SavedBeforeOpen(const AppState& app, const std::function<bool()>& saveWithChecks)
-{
-    return !app.Header.FileChanged || saveWithChecks();
-}
-
 bool MayOpenAnotherFile(const AppState& app, Dialogs& dialogs, const std::function<bool()>& saveWithChecks)
 {
     if (!app.Header.FileChanged)

@@ -14,13 +14,10 @@
 // Cancel stays. True when the window may close.
 bool MayCloseWindow(AppState& app, Services& services, const std::string& newHeader);
 
-// Before the Open command opens another file: a changed file is saved with the checks first
-// (saveWithChecks, which the window runs so that it can point at a refused description). True
-// when the open may go on.
-bool SavedBeforeOpen(const AppState& app, const std::function<bool()>& saveWithChecks);
-
-// Before the recent files' road opens another file: asked when the file has changed; Yes saves
-// with the checks, No discards, Cancel stays. True when the open may go on.
+// Before another file replaces the open one (the Open command, a drop, the recent files): asked
+// when the file has changed; Yes saves with the checks (saveWithChecks, which the window runs so
+// that it can point at a refused description), No discards, Cancel stays. True when the open may
+// go on.
 bool MayOpenAnotherFile(const AppState& app, Dialogs& dialogs, const std::function<bool()>& saveWithChecks);
 
 // The list editor for kind opens at once, the category list only after the user agrees to the

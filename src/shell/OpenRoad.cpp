@@ -1,6 +1,7 @@
 #include "OpenRoad.h"
 
 #include "OpenDocument.h"
+#include "Parser.h"
 #include "SettingsStore.h"
 
 void StartUpState(AppState& app, Services& services)
@@ -17,23 +18,21 @@ void StartUpState(AppState& app, Services& services)
     LoadStandardLists(app.Lists, app.ProgramFolder, services.dialogs);
 }
 
-void BeginOpen(AppState& app, Services& services)
+bool LadeDATDateiCommandLine(AppState& app, const std::string& path, OpenRoad road, Services& services,
+                             ParseProgress& progress)
 {
-    app.Header.Loading = true;
-    ResetHeaderRecord(app.Header);
+    HeaderData opened;
+    TakeFileToOpen(opened, path, services.dialogs);
+    if (!GetGlobalContent(opened, services.dialogs, progress))
+        return false;
+    opened.Loading = true;
+    app.Header = std::move(opened);
     LoadStandardLists(app.Lists, app.ProgramFolder, services.dialogs);
     LadeDefaults(app.Prefs, services.store);
-}
-
-void LadeDATDateiCommandLine(AppState& app, const std::string& path, Services& services)
-{
-    TakeFileToOpen(app.Header, path, services.dialogs);
-    StoreLastPath(services.store, app.Header.FileFolder);
-}
-
-void TakeRecentFile(AppState& app, const std::string& path, Services& services)
-{
-    TakeFileToOpen(app.Header, path, services.dialogs);
+    if (road == OpenRoad::Chosen)
+        StoreLastPath(services.store, app.Header.FileFolder);
+    AddRecentFile(app.Recent, services.store, app.Header.FilePath);
+    return true;
 }
 
 std::string CaptionFor(const std::string& baseTitle, const std::string& partName)

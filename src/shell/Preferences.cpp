@@ -55,6 +55,7 @@ void SavePreferencesForm(const PreferencesForm& form, Preferences& preferences, 
     store.write(DefaultGroup, SettingName(Setting::DescriptionLimit), choiceText(form.descriptionLimit));
     preferences.MakeBackup = form.backup;
     preferences.LimitDescription = form.descriptionLimit;
+    LadeDefaults(preferences, store); // what the History stub and Set Preferences offer from now on
 }
 
 std::string StartFolder(const SettingsStore& store, const std::string& firstFolder)

@@ -35,8 +35,8 @@ struct PreferencesForm {
 // DefaultLicense.
 PreferencesForm OpenPreferencesForm(Preferences& preferences, const SettingsStore& store);
 
-// Saving the window: the texts trimmed, "Backup" and "DescriptionLimit" as "True" or "False", and
-// MakeBackup and LimitDescription.
+// Saving the window: the texts trimmed, "Backup" and "DescriptionLimit" as "True" or "False";
+// preferences takes every value saved.
 void SavePreferencesForm(const PreferencesForm& form, Preferences& preferences, SettingsStore& store);
 
 // The folder the Open dialog starts in: "LastPath", or firstFolder on the first run.

@@ -27,6 +27,16 @@ std::string versionText()
            std::to_string(QUILLMARK_VERSION_PATCH);
 }
 
+// The platform's keys for a standard command. Key schemes without a Quit key (Windows', which some
+// platforms use) get Ctrl+Q, which every Linux desktop uses for it.
+QList<QKeySequence> shortcutsFor(QKeySequence::StandardKey command)
+{
+    auto keys = QKeySequence::keyBindings(command);
+    if (keys.isEmpty() && command == QKeySequence::Quit)
+        keys.append(QKeySequence(Qt::CTRL | Qt::Key_Q));
+    return keys;
+}
+
 constexpr int ClientWidth = Pixels(9240);
 constexpr int ClientHeight = Pixels(8550);
 
@@ -124,16 +134,20 @@ void frmMain::createMenus()
         const char* name;
         const char* caption;
         void (frmMain::*handler)();
+        QKeySequence::StandardKey shortcut = QKeySequence::UnknownKey; // beside the access keys
     };
     static const std::pair<const char*, const char*> menus[] = {
         {"MDatei", "F&ile"}, {"MEdit", "&Edit"}, {"MEinstellungen", "&Option"}};
     static const MenuRow items[] = {
-        {"MDatei", &frmMain::MDateiOeffnen, "MDateiOeffnen", "O&pen", &frmMain::MDateiOeffnen_Click},
-        {"MDatei", &frmMain::MDateiSpeichern, "MDateiSpeichern", "&Save", &frmMain::MDateiSpeichern_Click},
+        {"MDatei", &frmMain::MDateiOeffnen, "MDateiOeffnen", "O&pen", &frmMain::MDateiOeffnen_Click,
+         QKeySequence::Open},
+        {"MDatei", &frmMain::MDateiSpeichern, "MDateiSpeichern", "&Save", &frmMain::MDateiSpeichern_Click,
+         QKeySequence::Save},
         {"MDatei", &frmMain::MTrackerCheck, "MTrackerCheck", "Check for the Parts &Tracker",
          &frmMain::MTrackerCheck_Click},
         {"MDatei", nullptr, "MDateiTrenner2", nullptr, nullptr},
-        {"MDatei", &frmMain::MDateiBeenden, "MDateiBeenden", "E&xit", &frmMain::MDateiBeenden_Click},
+        {"MDatei", &frmMain::MDateiBeenden, "MDateiBeenden", "E&xit", &frmMain::MDateiBeenden_Click,
+         QKeySequence::Quit},
         {"MEdit", &frmMain::MEditCategory, "MEditCategory", "&Category", &frmMain::MEditCategory_Click},
         {"MEdit", &frmMain::MEditPartTyps, "MEditPartTyps", "&Part Types", &frmMain::MEditPartTyps_Click},
         {"MEdit", &frmMain::MEditBFCStatement, "MEditBFCStatement", "&BFC Statements",
@@ -141,7 +155,7 @@ void frmMain::createMenus()
         {"MEdit", &frmMain::MEditLicense, "MEditLicense", "&License Types", &frmMain::MEditLicense_Click},
         {"MEinstellungen", &frmMain::MEinstellDefault, "MEinstellDefault", "Preferences",
          &frmMain::MEinstellDefault_Click},
-        {nullptr, &frmMain::MInfo, "MInfo", "?", &frmMain::MInfo_Click},
+        {nullptr, &frmMain::MInfo, "MInfo", "?", &frmMain::MInfo_Click, QKeySequence::HelpContents},
     };
     for (const auto& [name, caption] : menus)
         menuBar()->addMenu(caption)->setObjectName(name);
@@ -153,6 +167,7 @@ void frmMain::createMenus()
         }
         auto* action = menu ? menu->addAction(item.caption) : menuBar()->addAction(item.caption);
         action->setObjectName(item.name);
+        action->setShortcuts(shortcutsFor(item.shortcut));
         connect(action, &QAction::triggered, this, item.handler);
         this->*item.member = action;
     }

@@ -9,6 +9,7 @@
 
 #include "AppState.h"
 #include "ErrorReport.h"
+#include "OpenRoad.h"
 #include "SaveChecks.h"
 
 class QAction;
@@ -73,11 +74,12 @@ private:
     void connectHandlers();
 
     // Opening.
-    bool saveWithChecks(); // the Save command's checks and save; true when saved
-    // Opens the file that takeFile names; a failure is reported for procedure, and a close
-    // requested meanwhile is carried out at the end.
-    void openChosenFile(const std::function<void()>& takeFile, bool removeTabs, const Procedure& procedure);
-    void readChosenFile(const std::function<void()>& takeFile, bool removeTabs);
+    // The question before another file replaces this one; true when the open may go on.
+    bool mayReplaceDocument();
+    // Opens path; a failure is reported for procedure, and a close requested meanwhile is carried
+    // out at the end.
+    void openChosenFile(const std::string& path, OpenRoad road, const Procedure& procedure);
+    void readChosenFile(const std::string& path, OpenRoad road);
     void clearWindow();
     void fillComboBoxes();
     void fillCombo(QComboBox& combo, ListKind kind);
@@ -86,11 +88,13 @@ private:
     void showTextsFromTheirStart();
     void SelectComboItem(QComboBox& combo, const std::string& text);
     void showCaption();
+    void showModified(); // the caption's mark for unsaved changes
     void showRecentFiles();
     void finishCloseRequestedDuringOpen();
 
     // Saving.
     SaveResult checkHeaderAndSave();
+    void showSaved(const std::string& backupPath);
     void showDescriptionTooLong();
 
     // Field editing.

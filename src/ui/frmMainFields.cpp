@@ -142,8 +142,10 @@ void frmMain::MakeNewHeader()
 {
     newHeaderText_ = ComposeHeader(app_.Header);
     txNewHeader->setPlainText(shownHeader(newHeaderText_, app_.Header.Encoding));
+    // Keys that change nothing, or a letter typed and deleted again, leave the file unchanged.
     if (!app_.Header.Loading)
-        app_.Header.FileChanged = true;
+        app_.Header.FileChanged = newHeaderText_ != app_.Header.HeaderAtOpenOrSave;
+    showModified();
     showLength();
 }
 

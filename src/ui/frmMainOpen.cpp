@@ -41,7 +41,7 @@ std::optional<std::string> firstLocalFile(const QMimeData& data)
 
 void frmMain::MDateiOeffnen_Click()
 {
-    if (openInProgress() || !SavedBeforeOpen(app_, [this] { return saveWithChecks(); }))
+    if (openInProgress() || !mayReplaceDocument())
         return;
     std::string path = app_.PendingFile;
     app_.PendingFile.clear();
@@ -52,14 +52,14 @@ void frmMain::MDateiOeffnen_Click()
             return; // Cancel: the file the user was working on stays open
         path = *chosen;
     }
-    openChosenFile([&] { LadeDATDateiCommandLine(app_, path, services_); }, true, OpenCommand);
+    openChosenFile(path, OpenRoad::Chosen, OpenCommand);
 }
 
 void frmMain::OpenFile(const std::string& path)
 {
-    if (openInProgress() || !MayOpenAnotherFile(app_, services_.dialogs, [this] { return saveWithChecks(); }))
+    if (openInProgress() || !mayReplaceDocument())
         return;
-    openChosenFile([&] { TakeRecentFile(app_, path, services_); }, false, OpenRecentFile);
+    openChosenFile(path, OpenRoad::Recent, OpenRecentFile);
 }
 
 void frmMain::MRecentFile_Click(int index)
@@ -68,41 +68,48 @@ void frmMain::MRecentFile_Click(int index)
     showRecentFiles();
 }
 
-bool frmMain::saveWithChecks() { return checkHeaderAndSave().outcome == SaveOutcome::Saved; }
+bool frmMain::mayReplaceDocument()
+{
+    return MayOpenAnotherFile(app_, services_.dialogs,
+                              [this] { return checkHeaderAndSave().outcome == SaveOutcome::Saved; });
+}
 
-void frmMain::openChosenFile(const std::function<void()>& takeFile, bool removeTabs, const Procedure& procedure)
+void frmMain::openChosenFile(const std::string& path, OpenRoad road, const Procedure& procedure)
 {
     try {
-        readChosenFile(takeFile, removeTabs);
+        readChosenFile(path, road);
     } catch (const std::exception& error) {
         abandonOpen(error, procedure);
     }
     finishCloseRequestedDuringOpen();
 }
 
-void frmMain::readChosenFile(const std::function<void()>& takeFile, bool removeTabs)
+void frmMain::readChosenFile(const std::string& path, OpenRoad road)
 {
     app_.Header.Loading = true;
+    lblStatuszeile->setText("Parsing file. Please wait...");
+    const bool opened = LadeDATDateiCommandLine(app_, path, road, services_, *progress_);
+    lblStatuszeile->setText("");
+    if (!opened) { // the document that was open stays, untouched
+        app_.Header.Loading = false;
+        return;
+    }
     clearWindow();
-    BeginOpen(app_, services_);
     fillComboBoxes();
-    takeFile();
     showCaption();
     EnableControls();
-    lblStatuszeile->setText("Parsing file. Please wait...");
-    AddRecentFile(app_.Recent, services_.store, app_.Header.FilePath);
     showRecentFiles();
-    GetGlobalContent(app_.Header, services_.dialogs, *progress_);
-    lblStatuszeile->setText("");
     fillWindowFromRecord();
     // The header shown and saved is always the one composed from the file just read.
     MakeNewHeader();
-    if (removeTabs && RemoveDescriptionTabs(app_.Header, services_.dialogs)) {
+    if (road == OpenRoad::Chosen && RemoveDescriptionTabs(app_.Header, services_.dialogs)) {
         txPartDescription->setText(ToWidget(app_.Header.PartDescription, app_.Header.Encoding));
         showTextsFromTheirStart();
         MakeNewHeader();
     }
+    app_.Header.HeaderAtOpenOrSave = newHeaderText_;
     app_.Header.Loading = false;
+    showModified();
 }
 
 void frmMain::abandonOpen(const std::exception& error, const Procedure& procedure)
@@ -187,7 +194,16 @@ void frmMain::SelectComboItem(QComboBox& combo, const std::string& text)
     combo.repaint();
 }
 
-void frmMain::showCaption() { setWindowTitle(QString::fromStdString(CaptionFor(baseTitle_, app_.Header.PartName))); }
+// "[*]" is where Qt shows "*" while the file has unsaved changes; a "[*]" in the file's name is
+// doubled so that it stays text.
+void frmMain::showCaption()
+{
+    const auto caption = QString::fromStdString(CaptionFor(baseTitle_, app_.Header.PartName));
+    setWindowTitle(QString(caption).replace("[*]", "[*][*]") + "[*]");
+    showModified();
+}
+
+void frmMain::showModified() { setWindowModified(app_.Header.FileChanged); }
 
 void frmMain::showRecentFiles()
 {
@@ -219,7 +235,18 @@ SaveResult frmMain::checkHeaderAndSave()
     auto result = CheckHeaderAndSave(app_.Header, context);
     if (result.outcome == SaveOutcome::DescriptionTooLong)
         showDescriptionTooLong();
+    if (result.outcome == SaveOutcome::Saved)
+        showSaved(result.backupPath);
     return result;
+}
+
+void frmMain::showSaved(const std::string& backupPath)
+{
+    std::string status = "Saved " + app_.Header.FilePath;
+    if (!backupPath.empty())
+        status += " (backup " + DateiNurName(backupPath, services_.dialogs) + ")";
+    lblStatuszeile->setText(QFile::decodeName(QByteArray::fromStdString(status)));
+    showModified();
 }
 
 void frmMain::showDescriptionTooLong()

@@ -3,6 +3,7 @@
 #include "ParseProgress.h"
 #include "Parser.h"
 #include "ScriptedDialogs.h"
+#include "TextFile.h"
 
 namespace {
 
@@ -154,8 +155,8 @@ TEST(ParserDates, OnlyRealDaysInYearMonthDayForm)
 
 TEST(ParserTwoWordLines, UnknownWordGoesToTheBodyKnownKeywordIsDropped)
 {
-    const auto h = parseLines({"0 d", "0 STEP", "0 Torso", "0 //", "0 Name:", "0 !KEYWORDS ", "0", "0 2004-03-12",
-                               "1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat", "0 STEP"});
+    const auto h = parseLines({"0 d", "0 STEP", "0 Torso", "0 //", "0 Name:", "0 !KEYWORDS ", "0 !HELP", "0",
+                               "0 2004-03-12", "1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat", "0 STEP"});
     EXPECT_EQ(h.Body, "0 STEP\r\n0 Torso\r\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat\r\n0 STEP");
     EXPECT_EQ(h.History, (StringList{"2004-03-12 "}));
     EXPECT_TRUE(h.Keywords.empty());
@@ -205,10 +206,22 @@ TEST(ParserRecord, ASecondParseStartsFromEmptyLists)
     EXPECT_EQ(h.OldHeader, "0 b");
 }
 
-TEST(ParserAnyInput, OddBytesAreJustText)
+// A NUL byte near the start marks a binary file, which is refused; any other byte is text.
+TEST(ParserAnyInput, OddBytesAreJustTextButBinaryFilesAreRefused)
 {
-    const std::string binary("0 \0\xff\x01\r\n\0\0\r\n", 10);
-    EXPECT_EQ(parseLines({binary}).PartDescription, std::string("\0\xff\x01", 3));
+    EXPECT_EQ(parseLines({"0 \xff\x01\x7f"}).PartDescription, "\xff\x01\x7f");
+    HeaderData binary;
+    binary.FilePath = "/parts/picture.dat";
+    ScriptedDialogs dialogs;
+    ParseProgress progress;
+    try {
+        ParsePartFileContent(binary, std::string("0 d\r\n\0\x89PNG", 10), dialogs, progress);
+        ADD_FAILURE() << "a file with a NUL byte was parsed";
+    } catch (const NotTextFileError& refused) {
+        EXPECT_STREQ(refused.what(), "/parts/picture.dat is not an LDraw text file.");
+    }
+    const std::string lateNul = "0 d\r\n0 // " + std::string(64 * 1024, 'x') + std::string(1, '\0');
+    EXPECT_EQ(parseText(lateNul).PartDescription, "d") << "only the first 64 KiB are looked at";
     const auto blanks = parseLines({"0 d", "0 !KEYWORDS" + std::string(100000, ' ') + "x"});
     EXPECT_EQ(blanks.Keywords, (StringList{"x"})) << "empty words before the first word are skipped";
     const auto longLine = parseLines({"0 d", "1" + std::string(10 * 1024 * 1024, 'x')});

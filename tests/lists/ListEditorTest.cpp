@@ -58,11 +58,11 @@ TEST_F(ListEditing, AddNormalisesByMode)
 TEST_F(ListEditing, SelectionStaysOnItsEntryWhenAnAddedOneGoesBeforeIt)
 {
     auto list = editor(ListKind::Bfc, {"NOCERTIFY", "CERTIFY CW"});
-    list.select(1); // NOCERTIFY
+    list.select(0); // CERTIFY CW, which the added entry goes just before
     dialogs.expectInput("certify ccw");
     list.add();
     list.deleteSelected();
-    EXPECT_EQ(list.entries(), (StringList{"CERTIFY CCW", "CERTIFY CW"}));
+    EXPECT_EQ(list.entries(), (StringList{"CERTIFY CCW", "NOCERTIFY"}));
 }
 
 TEST_F(ListEditing, DuplicateOrCancelledAddChangesNothing)

@@ -40,9 +40,10 @@ TEST_F(PreferencesStore, LadeDefaultsTakesTheStoredValuesAndBlankAsEmpty)
     EXPECT_EQ(preferences.DefaultRealName, "Jane");
     EXPECT_EQ(preferences.DefaultUserName, "");
     EXPECT_EQ(preferences.DefaultLicense, "L");
-    SavePreferencesForm({"", "", "", true}, preferences, store);
-    LadeDefaults(preferences, store);
+    SavePreferencesForm({"", " jtester ", "  Licensed under CC BY 4.0 : see CAreadme.txt ", true}, preferences, store);
     EXPECT_EQ(preferences.DefaultRealName, "") << "a name cleared in the preferences is gone";
+    EXPECT_EQ(preferences.DefaultUserName, "jtester") << "taken at once";
+    EXPECT_EQ(store.read(DefaultGroup, "Liscense", ""), "Licensed under CC BY 4.0 : see CAreadme.txt");
 }
 
 TEST_F(PreferencesStore, LastPathOrTheProgramFolder)

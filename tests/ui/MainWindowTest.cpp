@@ -137,15 +137,25 @@ TEST_F(WindowTest, KeysMeantForMenusDialogsAndOtherWindowsAreNoEdits)
     EXPECT_TRUE(window->close());
 }
 
-TEST_F(WindowTest, PassingThroughABoxMarksTheFileChanged)
+// Only a header that a save would write differently marks the file: keys that change no text, a
+// letter typed and deleted again, and passing through the boxes leave it unchanged.
+TEST_F(WindowTest, OnlyAChangedHeaderMarksTheFile)
 {
     startUp();
     openThroughPendingFile(part("3001.dat", GoodPart));
-    auto* userName = child<QLineEdit>("txAuthorUserName");
-    userName->setFocus();
-    QTest::mouseClick(child<QLineEdit>("txAuthorRealName"), Qt::LeftButton);
-    child<QLineEdit>("txAuthorRealName")->setFocus(Qt::MouseFocusReason);
+    auto* description = child<QLineEdit>("txPartDescription");
+    description->setFocus();
+    QTest::keyClick(description, Qt::Key_End);
+    QTest::keyClick(description, Qt::Key_Left);
+    EXPECT_FALSE(app.Header.FileChanged);
+    QTest::keyClicks(description, "x");
     EXPECT_TRUE(app.Header.FileChanged);
+    EXPECT_EQ(caption(), "Quillmark 1.0.0 [3001.dat]*");
+    QTest::keyClick(description, Qt::Key_Backspace);
+    child<QLineEdit>("txAuthorRealName")->setFocus(Qt::MouseFocusReason);
+    EXPECT_FALSE(app.Header.FileChanged);
+    EXPECT_EQ(caption(), "Quillmark 1.0.0 [3001.dat]");
+    EXPECT_TRUE(window->close()) << "closes without a question";
 }
 
 TEST_F(WindowTest, EnterMovesTheFocusAlongTheFields)
@@ -252,7 +262,8 @@ TEST_F(WindowTest, EveryRoadThatSavesAsksBeforeOverwritingAnotherProgramsChanges
     openThroughPendingFile(path);
     window->show();
     app.Prefs.MakeBackup = false;
-    app.Header.FileChanged = true;
+    auto* bfc = child<QComboBox>("cbBFCStatement");
+    bfc->setCurrentIndex(bfc->findText("CERTIFY CW"));
     const std::string theirs = GoodPart + "1 16 0 0 0 1 0 0 0 1 0 0 0 1 theirs.dat\r\n";
     TempDir::writeTo(path, theirs);
 
@@ -263,9 +274,10 @@ TEST_F(WindowTest, EveryRoadThatSavesAsksBeforeOverwritingAnotherProgramsChanges
     dialogs.expectMessage(Answer::Yes); // the close question
     dialogs.expectMessage(Answer::No);
     EXPECT_FALSE(window->close());
+    dialogs.expectMessage(Answer::Yes); // the open question
     dialogs.expectMessage(Answer::No);
     openThroughPendingFile(part("other.dat", "0 Other\r\n"));
-    EXPECT_EQ(caption(), "Quillmark 1.0.0 [3001.dat]");
+    EXPECT_EQ(caption(), "Quillmark 1.0.0 [3001.dat]*");
     EXPECT_EQ(ReadBytes(path), theirs);
     EXPECT_TRUE(app.Header.FileChanged);
 }

@@ -1,5 +1,6 @@
 #include "WindowFixture.h"
 
+#include <QDropEvent>
 #include <QLabel>
 #include <QLineEdit>
 #include <filesystem>
@@ -37,6 +38,14 @@ void WindowTest::openThroughPendingFile(const std::string& path)
 {
     app.PendingFile = path;
     window->MDateiOeffnen_Click();
+}
+
+void Drop(QWidget& target, QMimeData& data)
+{
+    QDragEnterEvent enter(QPoint(10, 10), Qt::CopyAction, &data, Qt::LeftButton, Qt::NoModifier);
+    QApplication::sendEvent(&target, &enter);
+    QDropEvent event(QPointF(10, 10), Qt::CopyAction, &data, Qt::LeftButton, Qt::NoModifier);
+    QApplication::sendEvent(&target, &event);
 }
 
 QStringList RowsOf(const QListWidget& list)

@@ -3,6 +3,7 @@
 #include <QApplication>
 #include <QListWidget>
 #include <QTimer>
+#include <QWindow>
 #include <functional>
 #include <gtest/gtest.h>
 #include <memory>
@@ -33,7 +34,8 @@ protected:
         EXPECT_NE(found, nullptr) << name;
         return found;
     }
-    std::string caption() const { return window->windowTitle().toStdString(); }
+    // The caption as the window system shows it, with "*" while the file has unsaved changes.
+    std::string caption() const { return window->windowHandle()->title().toStdString(); }
     std::string text(const char* name) const;
     // Runs act on the next modal dialog of type T once it shows, while the caller's exec() waits.
     template <typename T>
@@ -60,6 +62,9 @@ protected:
 private:
     void pollForDialog(std::function<bool(QWidget*)> act);
 };
+
+// A drag that enters target and is dropped there, as the window system delivers it.
+void Drop(QWidget& target, QMimeData& data);
 
 // The texts of a list's rows, top to bottom.
 QStringList RowsOf(const QListWidget& list);
