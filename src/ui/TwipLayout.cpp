@@ -1,6 +1,8 @@
 #include "TwipLayout.h"
 
 #include <QAbstractButton>
+#include <QFontMetricsF>
+#include <QImage>
 #include <QLabel>
 #include <QPushButton>
 #include <QStyle>
@@ -23,6 +25,18 @@ int widthForCaption(const QWidget& control)
 }
 
 } // namespace
+
+double LayoutScale(const QFont& font)
+{
+    QFont design(font);
+    design.setPointSizeF(8);
+    QImage at96Dpi(1, 1, QImage::Format_RGB32);
+    const int dotsPerMeter = 3780; // 96 dpi
+    at96Dpi.setDotsPerMeterX(dotsPerMeter);
+    at96Dpi.setDotsPerMeterY(dotsPerMeter);
+    const double scale = QFontMetricsF(font).height() / QFontMetricsF(design, &at96Dpi).height();
+    return std::max(scale, 1.0);
+}
 
 void WidenToShowCaption(QWidget& control)
 {

@@ -4,16 +4,30 @@
 #include <initializer_list>
 #include <variant>
 
-// The windows were laid out in twips; at 15 twips per pixel.
+// The windows were laid out in twips for an 8 pt dialog font at 96 dpi: 15 twips a pixel.
 constexpr int Pixels(int twips) { return twips / 15; }
+
+// How much larger than the design the window font is, by the height of its lines: 1 for the 8 pt
+// design font at 96 dpi and anything smaller, 1.5 at 144 dpi, about 1.7 for a 14 pt font. The
+// whole layout grows by it, so that captions fit and no control runs into another.
+double LayoutScale(const QFont& font);
+
+// Twips in pixels of a layout grown by scale; exactly Pixels(twips) at scale 1.
+inline int Pixels(int twips, double scale) { return static_cast<int>(twips * scale / 15); }
+
+// Places control at the given twips, grown by scale.
+inline void PlaceAt(QWidget& control, int left, int top, int width, int height, double scale = 1)
+{
+    control.setGeometry(Pixels(left, scale), Pixels(top, scale), Pixels(width, scale), Pixels(height, scale));
+}
 
 // A new child of parent named name, placed at the given twips.
 template <typename Widget>
-Widget* PlaceChild(QWidget* parent, const char* name, int left, int top, int width, int height)
+Widget* PlaceChild(QWidget* parent, const char* name, int left, int top, int width, int height, double scale = 1)
 {
     auto* widget = new Widget(parent);
     widget->setObjectName(name);
-    widget->setGeometry(Pixels(left), Pixels(top), Pixels(width), Pixels(height));
+    PlaceAt(*widget, left, top, width, height, scale);
     return widget;
 }
 
@@ -24,9 +38,10 @@ void WidenToShowCaption(QWidget& control);
 
 // The same for a control that shows a caption (label, button, check box, frame).
 template <typename Widget>
-Widget* PlaceCaptioned(QWidget* parent, const char* name, const char* caption, int left, int top, int width, int height)
+Widget* PlaceCaptioned(QWidget* parent, const char* name, const char* caption, int left, int top, int width, int height,
+                       double scale = 1)
 {
-    auto* widget = PlaceChild<Widget>(parent, name, left, top, width, height);
+    auto* widget = PlaceChild<Widget>(parent, name, left, top, width, height, scale);
     if constexpr (requires { widget->setTitle(caption); })
         widget->setTitle(caption);
     else
@@ -45,10 +60,12 @@ struct ControlRow {
     int left, top, width, height;
 };
 
-// Builds every control of rows (ControlRows of Window) on parent, each into its member of window.
+// Builds every control of rows (ControlRows of Window) on parent, each into its member of window,
+// laid out for the parent's font.
 template <typename Window, typename Rows>
 void BuildControls(Window& window, QWidget* parent, const Rows& rows)
 {
+    const double scale = LayoutScale(parent->font());
     for (const auto& row : rows)
         std::visit(
             [&](auto member) {
@@ -58,11 +75,27 @@ void BuildControls(Window& window, QWidget* parent, const Rows& rows)
                 if constexpr (captioned) {
                     if (row.caption != nullptr) {
                         window.*member = PlaceCaptioned<Widget>(parent, row.name, row.caption, row.left, row.top,
-                                                                row.width, row.height);
+                                                                row.width, row.height, scale);
                         return;
                     }
                 }
-                window.*member = PlaceChild<Widget>(parent, row.name, row.left, row.top, row.width, row.height);
+                window.*member = PlaceChild<Widget>(parent, row.name, row.left, row.top, row.width, row.height, scale);
+            },
+            row.member);
+}
+
+// Places the controls that BuildControls built from rows again, grown by scale: for a window
+// whose font changed after it was built.
+template <typename Window, typename Rows>
+void LayOutControls(Window& window, const Rows& rows, double scale)
+{
+    for (const auto& row : rows)
+        std::visit(
+            [&](auto member) {
+                QWidget& control = *(window.*member);
+                PlaceAt(control, row.left, row.top, row.width, row.height, scale);
+                if (row.caption != nullptr)
+                    WidenToShowCaption(control);
             },
             row.member);
 }

@@ -5,7 +5,10 @@
 
 void UseWindowFont()
 {
+    constexpr double DesignPoints = 8;
+    constexpr double LargestUsualPoints = 12;
     QFont font = QApplication::font();
-    font.setPointSizeF(8);
+    if (font.pointSizeF() <= LargestUsualPoints) // a font sized in pixels has no points (-1)
+        font.setPointSizeF(DesignPoints);
     QApplication::setFont(font);
 }

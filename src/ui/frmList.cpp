@@ -16,7 +16,8 @@ frmList::frmList(ListKind kind, const StringList& entries, const std::string& pr
     setObjectName("frmList");
     setWindowTitle(QString("List") + InfoOf(kind).captionSuffix);
     setModal(true);
-    setFixedSize(Pixels(6645), Pixels(4155));
+    const double scale = LayoutScale(font());
+    setFixedSize(Pixels(6645, scale), Pixels(4155, scale));
     using Row = ControlRow<frmList, QGroupBox, QListWidget, QPushButton, QLineEdit>;
     static const Row rows[] = {
         {&frmList::Frame1, "Frame1", "Current Values", 120, 840, 4935, 3255},

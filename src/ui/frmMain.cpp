@@ -11,6 +11,8 @@
 #include <QMenuBar>
 #include <QPlainTextEdit>
 #include <QPushButton>
+#include <QScreen>
+#include <QScrollArea>
 
 #include "Dialogs.h"
 #include "OpenRoad.h"
@@ -37,8 +39,9 @@ QList<QKeySequence> shortcutsFor(QKeySequence::StandardKey command)
     return keys;
 }
 
-constexpr int ClientWidth = Pixels(9240);
-constexpr int ClientHeight = Pixels(8550);
+// The client area in twips.
+constexpr int ClientWidth = 9240;
+constexpr int ClientHeight = 8550;
 
 } // namespace
 
@@ -51,10 +54,16 @@ frmMain::frmMain(AppState& app, Services& services, QWidget* parent)
     Q_INIT_RESOURCE(resources);
     setWindowIcon(QIcon(":/quillmark.png"));
     setAcceptDrops(true);
-    auto* client = new QWidget(this);
+    // The client area scrolls only where the screen is too small for the window grown with its font.
+    auto* scroller = new QScrollArea(this);
+    scroller->setObjectName("scroller");
+    scroller->setFrameShape(QFrame::NoFrame);
+    auto* client = new QWidget;
     client->setObjectName("client");
-    client->setFixedSize(ClientWidth, ClientHeight);
-    setCentralWidget(client);
+    const double scale = LayoutScale(font());
+    client->setFixedSize(Pixels(ClientWidth, scale), Pixels(ClientHeight, scale));
+    scroller->setWidget(client);
+    setCentralWidget(scroller);
     createControls();
     createMenus();
     setTabOrder();
@@ -63,6 +72,7 @@ frmMain::frmMain(AppState& app, Services& services, QWidget* parent)
                                                           cbPartTypes, cbLicenses, cbBFCStatement, cbCategory})
         field->installEventFilter(this);
     layout()->setSizeConstraint(QLayout::SetFixedSize);
+    layOut();
 }
 
 frmMain::~frmMain() = default;
@@ -113,7 +123,8 @@ void frmMain::createControls()
         {&frmMain::Line1, "Line1", nullptr, 0, 0, 9240, 15},
         {&frmMain::Line2, "Line2", nullptr, 0, 10, 9240, 15},
     };
-    BuildControls(*this, centralWidget(), rows);
+    BuildControls(*this, findChild<QWidget*>("client"), rows);
+    layOutControls_ = [this](double scale) { LayOutControls(*this, rows, scale); };
     lblLength->setAutoFillBackground(true);
     for (QPlainTextEdit* box : {txNewHeader, txOldHeader}) {
         box->setReadOnly(true);
@@ -201,6 +212,45 @@ void frmMain::setTabOrder()
         text->setFocusPolicy(Qt::NoFocus);
 }
 
+// The twip layout grown with the window font; called again whenever the font changes (a desktop
+// theme may set its font once the window exists).
+void frmMain::layOut()
+{
+    const double scale = LayoutScale(font());
+    auto* client = findChild<QWidget*>("client");
+    client->setFixedSize(Pixels(ClientWidth, scale), Pixels(ClientHeight, scale)); // first: captions grow inside it
+    layOutControls_(scale);
+    const int width = client->width();
+    Line1->setGeometry(0, 0, width, 1);
+    Line2->setGeometry(0, 1, width, 1);
+    lblStatuszeile->setGeometry(0, client->height() - lblStatuszeile->height(), width, lblStatuszeile->height());
+    fitOnScreen(client->size());
+}
+
+// A window larger than the screen opens at the screen's size, its client area scrolling.
+void frmMain::fitOnScreen(QSize clientSize)
+{
+    QSize room = clientSize;
+    if (const QScreen* shownOn = screen()) {
+        // What the menu bar and the window manager's frame (once known) take.
+        const QSize frame = frameGeometry().size() - geometry().size();
+        const QSize decoration(frame.width(), frame.height() + menuBar()->sizeHint().height());
+        room = room.boundedTo(shownOn->availableGeometry().size() - decoration);
+    }
+    auto* scroller = findChild<QScrollArea*>("scroller");
+    scroller->setFixedSize(room);
+    const auto bars = room == clientSize ? Qt::ScrollBarAlwaysOff : Qt::ScrollBarAsNeeded;
+    scroller->setHorizontalScrollBarPolicy(bars);
+    scroller->setVerticalScrollBarPolicy(bars);
+}
+
+void frmMain::changeEvent(QEvent* event)
+{
+    if (event->type() == QEvent::FontChange && layOutControls_)
+        layOut();
+    QMainWindow::changeEvent(event);
+}
+
 void frmMain::EnableControls()
 {
     const bool enabled = app_.Header.FileLoaded;
@@ -223,9 +273,6 @@ void frmMain::StartUp(const QStringList& arguments)
     fillComboBoxes();
     baseTitle_ = "Quillmark " + versionText();
     setWindowTitle(QString::fromStdString(baseTitle_));
-    Line1->setGeometry(0, 0, ClientWidth, 1);
-    Line2->setGeometry(0, 1, ClientWidth, 1);
-    lblStatuszeile->setGeometry(0, ClientHeight - lblStatuszeile->height(), ClientWidth, lblStatuszeile->height());
     lblStatuszeile->setText("Welcome to Quillmark programm.");
     // The shell hands the arguments over already split: the first one is the path, blanks and all.
     // It is remembered in full, so that the recent files still find it from another folder.

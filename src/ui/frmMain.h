@@ -64,6 +64,7 @@ protected:
     void dragEnterEvent(QDragEnterEvent* event) override;
     void dropEvent(QDropEvent* event) override;
     bool eventFilter(QObject* watched, QEvent* event) override;
+    void changeEvent(QEvent* event) override;
 
 private:
     // Building the window.
@@ -72,6 +73,8 @@ private:
     void addRecentFileItems(QMenu& menu);
     void setTabOrder();
     void connectHandlers();
+    void layOut();
+    void fitOnScreen(QSize clientSize);
 
     // Opening.
     // The question before another file replaces this one; true when the open may go on.
@@ -119,6 +122,7 @@ private:
 
     AppState& app_;
     Services& services_;
+    std::function<void(double scale)> layOutControls_; // places the controls for a font
     std::string baseTitle_;
     std::string newHeaderText_;
     bool closeRequestedDuringOpen_ = false;

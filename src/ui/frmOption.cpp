@@ -13,7 +13,8 @@ frmOption::frmOption(const PreferencesForm& form, const QStringList& sortedLicen
     setObjectName("frmOption");
     setWindowTitle("Preferences");
     setModal(true);
-    setFixedSize(Pixels(7455), Pixels(2250));
+    const double scale = LayoutScale(font());
+    setFixedSize(Pixels(7455, scale), Pixels(2250, scale));
     using Row = ControlRow<frmOption, QLabel, QLineEdit, QPushButton, QComboBox, QCheckBox>;
     static const Row rows[] = {
         {&frmOption::Label1, "Label1", "Your Real Name", 120, 240, 1215, 255},

@@ -7,6 +7,8 @@
 #include <QListWidget>
 #include <QMimeData>
 #include <QPushButton>
+#include <QRegularExpression>
+#include <QScreen>
 #include <QTableWidget>
 #include <QTest>
 #include <filesystem>
@@ -93,27 +95,55 @@ TEST_F(ListMenuTest, TrackerCheckShowsTheFindingsAndChangesNothing)
     EXPECT_FALSE(app.Header.FileChanged);
 }
 
-// Every caption shows whole in the window font: its text is no wider than the room the control
-// leaves it, and the control lies inside its window.
-TEST_F(WindowTest, EveryCaptionOfTheThreeWindowsShowsWhole)
+// Two controls of one parent that cover each other by more than the design's own one-pixel
+// touches, grown with the font.
+bool overlap(const QWidget& a, const QWidget& b)
 {
-    startUp();
-    frmList list(ListKind::Category, {"<none>"}, app.ProgramFolder, dialogs);
-    frmOption options(PreferencesForm{}, {});
-    for (const QWidget* shown : std::initializer_list<const QWidget*>{window.get(), &list, &options}) {
-        for (const auto* control : shown->findChildren<QWidget*>())
-            EXPECT_LE(control->geometry().right(), control->parentWidget()->width() - 1)
-                << control->objectName().toStdString();
-        for (const auto* label : shown->findChildren<QLabel*>())
-            EXPECT_LE(label->fontMetrics().horizontalAdvance(label->text()), label->contentsRect().width())
-                << label->objectName().toStdString();
-        for (const auto* button : shown->findChildren<QAbstractButton*>()) {
-            const auto caption = QString(button->text()).remove('&');
-            const int indicator = qobject_cast<const QCheckBox*>(button) ? 20 : 0;
-            EXPECT_LE(button->fontMetrics().horizontalAdvance(caption) + indicator + 4, button->width())
-                << button->objectName().toStdString();
+    const QRect both = a.geometry().intersected(b.geometry());
+    return both.width() > 2 && both.height() > 2;
+}
+
+// Every caption shows whole in the window font, at the design's 8 pt and at 14 pt: its text is no
+// wider than the room the control leaves it, the control lies inside its window and covers no
+// other, and the main window stays on the screen.
+TEST_F(WindowTest, EveryCaptionOfTheThreeWindowsShowsWholeAtAnyFontSize)
+{
+    const QFont designFont = QApplication::font();
+    for (const double points : {8.0, 14.0}) {
+        QFont font = designFont;
+        font.setPointSizeF(points);
+        QApplication::setFont(font);
+        startUp();
+        frmList list(ListKind::Category, {"<none>"}, app.ProgramFolder, dialogs);
+        frmOption options(PreferencesForm{}, {});
+        for (const QWidget* shown : std::initializer_list<const QWidget*>{window.get(), &list, &options}) {
+            const auto controls =
+                shown->findChildren<QWidget*>(QRegularExpression("^(Label|lbl|tx|cb|ls|cmd|chk|Frame)"));
+            for (const auto* control : controls) {
+                const auto name = control->objectName().toStdString() + " at " + std::to_string(points) + " pt";
+                EXPECT_LE(control->geometry().right(), control->parentWidget()->width() - 1) << name;
+                for (const auto* other : controls) {
+                    if (other < control && other->parentWidget() == control->parentWidget()) {
+                        EXPECT_FALSE(overlap(*control, *other))
+                            << name << " covers " << other->objectName().toStdString();
+                    }
+                }
+            }
+            for (const auto* label : shown->findChildren<QLabel*>())
+                EXPECT_LE(label->fontMetrics().horizontalAdvance(label->text()), label->contentsRect().width())
+                    << label->objectName().toStdString() << " at " << points << " pt";
+            for (const auto* button : shown->findChildren<QAbstractButton*>()) {
+                const auto caption = QString(button->text()).remove('&');
+                const int indicator = qobject_cast<const QCheckBox*>(button) ? 20 : 0;
+                EXPECT_LE(button->fontMetrics().horizontalAdvance(caption) + indicator + 4, button->width())
+                    << button->objectName().toStdString() << " at " << points << " pt";
+            }
         }
+        const QSize screen = window->screen()->availableGeometry().size();
+        EXPECT_LE(window->height(), screen.height()) << points << " pt";
+        EXPECT_LE(window->width(), screen.width()) << points << " pt";
     }
+    QApplication::setFont(designFont);
 }
 
 TEST_F(WindowTest, PreferencesWindowWithAnEmptyStore)
