@@ -13,6 +13,7 @@
 #include <QPushButton>
 #include <QScreen>
 #include <QScrollArea>
+#include <QStyle>
 
 #include "Dialogs.h"
 #include "OpenRoad.h"
@@ -58,6 +59,7 @@ frmMain::frmMain(AppState& app, Services& services, QWidget* parent)
     auto* scroller = new QScrollArea(this);
     scroller->setObjectName("scroller");
     scroller->setFrameShape(QFrame::NoFrame);
+    scroller->setFocusPolicy(Qt::NoFocus); // the focus starts in the description, not on the frame around it
     auto* client = new QWidget;
     client->setObjectName("client");
     const double scale = LayoutScale(font());
@@ -232,16 +234,27 @@ void frmMain::fitOnScreen(QSize clientSize)
 {
     QSize room = clientSize;
     if (const QScreen* shownOn = screen()) {
-        // What the menu bar and the window manager's frame (once known) take.
-        const QSize frame = frameGeometry().size() - geometry().size();
-        const QSize decoration(frame.width(), frame.height() + menuBar()->sizeHint().height());
-        room = room.boundedTo(shownOn->availableGeometry().size() - decoration);
+        const QSize available = shownOn->availableGeometry().size() - QSize(0, menuBar()->sizeHint().height());
+        // Only a window too large for the screen leaves room for the frame too: a window that
+        // fits without it keeps its design size.
+        if (clientSize.boundedTo(available) != clientSize)
+            room = clientSize.boundedTo(available - windowFrameSize());
     }
     auto* scroller = findChild<QScrollArea*>("scroller");
     scroller->setFixedSize(room);
     const auto bars = room == clientSize ? Qt::ScrollBarAlwaysOff : Qt::ScrollBarAsNeeded;
     scroller->setHorizontalScrollBarPolicy(bars);
     scroller->setVerticalScrollBarPolicy(bars);
+}
+
+// The window manager's frame: known once the window shows, guessed from the style before.
+QSize frmMain::windowFrameSize() const
+{
+    const QSize frame = frameGeometry().size() - geometry().size();
+    if (!frame.isEmpty())
+        return frame;
+    const int border = 4;
+    return {2 * border, style()->pixelMetric(QStyle::PM_TitleBarHeight) + 2 * border};
 }
 
 void frmMain::changeEvent(QEvent* event)

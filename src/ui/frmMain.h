@@ -75,6 +75,7 @@ private:
     void connectHandlers();
     void layOut();
     void fitOnScreen(QSize clientSize);
+    QSize windowFrameSize() const;
 
     // Opening.
     // The question before another file replaces this one; true when the open may go on.

@@ -86,6 +86,7 @@ void frmMain::openChosenFile(const std::string& path, OpenRoad road, const Proce
 
 void frmMain::readChosenFile(const std::string& path, OpenRoad road)
 {
+    const bool firstFile = !app_.Header.FileLoaded;
     app_.Header.Loading = true;
     lblStatuszeile->setText("Parsing file. Please wait...");
     const bool opened = LadeDATDateiCommandLine(app_, path, road, services_, *progress_);
@@ -98,6 +99,8 @@ void frmMain::readChosenFile(const std::string& path, OpenRoad road)
     fillComboBoxes();
     showCaption();
     EnableControls();
+    if (firstFile) // the fields were disabled when the window took the focus
+        txPartDescription->setFocus(Qt::OtherFocusReason);
     showRecentFiles();
     fillWindowFromRecord();
     // The header shown and saved is always the one composed from the file just read.
@@ -198,7 +201,9 @@ void frmMain::SelectComboItem(QComboBox& combo, const std::string& text)
 // doubled so that it stays text.
 void frmMain::showCaption()
 {
-    const auto caption = QString::fromStdString(CaptionFor(baseTitle_, app_.Header.PartName));
+    // The name of the file as it is on disk; its "Name:" line may say another.
+    const auto caption =
+        QString::fromStdString(CaptionFor(baseTitle_, DateiNurName(app_.Header.FilePath, services_.dialogs)));
     setWindowTitle(QString(caption).replace("[*]", "[*][*]") + "[*]");
     showModified();
 }

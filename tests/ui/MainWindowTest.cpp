@@ -38,9 +38,10 @@ TEST_F(WindowTest, StartsWithDisabledControlsAndEmptyLists)
 
 TEST_F(WindowTest, OpensTheFileNamedOnTheCommandLine)
 {
-    const auto path = part("3001.dat", GoodPart);
+    const auto path = part("copy of 3001.dat", GoodPart);
     startUp({QString::fromStdString(path)});
-    EXPECT_EQ(caption(), "Quillmark 1.0.0 [3001.dat]");
+    EXPECT_EQ(caption(), "Quillmark 1.0.0 [copy of 3001.dat]") << "the name on disk, not the Name: line's";
+    EXPECT_EQ(window->focusWidget(), child<QWidget>("txPartDescription")) << "typing goes into the first field";
     EXPECT_EQ(QApplication::overrideCursor(), nullptr) << "the busy pointer is gone";
     EXPECT_EQ(text("txPartDescription"), "Brick  2 x 4");
     EXPECT_EQ(child<QLineEdit>("txPartDescription")->cursorPosition(), 0) << "a long text shows its start";
