@@ -13,7 +13,6 @@
 #include <QPushButton>
 #include <QScreen>
 #include <QScrollArea>
-#include <QStyle>
 
 #include "Dialogs.h"
 #include "OpenRoad.h"
@@ -229,16 +228,15 @@ void frmMain::layOut()
     fitOnScreen(client->size());
 }
 
-// A window larger than the screen opens at the screen's size, its client area scrolling.
+// A window larger than the screen opens at the screen's size, its client area scrolling. The
+// window manager's frame counts once it is known: see moveEvent.
 void frmMain::fitOnScreen(QSize clientSize)
 {
     QSize room = clientSize;
     if (const QScreen* shownOn = screen()) {
-        const QSize available = shownOn->availableGeometry().size() - QSize(0, menuBar()->sizeHint().height());
-        // Only a window too large for the screen leaves room for the frame too: a window that
-        // fits without it keeps its design size.
-        if (clientSize.boundedTo(available) != clientSize)
-            room = clientSize.boundedTo(available - windowFrameSize());
+        const QSize frame = frameGeometry().size() - geometry().size();
+        const QSize decoration(frame.width(), frame.height() + menuBar()->sizeHint().height());
+        room = room.boundedTo(shownOn->availableGeometry().size() - decoration);
     }
     auto* scroller = findChild<QScrollArea*>("scroller");
     scroller->setFixedSize(room);
@@ -247,14 +245,12 @@ void frmMain::fitOnScreen(QSize clientSize)
     scroller->setVerticalScrollBarPolicy(bars);
 }
 
-// The window manager's frame: known once the window shows, guessed from the style before.
-QSize frmMain::windowFrameSize() const
+// The window manager frames the window only after it shows, and moves it then.
+void frmMain::moveEvent(QMoveEvent* event)
 {
-    const QSize frame = frameGeometry().size() - geometry().size();
-    if (!frame.isEmpty())
-        return frame;
-    const int border = 4;
-    return {2 * border, style()->pixelMetric(QStyle::PM_TitleBarHeight) + 2 * border};
+    QMainWindow::moveEvent(event);
+    if (layOutControls_)
+        fitOnScreen(findChild<QWidget*>("client")->size());
 }
 
 void frmMain::changeEvent(QEvent* event)

@@ -65,6 +65,7 @@ protected:
     void dropEvent(QDropEvent* event) override;
     bool eventFilter(QObject* watched, QEvent* event) override;
     void changeEvent(QEvent* event) override;
+    void moveEvent(QMoveEvent* event) override;
 
 private:
     // Building the window.
@@ -75,7 +76,6 @@ private:
     void connectHandlers();
     void layOut();
     void fitOnScreen(QSize clientSize);
-    QSize windowFrameSize() const;
 
     // Opening.
     // The question before another file replaces this one; true when the open may go on.
