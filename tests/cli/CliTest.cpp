@@ -65,6 +65,10 @@ TEST(CliFields, OneJsonLinePerFileAndTheUnreadableNamedOnStandardError)
     EXPECT_EQ(json["Body"], "0 Caf\u00e9\r\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 3001s01.dat");
     EXPECT_NE(run.err.find("A TAB character was found"), std::string::npos);
     EXPECT_NE(run.err.find("cannot read " + dir.file("missing.dat")), std::string::npos);
+    const auto binary = RunCliWith({"fields", dir.write("picture.dat", std::string("\x89PNG\r\n\0\0", 8))});
+    EXPECT_EQ(binary.status, 2);
+    EXPECT_EQ(binary.out, "");
+    EXPECT_EQ(binary.err, "quillmark-cli: " + dir.file("picture.dat") + " is not an LDraw text file.\n");
 }
 
 // A byte order mark before the first line is kept there, and the header after it is read.
