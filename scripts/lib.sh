@@ -5,20 +5,27 @@ QUILLMARK_ROOT="$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd)"
 
 # The packages every build needs; scripts add their own.
 QUILLMARK_PACKAGES=(cmake ninja-build g++ qt6-base-dev libcli11-dev nlohmann-json3-dev libgtest-dev libgmock-dev
-                    libgl-dev fonts-dejavu-core help2man desktop-file-utils libxml2-utils appstream clang-format)
+                    libgl-dev fonts-dejavu-core help2man desktop-file-utils libxml2-utils appstream clang-format
+                    shared-mime-info libglib2.0-bin xdg-utils weston qt6-wayland xvfb x11-utils)
 
+# A package counts as present once installed, also while its triggers still wait to run.
+# apt waits up to two minutes for the dpkg lock when another apt run holds it.
 ensure_packages() {
     local missing=()
     local package
     for package in "$@"; do
-        dpkg-query -W -f='${Status}' "$package" 2>/dev/null | grep -q 'install ok installed' || missing+=("$package")
+        case "$(dpkg-query -W -f='${db:Status-Status}' "$package" 2>/dev/null)" in
+            installed | triggers-pending | triggers-awaited) ;;
+            *) missing+=("$package") ;;
+        esac
     done
     [ ${#missing[@]} -eq 0 ] && return 0
     echo "Installing: ${missing[*]}" >&2
     local sudo=""
     [ "$(id -u)" -ne 0 ] && sudo="sudo"
-    $sudo apt-get update -qq
-    DEBIAN_FRONTEND=noninteractive $sudo apt-get install -y -qq --no-install-recommends "${missing[@]}" >&2
+    local apt=(apt-get -o DPkg::Lock::Timeout=120)
+    $sudo "${apt[@]}" update -qq
+    DEBIAN_FRONTEND=noninteractive $sudo "${apt[@]}" install -y -qq --no-install-recommends "${missing[@]}" >&2
 }
 
 # configure_and_build BUILD_DIR [cmake options...]
