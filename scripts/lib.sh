@@ -42,13 +42,35 @@ cpp_files() {
         \( -name '*.cpp' -o -name '*.h' \) "$@"
 }
 
-# Fails with the files to format when any file is not formatted as .clang-format says.
+# The licence of every source file, named in its first line (after a "#!" line).
+LICENCE_ID="SPDX-License-Identifier: MIT"
+
+# licensed_files: "MARK<tab>FILE" for every source file, MARK being its language's comment.
+licensed_files() {
+    cpp_files -printf '//\t%p\n'
+    find "$QUILLMARK_ROOT/CMakeLists.txt" "$QUILLMARK_ROOT"/{src,tests,bench,fuzz,packaging,scripts,.ci} -type f \
+        \( -name CMakeLists.txt -o -name '*.cmake' -o -name '*.sh' -o -perm -u+x \) -printf '#\t%p\n'
+}
+
+# unlicensed_files: the lines of licensed_files whose file lacks the licence line.
+unlicensed_files() {
+    local mark file first
+    licensed_files | while IFS=$'\t' read -r mark file; do
+        first="$(head -n 1 "$file")"
+        [[ "$first" == '#!'* ]] && first="$(sed -n 2p "$file")"
+        [ "$first" = "$mark $LICENCE_ID" ] || printf '%s\t%s\n' "$mark" "$file"
+    done
+}
+
+# Fails with the files to format when any file is not formatted as .clang-format says, or
+# lacks its licence line.
 check_format() {
-    local unformatted
+    local unformatted unlicensed
     unformatted=$(cpp_files -exec clang-format --dry-run --Werror {} + 2>&1 | grep -o '^[^:]*\.\(cpp\|h\)' | sort -u || true)
-    if [ -n "$unformatted" ]; then
-        echo "These files are not formatted; run scripts/format:" >&2
-        echo "$unformatted" >&2
+    unlicensed=$(unlicensed_files | cut -f 2)
+    if [ -n "$unformatted" ] || [ -n "$unlicensed" ]; then
+        echo "These files are not formatted or lack the line \"$LICENCE_ID\"; run scripts/format:" >&2
+        printf '%s\n' $unformatted $unlicensed >&2
         return 1
     fi
 }
