@@ -5,11 +5,9 @@
 function(_quillmark_add_release version date notes)
   # The notes' lines joined for AppStream, kept as they are for the changelog's one item.
   string(REPLACE "\n" " " paragraph "${notes}")
-  foreach(character "&;&amp;" "<;&lt;" ">;&gt;")
-    list(GET character 0 from)
-    list(GET character 1 to)
-    string(REPLACE "${from}" "${to}" paragraph "${paragraph}")
-  endforeach()
+  string(REPLACE "&" "&amp;" paragraph "${paragraph}")
+  string(REPLACE "<" "&lt;" paragraph "${paragraph}")
+  string(REPLACE ">" "&gt;" paragraph "${paragraph}")
   string(APPEND releases_xml
     "    <release version=\"${version}\" date=\"${date}\">\n"
     "      <description>\n        <p>${paragraph}</p>\n      </description>\n    </release>\n")
