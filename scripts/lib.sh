@@ -5,20 +5,27 @@ QUILLMARK_ROOT="$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd)"
 
 # The packages every build needs; scripts add their own.
 QUILLMARK_PACKAGES=(cmake ninja-build g++ qt6-base-dev libcli11-dev nlohmann-json3-dev libgtest-dev libgmock-dev
-                    libgl-dev fonts-dejavu-core help2man desktop-file-utils libxml2-utils appstream clang-format)
+                    libgl-dev fonts-dejavu-core help2man desktop-file-utils libxml2-utils appstream clang-format
+                    shared-mime-info libglib2.0-bin xdg-utils weston qt6-wayland xvfb x11-utils)
 
+# A package counts as present once installed, also while its triggers still wait to run.
+# apt waits up to two minutes for the dpkg lock when another apt run holds it.
 ensure_packages() {
     local missing=()
     local package
     for package in "$@"; do
-        dpkg-query -W -f='${Status}' "$package" 2>/dev/null | grep -q 'install ok installed' || missing+=("$package")
+        case "$(dpkg-query -W -f='${db:Status-Status}' "$package" 2>/dev/null)" in
+            installed | triggers-pending | triggers-awaited) ;;
+            *) missing+=("$package") ;;
+        esac
     done
     [ ${#missing[@]} -eq 0 ] && return 0
     echo "Installing: ${missing[*]}" >&2
     local sudo=""
     [ "$(id -u)" -ne 0 ] && sudo="sudo"
-    $sudo apt-get update -qq
-    DEBIAN_FRONTEND=noninteractive $sudo apt-get install -y -qq --no-install-recommends "${missing[@]}" >&2
+    local apt=(apt-get -o DPkg::Lock::Timeout=120)
+    $sudo "${apt[@]}" update -qq
+    DEBIAN_FRONTEND=noninteractive $sudo "${apt[@]}" install -y -qq --no-install-recommends "${missing[@]}" >&2
 }
 
 # configure_and_build BUILD_DIR [cmake options...]
@@ -35,13 +42,35 @@ cpp_files() {
         \( -name '*.cpp' -o -name '*.h' \) "$@"
 }
 
-# Fails with the files to format when any file is not formatted as .clang-format says.
+# The licence of every source file, named in its first line (after a "#!" line).
+LICENCE_ID="SPDX-License-Identifier: MIT"
+
+# licensed_files: "MARK<tab>FILE" for every source file, MARK being its language's comment.
+licensed_files() {
+    cpp_files -printf '//\t%p\n'
+    find "$QUILLMARK_ROOT/CMakeLists.txt" "$QUILLMARK_ROOT"/{src,tests,bench,fuzz,packaging,scripts,.ci} -type f \
+        \( -name CMakeLists.txt -o -name '*.cmake' -o -name '*.sh' -o -perm -u+x \) -printf '#\t%p\n'
+}
+
+# unlicensed_files: the lines of licensed_files whose file lacks the licence line.
+unlicensed_files() {
+    local mark file first
+    licensed_files | while IFS=$'\t' read -r mark file; do
+        first="$(head -n 1 "$file")"
+        [[ "$first" == '#!'* ]] && first="$(sed -n 2p "$file")"
+        [ "$first" = "$mark $LICENCE_ID" ] || printf '%s\t%s\n' "$mark" "$file"
+    done
+}
+
+# Fails with the files to format when any file is not formatted as .clang-format says, or
+# lacks its licence line.
 check_format() {
-    local unformatted
+    local unformatted unlicensed
     unformatted=$(cpp_files -exec clang-format --dry-run --Werror {} + 2>&1 | grep -o '^[^:]*\.\(cpp\|h\)' | sort -u || true)
-    if [ -n "$unformatted" ]; then
-        echo "These files are not formatted; run scripts/format:" >&2
-        echo "$unformatted" >&2
+    unlicensed=$(unlicensed_files | cut -f 2)
+    if [ -n "$unformatted" ] || [ -n "$unlicensed" ]; then
+        echo "These files are not formatted or lack the line \"$LICENCE_ID\"; run scripts/format:" >&2
+        printf '%s\n' $unformatted $unlicensed >&2
         return 1
     fi
 }

@@ -1,5 +1,6 @@
 // Quillmark: the window program.
 #include <QApplication>
+#include <QIcon>
 #include <cstring>
 #include <iostream>
 
@@ -43,6 +44,8 @@ int main(int argc, char** argv)
     UseLeanEventLoop();
     QApplication application(argc, argv); // takes Qt's own options (-platform, -style, ...) out of argv
     QApplication::setApplicationName("Quillmark");
+    // Ties the windows to the desktop entry (Wayland's app id), so docks show its icon and can pin it.
+    QGuiApplication::setDesktopFileName(QUILLMARK_APP_ID);
     UseWindowFont();
     AppState app;
     const auto programFolder = QCoreApplication::applicationDirPath().toStdString();
@@ -54,6 +57,8 @@ int main(int argc, char** argv)
     Services services{store, dialogs, clock};
     frmMain window(app, services);
     dialogs.setParent(&window);
+    // The icon the desktop's theme has for the entry, so window, dock and menu look alike.
+    window.setWindowIcon(QIcon::fromTheme(QUILLMARK_APP_ID, window.windowIcon()));
     window.StartUp(application.arguments().mid(1));
     return application.exec();
 }

@@ -5,8 +5,10 @@
 // The folder the four list files are read from and written to: beside the program when all four
 // stand there (a build folder, a portable copy), exactly as always. Otherwise userFolder, where a
 // list that is missing is first copied from defaultsFolder, the installed defaults, which are
-// never written. Nothing is reported here: a list that could not be had is reported when it is
-// loaded, as a missing list file always was.
+// never written. A copy the user has not edited since it was made is replaced when the installed
+// default has changed since (an upgrade brought new entries); an edited copy is never touched.
+// Nothing is reported here: a list that could not be had is reported when it is loaded, as a
+// missing list file always was.
 std::string ListFolderFor(const std::string& programFolder, const std::string& userFolder,
                           const std::string& defaultsFolder);
 

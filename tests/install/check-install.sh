@@ -1,38 +1,68 @@
 #!/usr/bin/env bash
-# Installs a build into a temporary folder as a package would, checks the layout, runs the
-# installed quillmark-cli as a user with an empty home, and validates the desktop files with the
+# Installs a build into a temporary folder as a package would, checks the layout, the Debian
+# documentation, the file types claimed and the desktop identity, runs the installed
+# quillmark-cli as a user with an empty home, and validates the desktop files with the
 # freedesktop tools where they are installed.
 set -euo pipefail
 build_dir="$1"
-corpus_file="${2:-}"
+corpus="${2:-}"
 dest="$(mktemp -d)"
 home="$(mktemp -d)"
 trap 'rm -rf "$dest" "$home"' EXIT
 DESTDIR="$dest" cmake --install "$build_dir" --prefix /usr >/dev/null
 usr="$dest/usr"
 id=io.github.quillmark.Quillmark
+doc=share/doc/quillmark
 for file in bin/quillmark bin/quillmark-cli \
             share/quillmark/category.txt share/quillmark/parttype.txt share/quillmark/bfc.txt share/quillmark/licenses.txt \
             share/applications/$id.desktop share/mime/packages/$id.xml share/metainfo/$id.metainfo.xml \
-            share/icons/hicolor/48x48/apps/$id.png share/man/man1/quillmark.1 share/man/man1/quillmark-cli.1; do
+            share/icons/hicolor/48x48/apps/$id.png share/icons/hicolor/scalable/apps/$id.svg \
+            share/man/man1/quillmark.1.gz share/man/man1/quillmark-cli.1.gz $doc/copyright $doc/changelog.gz; do
     [ -f "$usr/$file" ] || { echo "not installed: $file"; exit 1; }
 done
-grep -q '^Exec=quillmark %f$' "$usr/share/applications/$id.desktop"
-grep -q '^MimeType=application/x-ldraw;$' "$usr/share/applications/$id.desktop"
+
+# Compressed as Debian wants: best compression, no file name, no time stamp.
+for file in share/man/man1/quillmark.1.gz share/man/man1/quillmark-cli.1.gz $doc/changelog.gz; do
+    [ "$(od -An -tx1 -N9 "$usr/$file" | tr -d ' \n')" = 1f8b08000000000002 ] || { echo "not gzip -9n: $file"; exit 1; }
+done
+# Each page names its own program; the tool's page has every subcommand's options.
+zcat "$usr/share/man/man1/quillmark.1.gz" | grep -A1 '^\.SH NAME' | grep -q '^quillmark \\- edit'
+zcat "$usr/share/man/man1/quillmark-cli.1.gz" | grep -A1 '^\.SH NAME' | grep -q '^quillmark-cli \\- check'
+for option in fields print check save '\-\-json' '\-\-tracker' '\-\-fix' '\-\-no\-backup' '\-\-no\-length\-limit' '\-j,\-\-jobs'; do
+    zcat "$usr/share/man/man1/quillmark-cli.1.gz" | grep -qF -- "$option" || { echo "man page lacks: $option"; exit 1; }
+done
+# A machine-readable copyright naming the licence of the code, of the list files and of the icons.
+copyright="$usr/$doc/copyright"
+grep -q '^Format: https://www.debian.org/doc/packaging-manuals/copyright-format/1.0/$' "$copyright"
+grep -q '^Files: data/category.txt data/parttype.txt data/bfc.txt data/licenses.txt$' "$copyright"
+grep -q '^Files: packaging/icons/\*' "$copyright"
+[ "$(grep -c '^License: MIT$' "$copyright")" -eq 4 ]
+zcat "$usr/$doc/changelog.gz" | head -n 1 | grep -q "^quillmark ($("$usr/bin/quillmark-cli" --version | cut -d' ' -f2)) "
+
+desktop="$usr/share/applications/$id.desktop"
+grep -q '^Exec=quillmark %f$' "$desktop"
+grep -q '^MimeType=application/x-ldraw;$' "$desktop"
+grep -q "^Icon=$id$" "$desktop"
 
 cli="$usr/bin/quillmark-cli"
 HOME="$home" XDG_DATA_HOME= "$cli" --version | grep -q '^quillmark-cli '
 HOME="$home" "$usr/bin/quillmark" --version | grep -q '^quillmark '
-if [ -n "$corpus_file" ] && [ -f "$corpus_file" ]; then
+if [ -n "$corpus" ] && [ -d "$corpus" ]; then
+    part="$corpus/parts/003432a.dat"
     status=0
-    HOME="$home" XDG_DATA_HOME= "$cli" check --tracker --quiet "$corpus_file" >"$home/out.txt" || status=$?
+    HOME="$home" XDG_DATA_HOME= "$cli" check --tracker --quiet "$part" >"$home/out.txt" || status=$?
     [ "$status" -le 1 ] || { echo "check failed with $status"; cat "$home/out.txt"; exit 1; }
-    grep -q "$corpus_file" "$home/out.txt"
+    grep -q "$part" "$home/out.txt"
     # The installed defaults were copied for the user; they themselves stay as installed.
     cmp "$home/.local/share/Quillmark/category.txt" "$usr/share/quillmark/category.txt"
 fi
 
-if command -v desktop-file-validate >/dev/null; then desktop-file-validate "$usr/share/applications/$id.desktop"; fi
+"$(dirname "$0")/check-file-types.sh" "$usr/share/mime/packages/$id.xml" "$corpus"
+"$(dirname "$0")/check-window-identity.sh" "$usr/bin/quillmark" "$desktop"
+
+if command -v desktop-file-validate >/dev/null; then desktop-file-validate "$desktop"; fi
 if command -v xmllint >/dev/null; then xmllint --noout "$usr/share/mime/packages/$id.xml" "$usr/share/metainfo/$id.metainfo.xml"; fi
-if command -v appstreamcli >/dev/null; then appstreamcli validate --no-net "$usr/share/metainfo/$id.metainfo.xml" >/dev/null; fi
+if command -v appstreamcli >/dev/null; then
+    appstreamcli validate --no-net --pedantic "$usr/share/metainfo/$id.metainfo.xml" >/dev/null
+fi
 echo "installed layout, programs and desktop files are in order"

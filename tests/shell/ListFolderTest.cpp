@@ -1,4 +1,5 @@
 #include <gtest/gtest.h>
+#include <sys/stat.h>
 
 #include "ListFolder.h"
 #include "TempDir.h"
@@ -41,6 +42,32 @@ TEST_F(ListFolders, OtherwiseTheUsersCopiesAreMadeOnceFromTheDefaults)
     EXPECT_EQ(ReadBytes(user + "/bfc.txt"), "edited by the user");
     EXPECT_EQ(ReadBytes(user + "/licenses.txt"), "default licenses.txt");
     EXPECT_EQ(ReadBytes(defaults + "/bfc.txt"), "default bfc.txt");
+}
+
+TEST_F(ListFolders, AnUneditedCopyFollowsAChangedDefaultAndAnEditedOneIsKept)
+{
+    ListFolderFor(bin, user, defaults);
+    TempDir::writeTo(user + "/bfc.txt", "edited by the user");
+    TempDir::writeTo(defaults + "/bfc.txt", "upgraded bfc.txt");
+    TempDir::writeTo(defaults + "/licenses.txt", "upgraded licenses.txt");
+    ListFolderFor(bin, user, defaults);
+    EXPECT_EQ(ReadBytes(user + "/bfc.txt"), "edited by the user");
+    EXPECT_EQ(ReadBytes(user + "/licenses.txt"), "upgraded licenses.txt");
+    EXPECT_EQ(ReadBytes(user + "/category.txt"), "default category.txt");
+    TempDir::writeTo(defaults + "/bfc.txt", "upgraded again");
+    ListFolderFor(bin, user, defaults);
+    EXPECT_EQ(ReadBytes(user + "/bfc.txt"), "edited by the user");
+}
+
+TEST_F(ListFolders, CopiesOfReadOnlyDefaultsTakeTheUsersModeForNewFiles)
+{
+    for (const auto* list : Lists)
+        fs::permissions(defaults + "/" + list, fs::perms(0444));
+    const auto oldMask = ::umask(002);
+    ListFolderFor(bin, user, defaults);
+    ::umask(oldMask);
+    for (const auto* list : Lists)
+        EXPECT_EQ(fs::status(user + "/" + list).permissions(), fs::perms(0664)) << list;
 }
 
 TEST_F(ListFolders, WithoutDefaultsNothingIsCopiedAndLoadingReportsTheMissingList)
