@@ -6,9 +6,8 @@
 #include "Dates.h"
 #include "Dialogs.h"
 #include "ErrorReport.h"
-#include "LargeBuffer.h"
+#include "InPlaceBody.h"
 #include "LineEnds.h"
-#include "LineReader.h"
 #include "ParseProgress.h"
 #include "PartFile.h"
 #include "Text.h"
@@ -43,6 +42,26 @@ bool isOneOf(std::string_view word, std::initializer_list<std::string_view> form
     return false;
 }
 
+// A header of millions of lines would have its old-header text and its lists grow by doubling,
+// each step holding the old and the new buffer at once. Once they are large they take at once the
+// room the rest of the text could still fill; room never written to is never touched and costs
+// address space only.
+constexpr std::size_t LargeText = 1024 * 1024;
+constexpr std::size_t LargeList = 4096;
+constexpr std::size_t ShortestListLine = 6; // "0 // x"
+
+void makeRoom(std::string& text, std::size_t adding, std::size_t restOfText)
+{
+    if (text.size() + adding > text.capacity() && text.size() >= LargeText)
+        text.reserve(text.size() + adding + restOfText);
+}
+
+void makeRoom(StringList& list, std::size_t restOfText)
+{
+    if (list.size() == list.capacity() && list.size() >= LargeList)
+        list.reserve(list.size() + 1 + restOfText / ShortestListLine);
+}
+
 void appendLine(std::string& text, std::string_view line)
 {
     if (!text.empty())
@@ -52,13 +71,13 @@ void appendLine(std::string& text, std::string_view line)
 
 class HeaderParser {
 public:
-    explicit HeaderParser(HeaderData& header) : h_(header) {}
+    HeaderParser(HeaderData& header, InPlaceBody& body) : h_(header), body_(body) {}
 
     void classify(std::string_view line, std::size_t lineNumber);
     bool headerEnded() const { return headerEnded_; }
 
 private:
-    void toBody(std::string_view line) { appendLine(h_.Body, TrimBlanks(line)); }
+    void toBody(std::string_view line) { body_.keep(line); }
     void endHeader(std::string_view line)
     {
         headerEnded_ = true;
@@ -67,6 +86,11 @@ private:
     std::string_view word(std::size_t position) const { return words_.word(position); }
     std::size_t wordCount() const { return words_.count(); }
     std::string joinedFrom(std::size_t k) const { return words_.joinedFrom(k); }
+    void addEntry(StringList& list, std::string entry)
+    {
+        makeRoom(list, body_.remainingBytes());
+        list.push_back(std::move(entry));
+    }
 
     void takeDescription(std::string_view line);
     void takeKeywordLine(std::string_view line);
@@ -77,6 +101,7 @@ private:
     void takeDatedOrBody(std::string_view line);
 
     HeaderData& h_;
+    InPlaceBody& body_;
     bool headerEnded_ = false;
     Words words_;
 };
@@ -90,6 +115,7 @@ void HeaderParser::classify(std::string_view line, std::size_t lineNumber)
         endHeader(line);
         return;
     }
+    makeRoom(h_.OldHeader, line.size() + CrLf.size(), body_.remainingBytes());
     appendLine(h_.OldHeader, line);
     if (lineNumber == 1) {
         takeDescription(line);
@@ -120,7 +146,7 @@ void HeaderParser::takeKeywordLine(std::string_view line)
     else if (keyword == "BFC")
         takeBfc(line);
     else if (keyword == "COLOR")
-        h_.ColorLines.emplace_back(line);
+        addEntry(h_.ColorLines, std::string(line));
     else if (isOneOf(keyword, {"Unofficial", "unofficial", "UNOFFICIAL"})) {
         if (isOneOf(word(3), {"Part", "Model", "part", "model", "element", "Element", "ELEMENT"}))
             h_.PartType = "Unofficial_Part";
@@ -132,15 +158,15 @@ void HeaderParser::takeKeywordLine(std::string_view line)
     } else if (isOneOf(keyword, {"!LDRAW_ORG", "LDRAW_ORG", "!LDRAW"}))
         takePartType();
     else if (isOneOf(keyword, {"!CMDLINE", "CMDLINE"}))
-        h_.CmdLines.push_back(joinedFrom(3));
+        addEntry(h_.CmdLines, joinedFrom(3));
     else if (isOneOf(keyword, {"!KEYWORDS", "KEYWORDS"}))
-        h_.Keywords.push_back(joinedFrom(3));
+        addEntry(h_.Keywords, joinedFrom(3));
     else if (keyword == "!HELP")
-        h_.HelpLines.push_back(joinedFrom(3));
+        addEntry(h_.HelpLines, joinedFrom(3));
     else if (keyword == "!LICENSE")
         h_.License = joinedFrom(3);
     else if (isOneOf(keyword, {"HISTORY", "!HISTORY"}))
-        h_.History.push_back(joinedFrom(3));
+        addEntry(h_.History, joinedFrom(3));
     else if (keyword == "//")
         takeComment();
     else
@@ -205,9 +231,9 @@ void HeaderParser::takePartType()
 void HeaderParser::takeComment()
 {
     if (const auto date = DateOfWord(word(3)))
-        h_.History.push_back(*date + " " + joinedFrom(4));
+        addEntry(h_.History, *date + " " + joinedFrom(4));
     else
-        h_.Comments.push_back(joinedFrom(2));
+        addEntry(h_.Comments, joinedFrom(2));
 }
 
 // An old history line without keyword ("0 2004-03-12 [jdoe] fixed"), or a meta line the header
@@ -215,7 +241,7 @@ void HeaderParser::takeComment()
 void HeaderParser::takeDatedOrBody(std::string_view line)
 {
     if (const auto date = DateOfWord(word(2)))
-        h_.History.push_back(*date + " " + joinedFrom(3));
+        addEntry(h_.History, *date + " " + joinedFrom(3));
     else
         toBody(line);
 }
@@ -231,55 +257,6 @@ void clearParsedContent(HeaderData& header)
     header.History.clear();
     header.ColorLines.clear();
 }
-
-// Adds the lines after the end of the header to the body. Most of them need no trimming and end
-// with CR LF, so runs of such lines are copied in one piece instead of line by line.
-class BodyCollector {
-public:
-    // The body cannot grow beyond the rest of the text: make room once instead of step by step.
-    BodyCollector(std::string& body, std::size_t restOfText) : body_(body)
-    {
-        body_.reserve(body_.size() + restOfText + 2);
-        AdviseLargeBuffer(body_.data(), body_.capacity());
-    }
-    ~BodyCollector() { flush(); }
-    BodyCollector(const BodyCollector&) = delete;
-    BodyCollector& operator=(const BodyCollector&) = delete;
-
-    void add(std::string_view line)
-    {
-        if (fitsRun(line)) {
-            if (runStart_ == nullptr)
-                runStart_ = line.data();
-            runEnd_ = line.data() + line.size();
-            return;
-        }
-        flush();
-        appendLine(body_, TrimBlanks(line));
-    }
-
-private:
-    // A line joins the run when it needs no trimming, follows the run directly after a CR LF,
-    // and, when empty, has text before it (an empty line adds nothing to an empty body).
-    bool fitsRun(std::string_view line) const
-    {
-        if (line.empty() ? (runStart_ == nullptr && body_.empty()) : (line.front() == ' ' || line.back() == ' '))
-            return false;
-        return runStart_ == nullptr || (line.data() == runEnd_ + 2 && runEnd_[0] == '\r' && runEnd_[1] == '\n');
-    }
-
-    void flush()
-    {
-        if (runStart_ == nullptr)
-            return;
-        appendLine(body_, std::string_view(runStart_, static_cast<std::size_t>(runEnd_ - runStart_)));
-        runStart_ = runEnd_ = nullptr;
-    }
-
-    std::string& body_;
-    const char* runStart_ = nullptr;
-    const char* runEnd_ = nullptr;
-};
 
 class BusyPointer {
 public:
@@ -299,12 +276,12 @@ std::string ProgressCaption(std::size_t linesRead)
     return "Parsing file. Line " + std::to_string(linesRead) + ". Please wait...";
 }
 
-void ParseHeaderText(HeaderData& header, std::string_view text, ParseProgress& progress)
+void ParseHeaderText(HeaderData& header, std::string text, ParseProgress& progress)
 {
     clearParsedContent(header);
     header.Encoding = EncodingOf(text);
     BusyPointer busy(progress);
-    LineReader reader(text);
+    InPlaceBody lines(text);
     std::size_t linesRead = 0;
     const auto nextLine = [&]() {
         if (linesRead % 10 == 0) {
@@ -312,34 +289,37 @@ void ParseHeaderText(HeaderData& header, std::string_view text, ParseProgress& p
             progress.processEvents();
         }
         ++linesRead;
-        return reader.nextLine();
+        return lines.nextLine();
     };
-    HeaderParser parser(header);
-    while (!reader.atEnd() && !parser.headerEnded()) {
-        const auto line = nextLine();
-        parser.classify(line, linesRead);
+    HeaderParser parser(header, lines);
+    try {
+        while (!lines.atEnd() && !parser.headerEnded()) {
+            const auto line = nextLine();
+            parser.classify(line, linesRead);
+        }
+        while (!lines.atEnd())
+            lines.keep(nextLine());
+    } catch (...) {
+        header.Body = lines.take(); // what the lines before the failure gave
+        throw;
     }
-    BodyCollector body(header.Body, reader.remainingBytes());
-    while (!reader.atEnd())
-        body.add(nextLine());
+    header.Body = lines.take();
 }
 
-void ParsePartFileContent(HeaderData& header, std::string_view content, Dialogs& dialogs, ParseProgress& progress)
+void ParsePartFileContent(HeaderData& header, std::string content, Dialogs& dialogs, ParseProgress& progress)
 {
     // Editors that put a byte order mark before the first line would otherwise hide the whole
     // header in the body, and a save would write a second, empty header above it.
     header.ByteOrderMark = content.starts_with(Utf8ByteOrderMark);
     if (header.ByteOrderMark)
-        content.remove_prefix(Utf8ByteOrderMark.size());
+        content.erase(0, Utf8ByteOrderMark.size());
     if (content.empty())
         ReportError(dialogs, InputPastEndOfFileError(), IsUnixLineEndProcedure);
-    if (!IsUnixLineEnd(content)) {
-        ParseHeaderText(header, content, progress);
-        return;
+    if (IsUnixLineEnd(content)) {
+        LfToCrLf(content);
+        content += CrLf;
     }
-    auto converted = LfToCrLf(content);
-    converted += CrLf;
-    ParseHeaderText(header, converted, progress);
+    ParseHeaderText(header, std::move(content), progress);
 }
 
 void GetGlobalContent(HeaderData& header, Dialogs& dialogs, ParseProgress& progress)
@@ -362,7 +342,7 @@ void GetGlobalContent(HeaderData& header, Dialogs& dialogs, ParseProgress& progr
         return;
     }
     try {
-        ParsePartFileContent(header, content->view(), dialogs, progress);
+        ParsePartFileContent(header, content->takeBytes(), dialogs, progress);
         header.ReadStamp = content->stamp();
     } catch (const std::exception& failure) {
         ReportError(dialogs, ErrorOf(failure), GetGlobalContentProcedure);

@@ -109,22 +109,39 @@ bool ContainsIgnoreCase(std::string_view text, std::string_view needle)
     return false;
 }
 
+namespace {
+
+// Part files are mostly ASCII: 64 bytes are tested at once, as eight words.
+constexpr std::size_t AsciiBlock = 64;
+
+bool asciiBlockAt(std::string_view bytes, std::size_t i)
+{
+    std::uint64_t any = 0;
+    for (std::size_t k = 0; k < AsciiBlock; k += sizeof any) {
+        std::uint64_t word = 0;
+        std::memcpy(&word, bytes.data() + i + k, sizeof word);
+        any |= word;
+    }
+    return (any & 0x8080808080808080ULL) == 0;
+}
+
+} // namespace
+
 bool IsValidUtf8(std::string_view bytes)
 {
     for (std::size_t i = 0; i < bytes.size();) {
-        // Part files are mostly ASCII: skip eight such bytes at a time.
-        std::uint64_t chunk = 0;
-        if (i + sizeof chunk <= bytes.size()) {
-            std::memcpy(&chunk, bytes.data() + i, sizeof chunk);
-            if ((chunk & 0x8080808080808080ULL) == 0) {
-                i += sizeof chunk;
-                continue;
-            }
+        if (i + AsciiBlock <= bytes.size() && asciiBlockAt(bytes, i)) {
+            i += AsciiBlock;
+            continue;
         }
-        const auto length = utf8SequenceLength(bytes, i);
-        if (length == 0)
-            return false;
-        i += length;
+        // A block with other bytes, or the last bytes: one character at a time.
+        const auto blockEnd = std::min(i + AsciiBlock, bytes.size());
+        while (i < blockEnd) {
+            const auto length = utf8SequenceLength(bytes, i);
+            if (length == 0)
+                return false;
+            i += length;
+        }
     }
     return true;
 }

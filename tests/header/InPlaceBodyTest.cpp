@@ -1,0 +1,108 @@
+// The body is built inside the buffer the file was read into: every kind of line must come out
+// exactly as a separate copy would have made it, and the buffer itself must become the body.
+#include <gtest/gtest.h>
+
+#include "LineEnds.h"
+#include "ParseProgress.h"
+#include "Parser.h"
+#include "ScriptedDialogs.h"
+
+namespace {
+
+HeaderData parsed(std::string content)
+{
+    HeaderData header;
+    ScriptedDialogs dialogs;
+    ParseProgress progress;
+    ParsePartFileContent(header, std::move(content), dialogs, progress);
+    return header;
+}
+
+// Lines as a part file holds them, joined by the given line end.
+std::string joined(std::initializer_list<std::string> lines, const std::string& lineEnd)
+{
+    std::string text;
+    for (const auto& line : lines)
+        text += line + lineEnd;
+    return text;
+}
+
+// A header with an unknown meta line (header and body both), then trimmed lines, an inner empty
+// line, a blank-only line and a last line without line end.
+const std::initializer_list<std::string> MixedLines = {
+    "0 Brick", "0 Name: b.dat", "", "0 FOO  bar ", "  1 16 a.dat  ", "", "   ", "2 24 0 0 0 1 1 1"};
+const std::string MixedBody = "0 FOO  bar\r\n1 16 a.dat\r\n\r\n\r\n2 24 0 0 0 1 1 1\r\n4 16 y";
+
+TEST(InPlaceBody, CrLfLinesAreTrimmedAndJoined)
+{
+    const auto h = parsed(joined(MixedLines, "\r\n") + " 4 16 y");
+    EXPECT_EQ(h.Body, MixedBody);
+    EXPECT_EQ(h.OldHeader, "0 Brick\r\n0 Name: b.dat\r\n0 FOO  bar ");
+}
+
+TEST(InPlaceBody, LfOnlyLinesComeOutAsTheirCrLfForm)
+{
+    EXPECT_EQ(parsed(joined(MixedLines, "\n") + " 4 16 y").Body, MixedBody);
+    // A last line end reads as one more, empty, line.
+    EXPECT_EQ(parsed(joined(MixedLines, "\n") + " 4 16 y\n").Body, MixedBody + "\r\n");
+}
+
+TEST(InPlaceBody, AFileThatIsAllHeaderHasAnEmptyBody)
+{
+    const auto h = parsed("0 a\r\n0 // c\r\n\r\n0 !KEYWORDS k\r\n");
+    EXPECT_EQ(h.Body, "");
+    EXPECT_EQ(h.OldHeader, "0 a\r\n0 // c\r\n0 !KEYWORDS k");
+}
+
+TEST(InPlaceBody, ABodyLineLongerThanTheHeaderBeforeIt)
+{
+    const std::string longLine = "1" + std::string(5000, 'x');
+    EXPECT_EQ(parsed("0 h\r\n " + longLine + " \r\n2 y").Body, longLine + "\r\n2 y");
+}
+
+// A CR alone ends a line but is shorter than the CR LF that joins the body: the body must not
+// overwrite the lines still to be read.
+TEST(InPlaceBody, LinesEndedByACrAloneAreJoinedByCrLf)
+{
+    EXPECT_EQ(parsed("1 a\r1 b\r 1 c \r\r1 d").Body, "1 a\r\n1 b\r\n1 c\r\n\r\n1 d");
+    EXPECT_EQ(parsed("1 a\r\n1 b\r\n1 c\r1 d\r1 e").Body, "1 a\r\n1 b\r\n1 c\r\n1 d\r\n1 e");
+    EXPECT_EQ(parsed("1 a\n1 b\r1 c\n1 d\r1 e").Body, "1 a\r\n1 b\r\n1 c\r\n1 d\r\n1 e") << "LF only, with CRs alone";
+}
+
+TEST(InPlaceBody, TheContentsBufferBecomesTheBody)
+{
+    std::string body;
+    for (int line = 0; line < 1000; ++line)
+        body += "1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat\r\n";
+    std::string crLf = "0 h\r\n" + body;
+    const char* crLfBuffer = crLf.data();
+    EXPECT_EQ(parsed(std::move(crLf)).Body.data(), crLfBuffer);
+
+    std::string lfOnly = "0 h\n" + body;
+    std::erase(lfOnly, '\r');
+    lfOnly.reserve(2 * lfOnly.size() + 2); // the room the file reader leaves
+    const char* lfBuffer = lfOnly.data();
+    const auto h = parsed(std::move(lfOnly));
+    EXPECT_EQ(h.Body, body);
+    EXPECT_EQ(h.Body.data(), lfBuffer);
+}
+
+TEST(LineEndConversion, LfAloneBecomesCrLfWhereTheTextLies)
+{
+    std::string text = "\na\nb\r\nc\n\n";
+    LfToCrLf(text);
+    EXPECT_EQ(text, "\r\na\r\nb\r\nc\r\n\r\n");
+}
+
+TEST(LineEndConversion, WideningMovesTheRestBackAndEndsEveryLineWithCrLf)
+{
+    std::string text = "ab\rcd\r\ne\r";
+    WidenLoneCrs(text, 2, 2);
+    EXPECT_EQ(text.substr(0, 2), "ab");
+    EXPECT_EQ(text.substr(4), "\r\ncd\r\ne\r\n");
+    text = "a\rb\rc";
+    WidenLoneCrs(text, 3, 0);
+    EXPECT_EQ(text, "a\rb\r\nc") << "what lies before the position stays";
+}
+
+} // namespace
