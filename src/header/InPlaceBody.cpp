@@ -5,13 +5,9 @@
 #include "LineEnds.h"
 #include "Text.h"
 
-void InPlaceBody::keep(std::string_view line)
+void InPlaceBody::startPiece(std::string_view line)
 {
-    auto start = static_cast<std::size_t>(line.data() - text_.data());
-    if (runEnd_ != NoRun && continuesRun(start) && mayJoinRun(line) && runEnd_ - runStart_ < CachedRun) {
-        runEnd_ = start + line.size();
-        return;
-    }
+    auto start = offsetOf(line);
     flush();
     const bool startsRun = mayJoinRun(line);
     if (const auto movedTo = roomFor(start); movedTo != start) {
@@ -36,16 +32,6 @@ std::string InPlaceBody::take()
     return std::move(text_);
 }
 
-// A line joins a run when it needs no trimming; an empty line only after text, since an empty
-// line adds nothing to an empty body.
-bool InPlaceBody::mayJoinRun(std::string_view line) const
-{
-    return line.empty() ? !bodyEmpty() : line.front() != ' ' && line.back() != ' ';
-}
-
-// Lines end with CR LF or with a CR alone: two bytes between the run and the line are a CR LF.
-bool InPlaceBody::continuesRun(std::size_t start) const { return start == runEnd_ + 2; }
-
 // Where the line that starts at start can be taken from: there, when the body and its separator
 // end before it; otherwise the rest of the text is moved back far enough, with every line end
 // widened to CR LF, after which no later line can be caught up with.
@@ -55,10 +41,18 @@ std::size_t InPlaceBody::roomFor(std::size_t start)
     if (bodyEnd <= start)
         return start;
     const auto gap = bodyEnd - start;
+    if (utf8()) // the rest moves: check it where it is
+        checkedUpTo_ = CheckUtf8(text_, checkedUpTo_, text_.size()) == NotUtf8 ? NotUtf8 : CheckedAll;
     WidenLoneCrs(text_, start, gap);
     reader_ = LineReader(text_, start + gap);
     reader_.nextLine();
     return start + gap;
+}
+
+void InPlaceBody::checkAhead()
+{
+    if (utf8())
+        checkedUpTo_ = CheckUtf8(text_, checkedUpTo_, reader_.position() + CheckedPiece);
 }
 
 // Writes the separator and piece at the end of the body; piece lies behind where it goes.

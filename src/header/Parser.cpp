@@ -279,7 +279,6 @@ std::string ProgressCaption(std::size_t linesRead)
 void ParseHeaderText(HeaderData& header, std::string text, ParseProgress& progress)
 {
     clearParsedContent(header);
-    header.Encoding = EncodingOf(text);
     BusyPointer busy(progress);
     InPlaceBody lines(text);
     std::size_t linesRead = 0;
@@ -292,6 +291,10 @@ void ParseHeaderText(HeaderData& header, std::string text, ParseProgress& progre
         return lines.nextLine();
     };
     HeaderParser parser(header, lines);
+    const auto finish = [&header, &lines]() {
+        header.Encoding = lines.utf8() ? TextEncoding::Utf8 : TextEncoding::Latin1;
+        header.Body = lines.take();
+    };
     try {
         while (!lines.atEnd() && !parser.headerEnded()) {
             const auto line = nextLine();
@@ -300,10 +303,10 @@ void ParseHeaderText(HeaderData& header, std::string text, ParseProgress& progre
         while (!lines.atEnd())
             lines.keep(nextLine());
     } catch (...) {
-        header.Body = lines.take(); // what the lines before the failure gave
+        finish(); // what the lines before the failure gave
         throw;
     }
-    header.Body = lines.take();
+    finish();
 }
 
 void ParsePartFileContent(HeaderData& header, std::string content, Dialogs& dialogs, ParseProgress& progress)

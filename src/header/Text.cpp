@@ -127,9 +127,11 @@ bool asciiBlockAt(std::string_view bytes, std::size_t i)
 
 } // namespace
 
-bool IsValidUtf8(std::string_view bytes)
+std::size_t CheckUtf8(std::string_view bytes, std::size_t from, std::size_t until)
 {
-    for (std::size_t i = 0; i < bytes.size();) {
+    until = std::min(until, bytes.size());
+    auto i = from;
+    while (i < until) {
         if (i + AsciiBlock <= bytes.size() && asciiBlockAt(bytes, i)) {
             i += AsciiBlock;
             continue;
@@ -139,12 +141,14 @@ bool IsValidUtf8(std::string_view bytes)
         while (i < blockEnd) {
             const auto length = utf8SequenceLength(bytes, i);
             if (length == 0)
-                return false;
+                return std::string_view::npos;
             i += length;
         }
     }
-    return true;
+    return i;
 }
+
+bool IsValidUtf8(std::string_view bytes) { return CheckUtf8(bytes, 0, bytes.size()) != std::string_view::npos; }
 
 TextEncoding EncodingOf(std::string_view bytes)
 {

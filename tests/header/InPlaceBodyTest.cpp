@@ -87,6 +87,23 @@ TEST(InPlaceBody, TheContentsBufferBecomesTheBody)
     EXPECT_EQ(h.Body.data(), lfBuffer);
 }
 
+// The encoding is decided while the text is read, before its bytes are moved: every byte counts,
+// the last ones too, and characters of several bytes may cross any boundary.
+TEST(InPlaceBody, TheWholeTextDecidesTheEncoding)
+{
+    std::string utf8 = "0 \xC3\xA9t\xC3\xA9\r\n";
+    for (int line = 0; line < 40000; ++line) // far beyond the first piece that is checked
+        utf8 += line % 7 == 0 ? "1 \xE2\x82\xAC \r\n" : "2 \xC3\xA9\r\n";
+    EXPECT_EQ(parsed(utf8).Encoding, TextEncoding::Utf8);
+    EXPECT_EQ(parsed(utf8 + "3 \xE9").Encoding, TextEncoding::Latin1);
+    std::string longLine = "1 ";
+    for (int character = 0; character < 200000; ++character)
+        longLine += "\xC3\xA9";
+    EXPECT_EQ(parsed("1 a\r" + longLine + "\r\n" + longLine + "\r\n" + longLine).Encoding, TextEncoding::Utf8)
+        << "after the rest was moved";
+    EXPECT_EQ(parsed("1 a\r1 \xE9\r1 b").Encoding, TextEncoding::Latin1) << "after the rest was moved";
+}
+
 TEST(LineEndConversion, LfAloneBecomesCrLfWhereTheTextLies)
 {
     std::string text = "\na\nb\r\nc\n\n";
