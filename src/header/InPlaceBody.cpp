@@ -1,7 +1,9 @@
 #include "InPlaceBody.h"
 
+#include <algorithm>
 #include <cstring>
 
+#include "LargeBuffer.h"
 #include "LineEnds.h"
 #include "Text.h"
 
@@ -53,6 +55,15 @@ void InPlaceBody::checkAhead()
 {
     if (utf8())
         checkedUpTo_ = CheckUtf8(text_, checkedUpTo_, reader_.position() + CheckedPiece);
+}
+
+// Between the body (with the run not yet moved) and the line just read lie bytes that nothing
+// reads again.
+void InPlaceBody::releaseReadPages(std::size_t lineStart)
+{
+    const auto bodyEnd = runEnd_ == NoRun ? written_ : runEnd_;
+    ReleaseLargeBufferPages(text_.data() + std::max(bodyEnd, releasedUpTo_), text_.data() + lineStart);
+    releasedUpTo_ = lineStart;
 }
 
 // Writes the separator and piece at the end of the body; piece lies behind where it goes.

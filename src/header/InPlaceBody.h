@@ -28,6 +28,8 @@ public:
         const auto line = reader_.nextLine();
         if (reader_.position() > checkedUpTo_)
             checkAhead();
+        if (reader_.position() > releasedUpTo_ + ReleaseStep)
+            releaseReadPages(offsetOf(line));
         return line;
     }
     // Whether the text read so far is UTF-8: a text is checked as it is read, before any of it is
@@ -63,6 +65,7 @@ private:
     bool continuesRun(std::size_t start) const { return start == runEnd_ + 2; }
     void startPiece(std::string_view line);
     void checkAhead();
+    void releaseReadPages(std::size_t lineStart);
     std::size_t separatorSize() const { return written_ == 0 ? 0 : 2; }
     std::size_t roomFor(std::size_t start);
     void append(std::string_view piece);
@@ -72,6 +75,9 @@ private:
     static constexpr std::size_t NotUtf8 = static_cast<std::size_t>(-1);
     static constexpr std::size_t CheckedAll = NotUtf8 - 1;
     static constexpr std::size_t CheckedPiece = 256 * 1024;
+    // A header of many megabytes is copied out line by line: the pages read meanwhile that the
+    // body does not reach are given back every few megabytes.
+    static constexpr std::size_t ReleaseStep = 8 * 1024 * 1024;
     // A run is moved while the bytes just read are still in the cache.
     static constexpr std::size_t CachedRun = 64 * 1024;
 
@@ -79,6 +85,7 @@ private:
     LineReader reader_;
     std::size_t written_ = 0;     // the body's length
     std::size_t checkedUpTo_ = 0; // the text before this is UTF-8
+    std::size_t releasedUpTo_ = 0;
     std::size_t runStart_ = 0;
     std::size_t runEnd_ = NoRun;
 };

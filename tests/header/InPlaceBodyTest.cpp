@@ -33,18 +33,13 @@ const std::initializer_list<std::string> MixedLines = {
     "0 Brick", "0 Name: b.dat", "", "0 FOO  bar ", "  1 16 a.dat  ", "", "   ", "2 24 0 0 0 1 1 1"};
 const std::string MixedBody = "0 FOO  bar\r\n1 16 a.dat\r\n\r\n\r\n2 24 0 0 0 1 1 1\r\n4 16 y";
 
-TEST(InPlaceBody, CrLfLinesAreTrimmedAndJoined)
+TEST(InPlaceBody, CrLfAndLfOnlyLinesAreTrimmedAndJoinedByCrLf)
 {
     const auto h = parsed(joined(MixedLines, "\r\n") + " 4 16 y");
     EXPECT_EQ(h.Body, MixedBody);
     EXPECT_EQ(h.OldHeader, "0 Brick\r\n0 Name: b.dat\r\n0 FOO  bar ");
-}
-
-TEST(InPlaceBody, LfOnlyLinesComeOutAsTheirCrLfForm)
-{
     EXPECT_EQ(parsed(joined(MixedLines, "\n") + " 4 16 y").Body, MixedBody);
-    // A last line end reads as one more, empty, line.
-    EXPECT_EQ(parsed(joined(MixedLines, "\n") + " 4 16 y\n").Body, MixedBody + "\r\n");
+    EXPECT_EQ(parsed(joined(MixedLines, "\n") + " 4 16 y\n").Body, MixedBody + "\r\n") << "one more, empty, line";
 }
 
 TEST(InPlaceBody, AFileThatIsAllHeaderHasAnEmptyBody)
@@ -85,6 +80,26 @@ TEST(InPlaceBody, TheContentsBufferBecomesTheBody)
     const auto h = parsed(std::move(lfOnly));
     EXPECT_EQ(h.Body, body);
     EXPECT_EQ(h.Body.data(), lfBuffer);
+}
+
+// The pages of a long header are given back as it is read: the body lines among its lines and
+// after it must keep every byte.
+TEST(InPlaceBody, AHeaderOfManyMegabytesKeepsEveryBodyByte)
+{
+    std::string text = "0 d\r\n";
+    std::string body;
+    for (int line = 0; line < 1200000; ++line) { // more than the pages given back at a time
+        if (line % 100000 == 0) {
+            const auto meta = "0 FOO " + std::to_string(line);
+            text += meta + "\r\n";
+            body += meta + "\r\n";
+        }
+        text += "0 // c\r\n";
+    }
+    const auto h = parsed(text + "1 end");
+    EXPECT_EQ(h.Body, body + "1 end");
+    EXPECT_EQ(h.Comments.size(), 1200000u);
+    EXPECT_EQ(h.OldHeader.size(), text.size() - 2);
 }
 
 // The encoding is decided while the text is read, before its bytes are moved: every byte counts,
