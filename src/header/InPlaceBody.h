@@ -74,12 +74,12 @@ private:
     static constexpr std::size_t NoRun = static_cast<std::size_t>(-1);
     static constexpr std::size_t NotUtf8 = static_cast<std::size_t>(-1);
     static constexpr std::size_t CheckedAll = NotUtf8 - 1;
-    static constexpr std::size_t CheckedPiece = 256 * 1024;
+    static constexpr std::size_t CheckedPiece = std::size_t{256} * 1024;
     // A header of many megabytes is copied out line by line: the pages read meanwhile that the
     // body does not reach are given back every few megabytes.
-    static constexpr std::size_t ReleaseStep = 8 * 1024 * 1024;
+    static constexpr std::size_t ReleaseStep = std::size_t{8} * 1024 * 1024;
     // A run is moved while the bytes just read are still in the cache.
-    static constexpr std::size_t CachedRun = 64 * 1024;
+    static constexpr std::size_t CachedRun = std::size_t{64} * 1024;
 
     std::string& text_;
     LineReader reader_;

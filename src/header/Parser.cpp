@@ -46,7 +46,7 @@ bool isOneOf(std::string_view word, std::initializer_list<std::string_view> form
 // each step holding the old and the new buffer at once. Once they are large they take at once the
 // room the rest of the text could still fill; room never written to is never touched and costs
 // address space only.
-constexpr std::size_t LargeText = 1024 * 1024;
+constexpr std::size_t LargeText = std::size_t{1024} * 1024;
 constexpr std::size_t LargeList = 4096;
 constexpr std::size_t ShortestListLine = 6; // "0 // x"
 

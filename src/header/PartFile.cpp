@@ -41,7 +41,7 @@ void reserveFor(std::string& bytes, std::size_t size)
 
 // A string cannot grow without writing its new bytes, so it grows by steps that stay in the
 // cache before read() overwrites them.
-constexpr std::size_t ReadStep = 256 * 1024;
+constexpr std::size_t ReadStep = std::size_t{256} * 1024;
 
 } // namespace
 
@@ -57,12 +57,16 @@ FileBytes::FileBytes(const std::string& path)
     if (!S_ISREG(info.st_mode))
         throw PathFileAccessError();
     stamp_ = StampOf(info);
-    reserveFor(bytes_, static_cast<std::size_t>(info.st_size));
+    const auto expected = static_cast<std::size_t>(info.st_size);
+    reserveFor(bytes_, expected);
     for (;;) {
         const auto filled = bytes_.size();
         if (filled == bytes_.capacity()) // the file grew while it was read
             reserveFor(bytes_, 2 * filled);
-        bytes_.resize(filled + std::min(bytes_.capacity() - filled, ReadStep));
+        // One byte more than the size that fstat saw, so that the end is seen without zeroing
+        // more than that; past it, the file grew.
+        const auto wanted = filled <= expected ? expected + 1 - filled : ReadStep;
+        bytes_.resize(filled + std::min({bytes_.capacity() - filled, ReadStep, wanted}));
         const auto got = ::read(file.get(), bytes_.data() + filled, bytes_.size() - filled);
         const int readError = errno;
         bytes_.resize(filled + static_cast<std::size_t>(std::max<ssize_t>(got, 0)));
