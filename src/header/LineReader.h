@@ -35,21 +35,22 @@ private:
     // than once per line.
     static constexpr std::size_t Block = 64;
 
-    // The first CR at or after from, or the text's size.
+    // The first CR at or after from, or the text's size. Lines are read in order, so the CRs of
+    // the block are taken one after the other, without looking at where the line starts.
     std::size_t nextCr(std::size_t from)
     {
-        auto block = from - from % Block;
-        if (block != block_)
-            loadBlock(block);
-        auto crs = crs_ & (~std::uint64_t{0} << (from - block));
-        while (crs == 0) {
-            block += Block;
-            if (block >= text_.size())
-                return text_.size();
-            loadBlock(block);
-            crs = crs_;
+        if (from < block_ || from >= block_ + Block) {
+            loadBlock(from - from % Block);
+            crs_ &= ~std::uint64_t{0} << (from - block_);
         }
-        return block + static_cast<std::size_t>(__builtin_ctzll(crs));
+        while (crs_ == 0) {
+            if (block_ + Block >= text_.size())
+                return text_.size();
+            loadBlock(block_ + Block);
+        }
+        const auto cr = block_ + static_cast<std::size_t>(__builtin_ctzll(crs_));
+        crs_ &= crs_ - 1;
+        return cr;
     }
 
     // Finds the CRs among the 64 bytes from block on (bytes past the text count as none).
@@ -58,5 +59,5 @@ private:
     std::string_view text_;
     std::size_t position_ = 0;
     std::size_t block_ = static_cast<std::size_t>(-1);
-    std::uint64_t crs_ = 0; // one bit for each CR of the block
+    std::uint64_t crs_ = 0; // one bit for each CR of the block not read yet
 };
