@@ -2,7 +2,7 @@
 // and composing the parsed record must never throw.
 #include <cstddef>
 #include <cstdint>
-#include <string_view>
+#include <string>
 
 #include "Composer.h"
 #include "DescriptionTabs.h"
@@ -15,7 +15,7 @@ extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size
     HeaderData header;
     DefaultAnswers dialogs;
     ParseProgress progress;
-    ParsePartFileContent(header, std::string_view(reinterpret_cast<const char*>(data), size), dialogs, progress);
+    ParsePartFileContent(header, std::string(reinterpret_cast<const char*>(data), size), dialogs, progress);
     header.AuthorRealName = header.ParsedRealName;
     RemoveDescriptionTabs(header, dialogs);
     const auto text = ComposeHeader(header);

@@ -38,10 +38,10 @@ std::optional<HeaderData> OpenForCli(const std::string& path, ConsoleDialogs& di
 {
     dialogs.setCurrentFile(path);
     try {
-        const FileBytes content(path);
+        FileBytes content(path);
         HeaderData header;
         ParseProgress silent;
-        OpenPartFileContent(header, path, content.view(), dialogs, silent);
+        OpenPartFileContent(header, path, content.takeBytes(), dialogs, silent);
         header.ReadStamp = content.stamp();
         return header;
     } catch (const std::exception& failure) {

@@ -2,6 +2,7 @@
 
 #include <cstdint>
 #include <sys/mman.h>
+#include <unistd.h>
 
 void AdviseLargeBuffer(void* buffer, std::size_t size)
 {
@@ -16,4 +17,13 @@ void AdviseLargeBuffer(void* buffer, std::size_t size)
     (void)buffer;
     (void)size;
 #endif
+}
+
+void ReleaseLargeBufferPages(char* begin, char* end)
+{
+    const auto pageSize = static_cast<std::uintptr_t>(::sysconf(_SC_PAGESIZE));
+    const auto first = (reinterpret_cast<std::uintptr_t>(begin) + pageSize - 1) & ~(pageSize - 1);
+    const auto last = reinterpret_cast<std::uintptr_t>(end) & ~(pageSize - 1);
+    if (last > first)
+        ::madvise(reinterpret_cast<void*>(first), last - first, MADV_DONTNEED);
 }

@@ -1,19 +1,38 @@
 #include "LineReader.h"
 
 #include <cstring>
+#ifdef __SSE2__
+#include <emmintrin.h>
+#endif
 
-std::string_view LineReader::nextLine()
+namespace {
+
+std::uint64_t crsIn(const char* bytes)
 {
-    const char* start = text_.data() + position_;
-    const std::size_t rest = text_.size() - position_;
-    const auto* cr = static_cast<const char*>(std::memchr(start, '\r', rest));
-    if (cr == nullptr) {
-        position_ = text_.size();
-        return {start, rest};
+    std::uint64_t crs = 0;
+#ifdef __SSE2__
+    const auto cr = _mm_set1_epi8('\r');
+    for (std::size_t part = 0; part < 64; part += 16) {
+        const auto sixteen = _mm_loadu_si128(reinterpret_cast<const __m128i*>(bytes + part));
+        crs |= std::uint64_t{static_cast<unsigned>(_mm_movemask_epi8(_mm_cmpeq_epi8(sixteen, cr)))} << part;
     }
-    const auto length = static_cast<std::size_t>(cr - start);
-    position_ += length + 1;
-    if (position_ < text_.size() && text_[position_] == '\n')
-        ++position_;
-    return {start, length};
+#else
+    for (std::size_t i = 0; i < 64; ++i)
+        crs |= std::uint64_t{bytes[i] == '\r'} << i;
+#endif
+    return crs;
+}
+
+} // namespace
+
+void LineReader::loadBlock(std::size_t block)
+{
+    block_ = block;
+    if (text_.size() - block >= Block) {
+        crs_ = crsIn(text_.data() + block);
+        return;
+    }
+    char tail[Block] = {};
+    std::memcpy(tail, text_.data() + block, text_.size() - block);
+    crs_ = crsIn(tail);
 }

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <cstddef>
+#include <cstdint>
 #include <string_view>
 
 // Reads a text line by line: a line ends at CR LF or at a lone CR, a lone LF stays inside the
@@ -7,13 +9,55 @@
 // line after it. The reader looks at the text; it copies nothing.
 class LineReader {
 public:
-    explicit LineReader(std::string_view text) : text_(text) {}
+    // Reads text from position on.
+    explicit LineReader(std::string_view text, std::size_t position = 0) : text_(text), position_(position) {}
 
     bool atEnd() const { return position_ >= text_.size(); }
-    std::string_view nextLine();
+    std::string_view nextLine()
+    {
+        const auto start = position_;
+        const auto cr = nextCr(start);
+        if (cr == text_.size()) {
+            position_ = cr;
+            return text_.substr(start);
+        }
+        position_ = cr + 1;
+        if (position_ < text_.size() && text_[position_] == '\n')
+            ++position_;
+        return text_.substr(start, cr - start);
+    }
     std::size_t remainingBytes() const { return text_.size() - position_; }
+    // Where the next line starts.
+    std::size_t position() const { return position_; }
 
 private:
+    // Part-file lines are short, so the search for their end is set up once per 64 bytes rather
+    // than once per line.
+    static constexpr std::size_t Block = 64;
+
+    // The first CR at or after from, or the text's size. Lines are read in order, so the CRs of
+    // the block are taken one after the other, without looking at where the line starts.
+    std::size_t nextCr(std::size_t from)
+    {
+        if (from < block_ || from >= block_ + Block) {
+            loadBlock(from - from % Block);
+            crs_ &= ~std::uint64_t{0} << (from - block_);
+        }
+        while (crs_ == 0) {
+            if (block_ + Block >= text_.size())
+                return text_.size();
+            loadBlock(block_ + Block);
+        }
+        const auto cr = block_ + static_cast<std::size_t>(__builtin_ctzll(crs_));
+        crs_ &= crs_ - 1;
+        return cr;
+    }
+
+    // Finds the CRs among the 64 bytes from block on (bytes past the text count as none).
+    void loadBlock(std::size_t block);
+
     std::string_view text_;
     std::size_t position_ = 0;
+    std::size_t block_ = static_cast<std::size_t>(-1);
+    std::uint64_t crs_ = 0; // one bit for each CR of the block not read yet
 };

@@ -6,9 +6,8 @@
 #include "Dates.h"
 #include "Dialogs.h"
 #include "ErrorReport.h"
-#include "LargeBuffer.h"
+#include "InPlaceBody.h"
 #include "LineEnds.h"
-#include "LineReader.h"
 #include "ParseProgress.h"
 #include "PartFile.h"
 #include "Text.h"
@@ -44,6 +43,26 @@ bool isOneOf(std::string_view word, std::initializer_list<std::string_view> form
     return false;
 }
 
+// A header of millions of lines would have its old-header text and its lists grow by doubling,
+// each step holding the old and the new buffer at once. Once they are large they take at once the
+// room the rest of the text could still fill; room never written to is never touched and costs
+// address space only.
+constexpr std::size_t LargeText = std::size_t{1024} * 1024;
+constexpr std::size_t LargeList = 4096;
+constexpr std::size_t ShortestListLine = 6; // "0 // x"
+
+void makeRoom(std::string& text, std::size_t adding, std::size_t restOfText)
+{
+    if (text.size() + adding > text.capacity() && text.size() >= LargeText)
+        text.reserve(text.size() + adding + restOfText);
+}
+
+void makeRoom(StringList& list, std::size_t restOfText)
+{
+    if (list.size() == list.capacity() && list.size() >= LargeList)
+        list.reserve(list.size() + 1 + restOfText / ShortestListLine);
+}
+
 void appendLine(std::string& text, std::string_view line)
 {
     if (!text.empty())
@@ -53,13 +72,13 @@ void appendLine(std::string& text, std::string_view line)
 
 class HeaderParser {
 public:
-    explicit HeaderParser(HeaderData& header) : h_(header) {}
+    HeaderParser(HeaderData& header, InPlaceBody& body) : h_(header), body_(body) {}
 
     void classify(std::string_view line, std::size_t lineNumber);
     bool headerEnded() const { return headerEnded_; }
 
 private:
-    void toBody(std::string_view line) { appendLine(h_.Body, TrimBlanks(line)); }
+    void toBody(std::string_view line) { body_.keep(line); }
     void endHeader(std::string_view line)
     {
         headerEnded_ = true;
@@ -68,6 +87,11 @@ private:
     std::string_view word(std::size_t position) const { return words_.word(position); }
     std::size_t wordCount() const { return words_.count(); }
     std::string joinedFrom(std::size_t k) const { return words_.joinedFrom(k); }
+    void addEntry(StringList& list, std::string entry)
+    {
+        makeRoom(list, body_.remainingBytes());
+        list.push_back(std::move(entry));
+    }
 
     void takeDescription(std::string_view line);
     void takeKeywordLine(std::string_view line);
@@ -78,6 +102,7 @@ private:
     void takeDatedOrBody(std::string_view line);
 
     HeaderData& h_;
+    InPlaceBody& body_;
     bool headerEnded_ = false;
     Words words_;
 };
@@ -91,6 +116,7 @@ void HeaderParser::classify(std::string_view line, std::size_t lineNumber)
         endHeader(line);
         return;
     }
+    makeRoom(h_.OldHeader, line.size() + CrLf.size(), body_.remainingBytes());
     appendLine(h_.OldHeader, line);
     if (lineNumber == 1) {
         takeDescription(line);
@@ -121,7 +147,7 @@ void HeaderParser::takeKeywordLine(std::string_view line)
     else if (keyword == "BFC")
         takeBfc(line);
     else if (keyword == "COLOR")
-        h_.ColorLines.emplace_back(line);
+        addEntry(h_.ColorLines, std::string(line));
     else if (isOneOf(keyword, {"Unofficial", "unofficial", "UNOFFICIAL"})) {
         if (isOneOf(word(3), {"Part", "Model", "part", "model", "element", "Element", "ELEMENT"}))
             h_.PartType = "Unofficial_Part";
@@ -133,15 +159,15 @@ void HeaderParser::takeKeywordLine(std::string_view line)
     } else if (isOneOf(keyword, {"!LDRAW_ORG", "LDRAW_ORG", "!LDRAW"}))
         takePartType();
     else if (isOneOf(keyword, {"!CMDLINE", "CMDLINE"}))
-        h_.CmdLines.push_back(joinedFrom(3));
+        addEntry(h_.CmdLines, joinedFrom(3));
     else if (isOneOf(keyword, {"!KEYWORDS", "KEYWORDS"}))
-        h_.Keywords.push_back(joinedFrom(3));
+        addEntry(h_.Keywords, joinedFrom(3));
     else if (keyword == "!HELP")
-        h_.HelpLines.push_back(joinedFrom(3));
+        addEntry(h_.HelpLines, joinedFrom(3));
     else if (keyword == "!LICENSE")
         h_.License = joinedFrom(3);
     else if (isOneOf(keyword, {"HISTORY", "!HISTORY"}))
-        h_.History.push_back(joinedFrom(3));
+        addEntry(h_.History, joinedFrom(3));
     else if (keyword == "//")
         takeComment();
     else
@@ -206,9 +232,9 @@ void HeaderParser::takePartType()
 void HeaderParser::takeComment()
 {
     if (const auto date = DateOfWord(word(3)))
-        h_.History.push_back(*date + " " + joinedFrom(4));
+        addEntry(h_.History, *date + " " + joinedFrom(4));
     else
-        h_.Comments.push_back(joinedFrom(2));
+        addEntry(h_.Comments, joinedFrom(2));
 }
 
 // An old history line without keyword ("0 2004-03-12 [jdoe] fixed"), or a meta line the header
@@ -216,7 +242,7 @@ void HeaderParser::takeComment()
 void HeaderParser::takeDatedOrBody(std::string_view line)
 {
     if (const auto date = DateOfWord(word(2)))
-        h_.History.push_back(*date + " " + joinedFrom(3));
+        addEntry(h_.History, *date + " " + joinedFrom(3));
     else
         toBody(line);
 }
@@ -232,55 +258,6 @@ void clearParsedContent(HeaderData& header)
     header.History.clear();
     header.ColorLines.clear();
 }
-
-// Adds the lines after the end of the header to the body. Most of them need no trimming and end
-// with CR LF, so runs of such lines are copied in one piece instead of line by line.
-class BodyCollector {
-public:
-    // The body cannot grow beyond the rest of the text: make room once instead of step by step.
-    BodyCollector(std::string& body, std::size_t restOfText) : body_(body)
-    {
-        body_.reserve(body_.size() + restOfText + 2);
-        AdviseLargeBuffer(body_.data(), body_.capacity());
-    }
-    ~BodyCollector() { flush(); }
-    BodyCollector(const BodyCollector&) = delete;
-    BodyCollector& operator=(const BodyCollector&) = delete;
-
-    void add(std::string_view line)
-    {
-        if (fitsRun(line)) {
-            if (runStart_ == nullptr)
-                runStart_ = line.data();
-            runEnd_ = line.data() + line.size();
-            return;
-        }
-        flush();
-        appendLine(body_, TrimBlanks(line));
-    }
-
-private:
-    // A line joins the run when it needs no trimming, follows the run directly after a CR LF,
-    // and, when empty, has text before it (an empty line adds nothing to an empty body).
-    bool fitsRun(std::string_view line) const
-    {
-        if (line.empty() ? (runStart_ == nullptr && body_.empty()) : (line.front() == ' ' || line.back() == ' '))
-            return false;
-        return runStart_ == nullptr || (line.data() == runEnd_ + 2 && runEnd_[0] == '\r' && runEnd_[1] == '\n');
-    }
-
-    void flush()
-    {
-        if (runStart_ == nullptr)
-            return;
-        appendLine(body_, std::string_view(runStart_, static_cast<std::size_t>(runEnd_ - runStart_)));
-        runStart_ = runEnd_ = nullptr;
-    }
-
-    std::string& body_;
-    const char* runStart_ = nullptr;
-    const char* runEnd_ = nullptr;
-};
 
 class BusyPointer {
 public:
@@ -300,12 +277,11 @@ std::string ProgressCaption(std::size_t linesRead)
     return "Parsing file. Line " + std::to_string(linesRead) + ". Please wait...";
 }
 
-void ParseHeaderText(HeaderData& header, std::string_view text, ParseProgress& progress)
+void ParseHeaderText(HeaderData& header, std::string text, ParseProgress& progress)
 {
     clearParsedContent(header);
-    header.Encoding = EncodingOf(text);
     BusyPointer busy(progress);
-    LineReader reader(text);
+    InPlaceBody lines(text);
     std::size_t linesRead = 0;
     const auto nextLine = [&]() {
         if (linesRead % 10 == 0) {
@@ -313,36 +289,43 @@ void ParseHeaderText(HeaderData& header, std::string_view text, ParseProgress& p
             progress.processEvents();
         }
         ++linesRead;
-        return reader.nextLine();
+        return lines.nextLine();
     };
-    HeaderParser parser(header);
-    while (!reader.atEnd() && !parser.headerEnded()) {
-        const auto line = nextLine();
-        parser.classify(line, linesRead);
+    HeaderParser parser(header, lines);
+    const auto finish = [&header, &lines]() {
+        header.Encoding = lines.utf8() ? TextEncoding::Utf8 : TextEncoding::Latin1;
+        header.Body = lines.take();
+    };
+    try {
+        while (!lines.atEnd() && !parser.headerEnded()) {
+            const auto line = nextLine();
+            parser.classify(line, linesRead);
+        }
+        while (!lines.atEnd())
+            lines.keep(nextLine());
+    } catch (...) {
+        finish(); // what the lines before the failure gave
+        throw;
     }
-    BodyCollector body(header.Body, reader.remainingBytes());
-    while (!reader.atEnd())
-        body.add(nextLine());
+    finish();
 }
 
-bool ParsePartFileContent(HeaderData& header, std::string_view content, Dialogs& dialogs, ParseProgress& progress)
+bool ParsePartFileContent(HeaderData& header, std::string content, Dialogs& dialogs, ParseProgress& progress)
 {
     EnsureTextFile(content, header.FilePath);
     // Editors that put a byte order mark before the first line would otherwise hide the whole
     // header in the body, and a save would write a second, empty header above it.
     header.ByteOrderMark = content.starts_with(Utf8ByteOrderMark);
     if (header.ByteOrderMark)
-        content.remove_prefix(Utf8ByteOrderMark.size());
+        content.erase(0, Utf8ByteOrderMark.size());
     const bool empty = content.empty();
     if (empty)
         ReportError(dialogs, InputPastEndOfFileError(), IsUnixLineEndProcedure);
-    if (!IsUnixLineEnd(content)) {
-        ParseHeaderText(header, content, progress);
-        return !empty;
+    if (IsUnixLineEnd(content)) {
+        LfToCrLf(content);
+        content += CrLf;
     }
-    auto converted = LfToCrLf(content);
-    converted += CrLf;
-    ParseHeaderText(header, converted, progress);
+    ParseHeaderText(header, std::move(content), progress);
     return !empty;
 }
 
@@ -363,7 +346,7 @@ bool GetGlobalContent(HeaderData& header, Dialogs& dialogs, ParseProgress& progr
         return false;
     }
     try {
-        if (!ParsePartFileContent(header, content->view(), dialogs, progress))
+        if (!ParsePartFileContent(header, content->takeBytes(), dialogs, progress))
             return false;
         header.ReadStamp = content->stamp();
         return true;

@@ -10,13 +10,14 @@ class ParseProgress;
 
 // Distributes the lines of a CR LF text over the record: header fields and lists, OldHeader and
 // Body. Replaces the lists and OldHeader and Body first, so a parse never adds to an earlier one.
-void ParseHeaderText(HeaderData& header, std::string_view text, ParseProgress& progress);
+// The text's string becomes the Body: handed over (moved in), the text costs no second copy.
+void ParseHeaderText(HeaderData& header, std::string text, ParseProgress& progress);
 
 // The content of the part file as read: the text check (NotTextFileError for a binary file), the
 // line-end check (an empty file is reported as the check always has), the conversion of an
-// LF-only file in memory, then the parse. The file on disk is never touched. False when the file
-// was empty.
-bool ParsePartFileContent(HeaderData& header, std::string_view content, Dialogs& dialogs, ParseProgress& progress);
+// LF-only file in memory, then the parse. The file on disk is never touched. Content with spare
+// capacity is converted where it lies. False when the file was empty.
+bool ParsePartFileContent(HeaderData& header, std::string content, Dialogs& dialogs, ParseProgress& progress);
 
 // Reads and parses the file named by FilePath into header, a record of its own. Failures (no such
 // file, no regular file, an empty or binary file, a failed parse) are reported through dialogs

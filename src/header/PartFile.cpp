@@ -2,7 +2,6 @@
 
 #include <algorithm>
 #include <cerrno>
-#include <cstring>
 #include <fcntl.h>
 #include <sys/resource.h>
 #include <sys/stat.h>
@@ -14,9 +13,9 @@
 
 namespace {
 
-// Opening a file holds its bytes, the body copied out of them and the composed text: about three
-// times its size. A file that cannot fit three times into memory (or the process's address-space
-// limit) is refused up front rather than failing half-way.
+// Opening a file holds its bytes (which become the body), the header taken out of them and the
+// composed text: up to about three times its size. A file that cannot fit three times into memory
+// (or the process's address-space limit) is refused up front rather than failing half-way.
 void ensureRoomFor(std::size_t size)
 {
     const auto pages = ::sysconf(_SC_PHYS_PAGES);
@@ -30,13 +29,19 @@ void ensureRoomFor(std::size_t size)
         throw OutOfMemoryError();
 }
 
-std::unique_ptr<char[]> allocate(std::size_t size)
+// Room for size bytes, and behind them for every byte to become two when the line ends are
+// turned into CR LF, plus one more line end. Memory the conversion does not use is never touched
+// and costs address space only.
+void reserveFor(std::string& bytes, std::size_t size)
 {
     ensureRoomFor(size);
-    auto buffer = std::make_unique_for_overwrite<char[]>(size);
-    AdviseLargeBuffer(buffer.get(), size);
-    return buffer;
+    bytes.reserve(2 * size + 2);
+    AdviseLargeBuffer(bytes.data(), bytes.capacity());
 }
+
+// A string cannot grow without writing its new bytes, so it grows by steps that stay in the
+// cache before read() overwrites them.
+constexpr std::size_t ReadStep = std::size_t{256} * 1024;
 
 } // namespace
 
@@ -52,24 +57,25 @@ FileBytes::FileBytes(const std::string& path)
     if (!S_ISREG(info.st_mode))
         throw PathFileAccessError();
     stamp_ = StampOf(info);
-    // One byte more than the size that fstat saw, so that reaching the end needs no second buffer.
-    std::size_t capacity = static_cast<std::size_t>(info.st_size) + 1;
-    bytes_ = allocate(capacity);
+    const auto expected = static_cast<std::size_t>(info.st_size);
+    reserveFor(bytes_, expected);
     for (;;) {
-        if (size_ == capacity) { // the file grew while it was read
-            auto larger = allocate(capacity * 2);
-            std::memcpy(larger.get(), bytes_.get(), size_);
-            bytes_ = std::move(larger);
-            capacity *= 2;
-        }
-        const auto got = ::read(file.get(), bytes_.get() + size_, capacity - size_);
+        const auto filled = bytes_.size();
+        if (filled == bytes_.capacity()) // the file grew while it was read
+            reserveFor(bytes_, 2 * filled);
+        // One byte more than the size that fstat saw, so that the end is seen without zeroing
+        // more than that; past it, the file grew.
+        const auto wanted = filled <= expected ? expected + 1 - filled : ReadStep;
+        bytes_.resize(filled + std::min({bytes_.capacity() - filled, ReadStep, wanted}));
+        const auto got = ::read(file.get(), bytes_.data() + filled, bytes_.size() - filled);
+        const int readError = errno;
+        bytes_.resize(filled + static_cast<std::size_t>(std::max<ssize_t>(got, 0)));
         if (got < 0) {
-            if (errno == EINTR)
+            if (readError == EINTR)
                 continue;
-            throw OsError(errno, path);
+            throw OsError(readError, path);
         }
         if (got == 0)
             return;
-        size_ += static_cast<std::size_t>(got);
     }
 }

@@ -1,6 +1,5 @@
 #pragma once
 
-#include <memory>
 #include <string>
 #include <string_view>
 
@@ -10,18 +9,23 @@
 // device) is refused before a byte is read, so a file name can never make the program wait
 // or read without end. A file that another program shortens or lengthens meanwhile yields the
 // bytes that were there to read.
+//
+// The buffer is a string with room behind the bytes for turning every line end into CR LF, so
+// that the parser can convert and compact it where it lies and keep it as the body: a file is
+// held in memory once.
 class FileBytes {
 public:
     // Throws QmError: the classic number when the file cannot be read, 75 (Path/File access
     // error) when it is no regular file, 7 (Out of memory) when it is too large to work on.
     explicit FileBytes(const std::string& path);
 
-    std::string_view view() const { return {bytes_.get(), size_}; }
+    std::string_view view() const { return bytes_; }
+    // Hands the bytes over; the object holds none afterwards.
+    std::string takeBytes() { return std::move(bytes_); }
     // The file as it was when it was opened.
     const FileStamp& stamp() const { return stamp_; }
 
 private:
-    std::unique_ptr<char[]> bytes_;
-    std::size_t size_ = 0;
+    std::string bytes_;
     FileStamp stamp_;
 };

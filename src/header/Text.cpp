@@ -109,25 +109,46 @@ bool ContainsIgnoreCase(std::string_view text, std::string_view needle)
     return false;
 }
 
-bool IsValidUtf8(std::string_view bytes)
+namespace {
+
+// Part files are mostly ASCII: 64 bytes are tested at once, as eight words.
+constexpr std::size_t AsciiBlock = 64;
+
+bool asciiBlockAt(std::string_view bytes, std::size_t i)
 {
-    for (std::size_t i = 0; i < bytes.size();) {
-        // Part files are mostly ASCII: skip eight such bytes at a time.
-        std::uint64_t chunk = 0;
-        if (i + sizeof chunk <= bytes.size()) {
-            std::memcpy(&chunk, bytes.data() + i, sizeof chunk);
-            if ((chunk & 0x8080808080808080ULL) == 0) {
-                i += sizeof chunk;
-                continue;
-            }
-        }
-        const auto length = utf8SequenceLength(bytes, i);
-        if (length == 0)
-            return false;
-        i += length;
+    std::uint64_t any = 0;
+    for (std::size_t k = 0; k < AsciiBlock; k += sizeof any) {
+        std::uint64_t word = 0;
+        std::memcpy(&word, bytes.data() + i + k, sizeof word);
+        any |= word;
     }
-    return true;
+    return (any & 0x8080808080808080ULL) == 0;
 }
+
+} // namespace
+
+std::size_t CheckUtf8(std::string_view bytes, std::size_t from, std::size_t until)
+{
+    until = std::min(until, bytes.size());
+    auto i = from;
+    while (i < until) {
+        if (i + AsciiBlock <= bytes.size() && asciiBlockAt(bytes, i)) {
+            i += AsciiBlock;
+            continue;
+        }
+        // A block with other bytes, or the last bytes: one character at a time.
+        const auto blockEnd = std::min(i + AsciiBlock, bytes.size());
+        while (i < blockEnd) {
+            const auto length = utf8SequenceLength(bytes, i);
+            if (length == 0)
+                return std::string_view::npos;
+            i += length;
+        }
+    }
+    return i;
+}
+
+bool IsValidUtf8(std::string_view bytes) { return CheckUtf8(bytes, 0, bytes.size()) != std::string_view::npos; }
 
 TextEncoding EncodingOf(std::string_view bytes)
 {

@@ -29,6 +29,10 @@ std::string ToUpperAscii(std::string_view text);
 bool ContainsIgnoreCase(std::string_view text, std::string_view needle);
 
 bool IsValidUtf8(std::string_view bytes);
+// Checks bytes as UTF-8 from position from (the start of a character) up to at least until: the
+// position where the check stopped, a character boundary at or after until (or the end), or npos
+// when a byte is not UTF-8. Checked piece by piece, a text gives what one check of it gives.
+std::size_t CheckUtf8(std::string_view bytes, std::size_t from, std::size_t until);
 TextEncoding EncodingOf(std::string_view bytes);
 
 // The number of characters the window shows for text: code points in UTF-8, else bytes.

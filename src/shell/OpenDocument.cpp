@@ -20,13 +20,13 @@ bool FinishOpenedRecord(HeaderData& header, Dialogs& dialogs)
     return RemoveDescriptionTabs(header, dialogs);
 }
 
-void OpenPartFileContent(HeaderData& header, const std::string& path, std::string_view content, Dialogs& dialogs,
+void OpenPartFileContent(HeaderData& header, const std::string& path, std::string content, Dialogs& dialogs,
                          ParseProgress& progress)
 {
     header.Loading = true;
     ResetHeaderRecord(header);
     TakeFileToOpen(header, path, dialogs);
-    ParsePartFileContent(header, content, dialogs, progress);
+    ParsePartFileContent(header, std::move(content), dialogs, progress);
     FinishOpenedRecord(header, dialogs);
     header.Loading = false;
 }

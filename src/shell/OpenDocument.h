@@ -1,7 +1,6 @@
 #pragma once
 
 #include <string>
-#include <string_view>
 
 #include "HeaderData.h"
 
@@ -17,6 +16,6 @@ void TakeFileToOpen(HeaderData& header, const std::string& path, Dialogs& dialog
 bool FinishOpenedRecord(HeaderData& header, Dialogs& dialogs);
 
 // Opens already read part-file content the way the Open command opens a file, without a window:
-// reset, take the path, parse, finish. Used by the command-line tool.
-void OpenPartFileContent(HeaderData& header, const std::string& path, std::string_view content, Dialogs& dialogs,
+// reset, take the path, parse, finish. Used by the command-line tool. The content becomes the body.
+void OpenPartFileContent(HeaderData& header, const std::string& path, std::string content, Dialogs& dialogs,
                          ParseProgress& progress);

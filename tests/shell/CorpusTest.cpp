@@ -33,7 +33,7 @@ HeaderData opened(const std::string& path, const std::string& content)
 std::vector<std::string> nonEmptyLinesAfterTheHeader(std::string content)
 {
     if (IsUnixLineEnd(content))
-        content = LfToCrLf(content);
+        LfToCrLf(content);
     std::vector<std::string> lines;
     bool headerEnded = false;
     LineReader reader(content);
