@@ -9,10 +9,19 @@ constexpr qint64 FrameMilliseconds = 16;
 
 } // namespace
 
-void WindowProgress::processEvents() { QCoreApplication::processEvents(QEventLoop::ExcludeUserInputEvents); }
+// Asked every tenth line, the event loop runs at the screen's pace: a pass through it for each of
+// 100,000 asks would take longer than the parse of a million lines itself.
+void WindowProgress::processEvents()
+{
+    if (sinceLastEvents_.isValid() && sinceLastEvents_.elapsed() < FrameMilliseconds)
+        return;
+    QCoreApplication::processEvents(QEventLoop::ExcludeUserInputEvents);
+    sinceLastEvents_.start();
+}
 
 void WindowProgress::setBusy(bool busy)
 {
+    sinceLastEvents_.invalidate(); // the first ask of a parse always passes through the event loop
     if (busy)
         QApplication::setOverrideCursor(Qt::WaitCursor);
     else
