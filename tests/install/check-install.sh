@@ -12,7 +12,7 @@ DESTDIR="$dest" cmake --install "$build_dir" --prefix /usr >/dev/null
 usr="$dest/usr"
 id=io.github.quillmark.Quillmark
 for file in bin/quillmark bin/quillmark-cli \
-            share/quillmark/category.txt share/quillmark/parttype.txt share/quillmark/bfc.txt share/quillmark/licenses.txt \
+            share/quillmark/category.txt share/quillmark/parttype.txt share/quillmark/bfc.txt share/quillmark/licenses.txt share/quillmark/colourcodes.txt \
             share/applications/$id.desktop share/mime/packages/$id.xml share/metainfo/$id.metainfo.xml \
             share/icons/hicolor/48x48/apps/$id.png share/man/man1/quillmark.1 share/man/man1/quillmark-cli.1; do
     [ -f "$usr/$file" ] || { echo "not installed: $file"; exit 1; }

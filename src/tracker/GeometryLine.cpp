@@ -1,0 +1,160 @@
+#include "GeometryLine.h"
+
+#include <charconv>
+
+#include "TrackerText.h"
+
+namespace {
+
+struct NumberPrefix {
+    std::size_t longest = 0; // the length of the longest prefix that is a number, or 0
+    bool ascii = true;       // its digits are ASCII ones
+};
+
+// The number at the start of text within its first atMost bytes.
+NumberPrefix numberAt(std::string_view text, std::size_t atMost, bool plusAllowed)
+{
+    NumberPrefix result;
+    std::size_t i = !text.empty() && (text[0] == '-' || (plusAllowed && text[0] == '+')) ? 1 : 0;
+    std::size_t digit = 0;
+    while (i < atMost && (digit = DigitLengthAt(text, i)) != 0 && i + digit <= atMost) {
+        result.ascii = result.ascii && digit == 1;
+        i += digit;
+        result.longest = i;
+    }
+    if (i < atMost && text[i] == '.') {
+        ++i;
+        while (i < atMost && (digit = DigitLengthAt(text, i)) != 0 && i + digit <= atMost) {
+            result.ascii = result.ascii && digit == 1;
+            i += digit;
+            result.longest = i;
+        }
+    }
+    return result;
+}
+
+// The number's value; numbers written with other than ASCII digits count as 0, as the Tracker's
+// conversion has them.
+double valueOf(std::string_view number, bool ascii)
+{
+    double value = 0;
+    if (ascii)
+        std::from_chars(number.data(), number.data() + number.size(), value);
+    return value;
+}
+
+// The next space-delimited word of text from pos on; pos moves past it.
+std::string_view nextWord(std::string_view text, std::size_t& pos)
+{
+    auto end = pos;
+    while (end < text.size() && text[end] != ' ')
+        ++end;
+    const auto word = text.substr(pos, end - pos);
+    pos = end;
+    return word;
+}
+
+bool readColour(std::string_view word, GeometryLine& line)
+{
+    if (word.size() == 9 && word.substr(0, 3) == "0x2") {
+        line.directColour = word.find_first_not_of("0123456789abcdefABCDEF", 3) == std::string_view::npos;
+        return line.directColour;
+    }
+    line.colour = 0;
+    bool ascii = true;
+    for (std::size_t i = 0, digit = 0; i < word.size(); i += digit) {
+        if ((digit = DigitLengthAt(word, i)) == 0)
+            return false;
+        ascii = ascii && digit == 1;
+        if (ascii && line.colour >= 0)
+            line.colour = line.colour > 99999999 ? -1 : line.colour * 10 + (word[i] - '0');
+    }
+    if (!ascii)
+        line.colour = 0;
+    return !word.empty();
+}
+
+// The type digit and the colour, each followed by a blank; pos moves to that blank.
+bool readStart(std::string_view text, std::size_t& pos, GeometryLine& line)
+{
+    line.type = text[0] - '0';
+    line.directColour = false;
+    if (text.size() < 3 || text[1] != ' ')
+        return false;
+    pos = 2;
+    line.colourText = nextWord(text, pos);
+    return readColour(line.colourText, line) && pos < text.size();
+}
+
+bool readNumber(std::string_view word, double& value)
+{
+    const auto number = numberAt(word, word.size(), false);
+    if (number.longest != word.size() || word.empty())
+        return false;
+    value = valueOf(word, number.ascii);
+    return true;
+}
+
+// Types 2 to 5: the colour, count numbers and nothing else.
+bool readPointsLine(std::string_view text, std::size_t count, GeometryLine& line)
+{
+    std::size_t pos = 0;
+    if (!readStart(text, pos, line))
+        return false;
+    for (std::size_t i = 0; i < count; ++i) {
+        if (pos >= text.size() || text[pos] != ' ')
+            return false;
+        if (!readNumber(nextWord(text, ++pos), line.numbers[i]))
+            return false;
+    }
+    return pos == text.size() || text.substr(pos) == " ";
+}
+
+// Type 1: the colour, twelve numbers and a file name. The blank before the file name is optional,
+// so the last number is the longest that leaves a name behind it: "... 0 1x.dat" places "x.dat"
+// with 1 as the last entry.
+bool readSubfileLine(std::string_view text, GeometryLine& line)
+{
+    std::size_t pos = 0;
+    if (!readStart(text, pos, line))
+        return false;
+    for (std::size_t i = 0; i < 11; ++i) {
+        if (pos >= text.size() || text[pos] != ' ')
+            return false;
+        if (!readNumber(nextWord(text, ++pos), line.numbers[i]))
+            return false;
+    }
+    if (pos >= text.size() || text[pos] != ' ')
+        return false;
+    const auto rest = text.substr(pos + 1);
+    const auto number = numberAt(rest, rest.size() - std::min<std::size_t>(rest.size(), 1), false);
+    if (number.longest == 0)
+        return false;
+    line.numbers[11] = valueOf(rest.substr(0, number.longest), number.ascii);
+    auto file = rest.substr(number.longest);
+    while (!file.empty() && file.front() == ' ')
+        file.remove_prefix(1);
+    while (!file.empty() && file.back() == ' ')
+        file.remove_suffix(1);
+    line.file = file;
+    return !file.empty();
+}
+
+} // namespace
+
+bool IsTrackerNumber(std::string_view text, bool plusAllowed)
+{
+    return !text.empty() && numberAt(text, text.size(), plusAllowed).longest == text.size();
+}
+
+bool ReadGeometryLine(std::string_view text, GeometryLine& line)
+{
+    switch (text.empty() ? 0 : text[0]) {
+    case '1': return readSubfileLine(text, line);
+    case '2': return readPointsLine(text, 6, line);
+    case '3': return readPointsLine(text, 9, line);
+    case '4':
+    case '5': return readPointsLine(text, 12, line);
+    default: return false;
+    }
+}
