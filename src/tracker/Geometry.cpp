@@ -21,6 +21,18 @@ Point unit(const Point& a)
 // The normal of triangle a b c as the Tracker orients it.
 Point triangleNormal(const Point& a, const Point& b, const Point& c) { return unit(cross(a - b, c - a)); }
 
+// The cosine of the angle between u and v in the Tracker's own arithmetic (1 - (1 - cos) rounds
+// differently from cos alone), clamped into [-1, 1] so that exactly colinear points give 0 or
+// 180 degrees rather than no angle.
+double cosineBetween(const Point& u, const Point& v)
+{
+    return std::clamp(1 - (1 - dot(u, v) / (length(u) * length(v))), -1.0, 1.0);
+}
+
+double degreesOf(double cosine) { return std::acos(cosine) * 180 / std::numbers::pi; }
+
+double angleBetween(const Point& u, const Point& v) { return degreesOf(cosineBetween(u, v)); }
+
 } // namespace
 
 bool IsSingularPlacement(const std::array<double, 12>& m)
@@ -31,25 +43,19 @@ bool IsSingularPlacement(const std::array<double, 12>& m)
     return std::abs(determinant) <= 1e-11;
 }
 
-double AngleBetween(const Point& u, const Point& v)
-{
-    // The Tracker's own arithmetic, 1 - (1 - cos), rounds differently from cos alone.
-    const double cosine = 1 - (1 - dot(u, v) / (length(u) * length(v)));
-    return std::acos(std::clamp(cosine, -1.0, 1.0)) * 180 / std::numbers::pi;
-}
-
 std::optional<double> ColinearAngle(const Point* p, int count)
 {
-    double largest = 0, smallest = 180;
+    // The largest angle has the smallest cosine: only the two extremes need their angle.
+    double smallestCosine = 1, largestCosine = -1;
     for (int k = 0; k < count; ++k) {
         const auto& corner = p[(k + 1) % count];
-        const auto angle = AngleBetween(p[k] - corner, p[(k + 2) % count] - corner);
-        largest = std::max(largest, angle);
-        smallest = std::min(smallest, angle);
+        const auto cosine = cosineBetween(p[k] - corner, p[(k + 2) % count] - corner);
+        smallestCosine = std::min(smallestCosine, cosine);
+        largestCosine = std::max(largestCosine, cosine);
     }
-    if (largest > 179.9)
+    if (const auto largest = degreesOf(smallestCosine); largest > 179.9)
         return largest;
-    if (smallest < 0.025)
+    if (const auto smallest = degreesOf(largestCosine); smallest < 0.025)
         return smallest;
     return std::nullopt;
 }
@@ -68,7 +74,7 @@ bool IsConvexQuad(const std::array<Point, 4>& p)
 
 double QuadBend(const std::array<Point, 4>& p)
 {
-    const auto alongTwoFour = AngleBetween(triangleNormal(p[0], p[1], p[3]), triangleNormal(p[1], p[2], p[3]));
-    const auto alongOneThree = AngleBetween(triangleNormal(p[0], p[2], p[3]), triangleNormal(p[0], p[1], p[2]));
+    const auto alongTwoFour = angleBetween(triangleNormal(p[0], p[1], p[3]), triangleNormal(p[1], p[2], p[3]));
+    const auto alongOneThree = angleBetween(triangleNormal(p[0], p[2], p[3]), triangleNormal(p[0], p[1], p[2]));
     return std::max(alongTwoFour, alongOneThree);
 }

@@ -13,10 +13,6 @@ struct Point {
 // A type 1 line's placement: the 3x3 matrix a..i has a determinant within 1e-11 of zero.
 bool IsSingularPlacement(const std::array<double, 12>& numbers);
 
-// The angle between u and v in degrees, computed as the Tracker does, with the cosine clamped
-// into [-1, 1] so that exactly colinear points give 0 or 180 rather than no angle.
-double AngleBetween(const Point& u, const Point& v);
-
 // The largest corner angle when it is above 179.9 degrees, else the smallest when it is below
 // 0.025 degrees; none when the corners are fine. Takes 3 or 4 points.
 std::optional<double> ColinearAngle(const Point* points, int count);

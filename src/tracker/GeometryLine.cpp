@@ -1,45 +1,67 @@
 #include "GeometryLine.h"
 
 #include <charconv>
+#include <cstdint>
 
 #include "TrackerText.h"
 
 namespace {
 
 struct NumberPrefix {
-    std::size_t longest = 0; // the length of the longest prefix that is a number, or 0
-    bool ascii = true;       // its digits are ASCII ones
+    std::size_t longest = 0;  // the length of the longest prefix that is a number, or 0
+    bool ascii = true;        // its digits are ASCII ones
+    std::uint64_t digits = 0; // its digits as one whole number, while they are few
+    int count = 0, fraction = 0;
 };
+
+// Reads the digits of text from i on, within its first atMost bytes.
+void readDigits(std::string_view text, std::size_t& i, std::size_t atMost, NumberPrefix& number, bool inFraction)
+{
+    while (i < atMost) {
+        const auto c = static_cast<unsigned char>(text[i]);
+        std::size_t digit = c >= '0' && c <= '9' ? 1 : c < 0x80 ? 0 : DigitLength(text.substr(i));
+        if (digit == 0 || i + digit > atMost)
+            return;
+        if (digit == 1) {
+            number.digits = number.digits * 10 + (c - '0');
+            ++number.count;
+            number.fraction += inFraction ? 1 : 0;
+        }
+        number.ascii = number.ascii && digit == 1;
+        i += digit;
+        number.longest = i;
+    }
+}
 
 // The number at the start of text within its first atMost bytes.
 NumberPrefix numberAt(std::string_view text, std::size_t atMost, bool plusAllowed)
 {
     NumberPrefix result;
     std::size_t i = !text.empty() && (text[0] == '-' || (plusAllowed && text[0] == '+')) ? 1 : 0;
-    std::size_t digit = 0;
-    while (i < atMost && (digit = DigitLengthAt(text, i)) != 0 && i + digit <= atMost) {
-        result.ascii = result.ascii && digit == 1;
-        i += digit;
-        result.longest = i;
-    }
+    readDigits(text, i, atMost, result, false);
     if (i < atMost && text[i] == '.') {
         ++i;
-        while (i < atMost && (digit = DigitLengthAt(text, i)) != 0 && i + digit <= atMost) {
-            result.ascii = result.ascii && digit == 1;
-            i += digit;
-            result.longest = i;
-        }
+        readDigits(text, i, atMost, result, true);
     }
     return result;
 }
 
 // The number's value; numbers written with other than ASCII digits count as 0, as the Tracker's
-// conversion has them.
-double valueOf(std::string_view number, bool ascii)
+// conversion has them. A short decimal is its digits as a whole number divided by a power of ten:
+// both are exact doubles, so the one division rounds as a full conversion would. Most numbers of
+// a part are short; the others take the full conversion.
+double valueOf(std::string_view number, const NumberPrefix& read)
 {
+    static constexpr double PowersOfTen[] = {1e0, 1e1, 1e2,  1e3,  1e4,  1e5,  1e6,  1e7,
+                                             1e8, 1e9, 1e10, 1e11, 1e12, 1e13, 1e14, 1e15};
+    if (!read.ascii)
+        return 0;
+    if (read.count <= 15) {
+        const auto value = static_cast<double>(read.digits) / PowersOfTen[read.fraction];
+        return number[0] == '-' ? -value : value;
+    }
     double value = 0;
-    if (ascii)
-        std::from_chars(number.data(), number.data() + number.size(), value);
+    std::from_chars(number.data(), number.data() + number.size(), value);
     return value;
 }
 
@@ -91,7 +113,7 @@ bool readNumber(std::string_view word, double& value)
     const auto number = numberAt(word, word.size(), false);
     if (number.longest != word.size() || word.empty())
         return false;
-    value = valueOf(word, number.ascii);
+    value = valueOf(word, number);
     return true;
 }
 
@@ -130,7 +152,7 @@ bool readSubfileLine(std::string_view text, GeometryLine& line)
     const auto number = numberAt(rest, rest.size() - std::min<std::size_t>(rest.size(), 1), false);
     if (number.longest == 0)
         return false;
-    line.numbers[11] = valueOf(rest.substr(0, number.longest), number.ascii);
+    line.numbers[11] = valueOf(rest.substr(0, number.longest), number);
     auto file = rest.substr(number.longest);
     while (!file.empty() && file.front() == ' ')
         file.remove_prefix(1);

@@ -1,5 +1,7 @@
 #include "NumberFormats.h"
 
+#include <cstring>
+
 namespace {
 
 bool isDigit(char c) { return c >= '0' && c <= '9'; }
@@ -28,9 +30,10 @@ std::string_view wordAround(std::string_view text, std::size_t i)
 // The position of the next "." from i on, or the text's size.
 std::size_t nextDot(std::string_view text, std::size_t i)
 {
-    while (i < text.size() && text[i] != '.')
-        ++i;
-    return i;
+    if (i >= text.size())
+        return text.size();
+    const auto* dot = static_cast<const char*>(std::memchr(text.data() + i, '.', text.size() - i));
+    return dot == nullptr ? text.size() : static_cast<std::size_t>(dot - text.data());
 }
 
 } // namespace
@@ -59,8 +62,10 @@ std::string_view NumberWithTrailingZero(std::string_view text)
 std::string_view NumberWithLeadingZero(std::string_view text)
 {
     for (std::size_t start = 0; start < text.size(); ++start) {
-        if (start > 0 && !isBlankByte(text[start - 1]))
-            continue;
+        while (start < text.size() && start > 0 && !isBlankByte(text[start - 1]))
+            ++start;
+        if (start >= text.size())
+            break;
         auto i = start + (text[start] == '-' ? 1 : 0);
         if (i + 1 >= text.size() || text[i] != '0' || !isDigit(text[i + 1]))
             continue;

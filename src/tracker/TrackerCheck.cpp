@@ -20,12 +20,12 @@ const QStringList PreviewRotations = {
 
 struct Part {
     HeaderFacts facts;
-    QString fileName;       // the file's own name
-    QString baseName;       // lower case, without ".dat"
-    QString plainType;      // the type without "Unofficial_"
-    bool partsType = false; // Part or Shortcut
-    bool pattern = false;   // a parts-type file whose name ends in a pattern's suffix
-    QStringList categories;
+    QString fileName;                       // the file's own name
+    QString baseName;                       // lower case, without ".dat"
+    QString plainType;                      // the type without "Unofficial_"
+    bool partsType = false;                 // Part or Shortcut
+    bool pattern = false;                   // a parts-type file whose name ends in a pattern's suffix
+    const StringList* categories = nullptr; // the official ones, as the list file holds them
 
     bool inCategory(std::initializer_list<const char*> names) const
     {
@@ -78,6 +78,16 @@ bool checkPresence(const Part& part, Findings& findings)
     return complete;
 }
 
+// The list file's entries are UTF-8, or Latin-1 when they are not valid UTF-8.
+bool isOfficial(const QString& category, const StringList& categories)
+{
+    const auto utf8 = category.toStdString();
+    for (const auto& entry : categories)
+        if (entry != "<none>" && (IsValidUtf8(entry) ? entry == utf8 : QString::fromLatin1(entry) == category))
+            return true;
+    return false;
+}
+
 QString replacementOf(const QString& retiredCategory)
 {
     if (retiredCategory == "Minifig")
@@ -95,7 +105,7 @@ void checkLicenceAndCategory(const Part& part, Findings& findings)
     if (f.qualifier == "Physical_Colour" && !part.inCategory({"Obsolete"}))
         findings.error("type.phycolor",
                        "Physical_Colour is only allowed in category Obsolete, not " + quoted(f.category) + ".");
-    if (part.partsType && !part.categories.contains(f.category) && !RetiredCategories.contains(f.category))
+    if (part.partsType && !isOfficial(f.category, *part.categories) && !RetiredCategories.contains(f.category))
         findings.error("category.invalid", "The category " + quoted(f.category) + " is not an official one.");
     if (part.partsType && RetiredCategories.contains(f.category))
         findings.warning("warning.minifigcategory",
@@ -262,7 +272,7 @@ bool isPatternName(const QString& fileName)
 {
     static const QRegularExpression looseSuffix(QStringLiteral("(?:p[a-z0-9]{2,4}|[cdk][0-9a-z]{2})+(?:-f[0-9a-z])?$"));
     auto base = fileName.toLower();
-    base = base.mid(base.lastIndexOf(QRegularExpression(QStringLiteral("[\\\\/]"))) + 1);
+    base = base.mid(std::max(base.lastIndexOf('\\'), base.lastIndexOf('/')) + 1);
     if (base.endsWith(".dat"))
         base.chop(4);
     const auto suffix = looseSuffix.match(base);
@@ -301,9 +311,7 @@ std::vector<TrackerFinding> CheckForTracker(std::string_view text, const std::st
     part.plainType = PlainType(part.facts.type);
     part.partsType = part.plainType == "Part" || part.plainType == "Shortcut";
     part.pattern = part.partsType && isPatternName(part.fileName);
-    for (const auto& category : categories)
-        if (category != "<none>")
-            part.categories << fromFile(category);
+    part.categories = &categories;
     Findings findings;
     if (checkPresence(part, findings)) {
         checkLicenceAndCategory(part, findings);

@@ -2,6 +2,7 @@
 
 #include <QChar>
 #include <algorithm>
+#include <array>
 
 namespace {
 
@@ -93,21 +94,26 @@ void CollapseBlanks(std::string_view text, std::string& out)
 {
     out.resize(text.size());
     char* to = out.data();
+    const char* from = text.data();
+    const char* const end = from + text.size();
     bool inBlank = false;
-    for (std::size_t i = 0; i < text.size();) {
-        const auto c = byteAt(text, i);
-        const bool plain = c > ' ' && c < 0x80;
-        const auto blank = c == ' ' || c == '\t' ? 1 : plain ? 0 : BlankLength(text.substr(i));
-        if (blank != 0) {
-            if (!inBlank)
-                *to++ = ' ';
-            inBlank = true;
-            i += blank;
-        } else {
-            *to++ = text[i];
+    while (from < end) {
+        const auto c = static_cast<unsigned char>(*from);
+        if (c > ' ' && c < 0x80) { // the common case: a visible ASCII character
+            *to++ = *from++;
             inBlank = false;
-            ++i;
+            continue;
         }
+        const auto blank = c == ' ' || c == '\t' ? 1 : BlankLength({from, static_cast<std::size_t>(end - from)});
+        if (blank == 0) {
+            *to++ = *from++;
+            inBlank = false;
+            continue;
+        }
+        if (!inBlank)
+            *to++ = ' ';
+        inBlank = true;
+        from += blank;
     }
     out.resize(static_cast<std::size_t>(to - out.data()));
 }
@@ -127,11 +133,19 @@ bool TrackerLines::next(TrackerLine& line)
         return false;
     const auto start = pos_;
     std::size_t breakLength = 0;
-    for (; pos_ < text_.size(); ++pos_) {
-        const auto c = byteAt(text_, pos_);
-        if ((c <= '\r' || c == 0xC2 || c == 0xE2) && (breakLength = BreakLength(text_.substr(pos_))) != 0)
+    // The bytes that can start a line break: the ASCII controls and the lead bytes of U+0085,
+    // U+2028 and U+2029.
+    static constexpr auto mayBreak = [] {
+        std::array<bool, 256> table{};
+        for (int c = 0; c <= '\r'; ++c)
+            table[static_cast<std::size_t>(c)] = true;
+        table[0xC2] = table[0xE2] = true;
+        return table;
+    }();
+    const auto* bytes = reinterpret_cast<const unsigned char*>(text_.data());
+    for (const auto size = text_.size(); pos_ < size; ++pos_)
+        if (mayBreak[bytes[pos_]] && (breakLength = BreakLength(text_.substr(pos_))) != 0)
             break;
-    }
     const auto end = pos_;
     pos_ += breakLength;
     done_ = pos_ >= text_.size();
