@@ -11,7 +11,12 @@
 
 namespace {
 
-std::string quoted(std::string_view text) { return "\"" + std::string(text) + "\""; }
+std::string quoted(std::string_view text)
+{
+    std::string result;
+    result.reserve(text.size() + 2);
+    return result.append(1, '"').append(text).append(1, '"');
+}
 
 std::string degrees(double angle)
 {
