@@ -56,9 +56,9 @@ std::optional<ColourCodes> ReadLDConfig(std::string_view text)
     const auto utf8 = IsValidUtf8(text) ? std::string(text) : Latin1ToUtf8(text);
     std::vector<long> codes;
     TrackerLines lines(utf8);
-    std::string collapsed;
+    std::string buffer;
     for (TrackerLine line; lines.next(line);) {
-        CollapseBlanks(line.text, collapsed);
+        const auto collapsed = CollapseBlanks(line.text, buffer);
         if (collapsed.starts_with("0 !COLOUR "))
             if (const auto code = ColourDefinitionCode(collapsed))
                 codes.push_back(*code);

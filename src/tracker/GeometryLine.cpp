@@ -2,6 +2,7 @@
 
 #include <charconv>
 #include <cstdint>
+#include <optional>
 
 #include "TrackerText.h"
 
@@ -17,20 +18,26 @@ struct NumberPrefix {
 // Reads the digits of text from i on, within its first atMost bytes.
 void readDigits(std::string_view text, std::size_t& i, std::size_t atMost, NumberPrefix& number, bool inFraction)
 {
+    const auto start = i;
+    const int countBefore = number.count;
     while (i < atMost) {
         const auto c = static_cast<unsigned char>(text[i]);
-        std::size_t digit = c >= '0' && c <= '9' ? 1 : c < 0x80 ? 0 : DigitLength(text.substr(i));
-        if (digit == 0 || i + digit > atMost)
-            return;
-        if (digit == 1) {
-            number.digits = number.digits * 10 + (c - '0');
+        if (const unsigned digit = c - '0'; digit < 10) {
+            number.digits = number.digits * 10 + digit;
             ++number.count;
-            number.fraction += inFraction ? 1 : 0;
+            ++i;
+            continue;
         }
-        number.ascii = number.ascii && digit == 1;
-        i += digit;
-        number.longest = i;
+        const auto length = c < 0x80 ? 0 : DigitLength(text.substr(i));
+        if (length == 0 || i + length > atMost)
+            break;
+        number.ascii = false;
+        i += length;
     }
+    if (i > start)
+        number.longest = i;
+    if (inFraction)
+        number.fraction += number.count - countBefore;
 }
 
 // The number at the start of text within its first atMost bytes.
@@ -108,6 +115,34 @@ bool readStart(std::string_view text, std::size_t& pos, GeometryLine& line)
     return readColour(line.colourText, line) && pos < text.size();
 }
 
+// The common case, a number of ASCII digits, read in one pass: none when the word at pos is
+// anything else, which the general reading then decides.
+std::optional<bool> readPlainNumber(std::string_view text, std::size_t& pos, double& value)
+{
+    static constexpr double PowersOfTen[] = {1e0, 1e1, 1e2,  1e3,  1e4,  1e5,  1e6,  1e7,
+                                             1e8, 1e9, 1e10, 1e11, 1e12, 1e13, 1e14, 1e15};
+    const char* p = text.data() + pos;
+    const char* const end = text.data() + text.size();
+    const bool negative = p < end && *p == '-';
+    p += negative ? 1 : 0;
+    std::uint64_t digits = 0;
+    int count = 0, fraction = 0;
+    for (; p < end && static_cast<unsigned>(*p - '0') < 10; ++p, ++count)
+        digits = digits * 10 + static_cast<unsigned>(*p - '0');
+    if (p < end && *p == '.')
+        for (++p; p < end && static_cast<unsigned>(*p - '0') < 10; ++p, ++count, ++fraction)
+            digits = digits * 10 + static_cast<unsigned>(*p - '0');
+    if (count > 15 || (p < end && *p != ' '))
+        return std::nullopt;
+    const auto word = text.substr(pos, static_cast<std::size_t>(p - (text.data() + pos)));
+    pos += word.size();
+    if (count == 0 || word.back() == '.')
+        return false;
+    value = static_cast<double>(digits) / PowersOfTen[fraction];
+    value = negative ? -value : value;
+    return true;
+}
+
 bool readNumber(std::string_view word, double& value)
 {
     const auto number = numberAt(word, word.size(), false);
@@ -126,7 +161,8 @@ bool readPointsLine(std::string_view text, std::size_t count, GeometryLine& line
     for (std::size_t i = 0; i < count; ++i) {
         if (pos >= text.size() || text[pos] != ' ')
             return false;
-        if (!readNumber(nextWord(text, ++pos), line.numbers[i]))
+        const auto plain = readPlainNumber(text, ++pos, line.numbers[i]);
+        if (plain ? !*plain : !readNumber(nextWord(text, pos), line.numbers[i]))
             return false;
     }
     return pos == text.size() || text.substr(pos) == " ";
@@ -143,7 +179,8 @@ bool readSubfileLine(std::string_view text, GeometryLine& line)
     for (std::size_t i = 0; i < 11; ++i) {
         if (pos >= text.size() || text[pos] != ' ')
             return false;
-        if (!readNumber(nextWord(text, ++pos), line.numbers[i]))
+        const auto plain = readPlainNumber(text, ++pos, line.numbers[i]);
+        if (plain ? !*plain : !readNumber(nextWord(text, pos), line.numbers[i]))
             return false;
     }
     if (pos >= text.size() || text[pos] != ' ')

@@ -5,12 +5,13 @@
 namespace {
 
 // The value after a meta line's keyword ("0 !LICENSE value"), or a null string for another line.
-QString valueAfter(const QString& line, const QString& keyword)
+QString valueAfter(const QString& line, QLatin1StringView keyword)
 {
-    const auto start = QStringLiteral("0 ") + keyword;
-    if (!line.startsWith(start) || (line.size() > start.size() && line.at(start.size()) != ' '))
+    const auto end = 2 + keyword.size();
+    if (!line.startsWith(u"0 ") || !QStringView(line).mid(2).startsWith(keyword) ||
+        (line.size() > end && line.at(end) != ' '))
         return {};
-    return line.mid(start.size()).trimmed();
+    return line.mid(end).trimmed();
 }
 
 void takeTypeLine(HeaderFacts& facts, const QString& value)
@@ -37,23 +38,23 @@ bool isGeometryLine(std::string_view line)
 
 void takeHeaderLine(HeaderFacts& facts, const QString& line, QString& firstCategory)
 {
-    if (auto v = valueAfter(line, "Name:"); !v.isNull()) {
+    if (auto v = valueAfter(line, QLatin1StringView("Name:")); !v.isNull()) {
         if (facts.name.isEmpty()) {
             facts.hasName = !v.isEmpty();
             facts.name = v;
         }
-    } else if (v = valueAfter(line, "Author:"); !v.isNull()) {
+    } else if (v = valueAfter(line, QLatin1StringView("Author:")); !v.isNull()) {
         facts.hasAuthor = true;
         facts.author = v;
-    } else if (v = valueAfter(line, "!LDRAW_ORG"); !v.isNull()) {
+    } else if (v = valueAfter(line, QLatin1StringView("!LDRAW_ORG")); !v.isNull()) {
         takeTypeLine(facts, v);
-    } else if (v = valueAfter(line, "!LICENSE"); !v.isNull()) {
+    } else if (v = valueAfter(line, QLatin1StringView("!LICENSE")); !v.isNull()) {
         facts.hasLicense = true;
         facts.license = v.simplified(); // runs of blanks collapsed
-    } else if (v = valueAfter(line, "!CATEGORY"); !v.isNull()) {
+    } else if (v = valueAfter(line, QLatin1StringView("!CATEGORY")); !v.isNull()) {
         if (firstCategory.isNull())
             firstCategory = v;
-    } else if (v = valueAfter(line, "!KEYWORDS"); !v.isNull()) {
+    } else if (v = valueAfter(line, QLatin1StringView("!KEYWORDS")); !v.isNull()) {
         for (const auto& keyword : v.split(','))
             if (!keyword.trimmed().isEmpty())
                 facts.keywords << keyword.trimmed();

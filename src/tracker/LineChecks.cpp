@@ -35,13 +35,16 @@ std::array<Point, 4> pointsOf(const GeometryLine& line)
 
 void checkNumbers(std::string_view text, int number, Findings& findings)
 {
-    if (const auto found = TooPreciseNumber(text); !found.empty())
-        findings.error("numbers.decimalprecision", "The number " + quoted(found) + " has more than 5 decimal places.",
-                       number);
-    if (const auto found = NumberWithTrailingZero(text); !found.empty())
-        findings.error("numbers.trailingzeros", "The number " + quoted(found) + " ends in a needless zero.", number);
-    if (const auto found = NumberWithLeadingZero(text); !found.empty())
-        findings.error("numbers.leadingzeros", "The number " + quoted(found) + " starts with a needless zero.", number);
+    const auto found = CheckNumberFormats(text);
+    if (!found.tooPrecise.empty())
+        findings.error("numbers.decimalprecision",
+                       "The number " + quoted(found.tooPrecise) + " has more than 5 decimal places.", number);
+    if (!found.trailingZero.empty())
+        findings.error("numbers.trailingzeros",
+                       "The number " + quoted(found.trailingZero) + " ends in a needless zero.", number);
+    if (!found.leadingZero.empty())
+        findings.error("numbers.leadingzeros",
+                       "The number " + quoted(found.leadingZero) + " starts with a needless zero.", number);
 }
 
 void checkColour(const GeometryLine& line, const ColourCodes& colours, int number, Findings& findings)
@@ -134,11 +137,11 @@ bool placesItself(const GeometryLine& line, std::string_view name)
 // Reads each line's shape; hands the body's valid geometry to the rules.
 class LineReader {
 public:
-    LineReader(const LinePart& part, Findings& findings) : part_(part), findings_(findings) { text_.reserve(256); }
+    LineReader(const LinePart& part, Findings& findings) : part_(part), findings_(findings) { buffer_.reserve(256); }
 
     void read(const TrackerLine& line)
     {
-        CollapseBlanks(line.text, text_);
+        text_ = line.plain ? line.text : CollapseBlanks(line.text, buffer_);
         const bool geometry = text_[0] >= '1' && text_[0] <= '5';
         const bool meta = text_.size() > 2 && text_[0] == '0' && text_[1] == ' ';
         const auto word = meta ? MetaWordOf(text_) : MetaWord::Other;
@@ -175,7 +178,8 @@ private:
 
     const LinePart& part_;
     Findings& findings_;
-    std::string text_; // the current line, blanks collapsed
+    std::string buffer_;
+    std::string_view text_; // the current line, blanks collapsed
     bool inBody_ = false, placesItself_ = false, stickerInColour_ = false;
 };
 

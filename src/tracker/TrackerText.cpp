@@ -90,8 +90,9 @@ std::string_view TrimTrackerLine(std::string_view text)
     return text.substr(start, end - start);
 }
 
-void CollapseBlanks(std::string_view text, std::string& out)
+std::string_view CollapseBlanks(std::string_view text, std::string& buffer)
 {
+    auto& out = buffer;
     out.resize(text.size());
     char* to = out.data();
     const char* from = text.data();
@@ -116,6 +117,7 @@ void CollapseBlanks(std::string_view text, std::string& out)
         from += blank;
     }
     out.resize(static_cast<std::size_t>(to - out.data()));
+    return out;
 }
 
 TrackerLines::TrackerLines(std::string_view text) : text_(text)
@@ -133,19 +135,30 @@ bool TrackerLines::next(TrackerLine& line)
         return false;
     const auto start = pos_;
     std::size_t breakLength = 0;
-    // The bytes that can start a line break: the ASCII controls and the lead bytes of U+0085,
-    // U+2028 and U+2029.
-    static constexpr auto mayBreak = [] {
-        std::array<bool, 256> table{};
+    // The bytes that can start a line break (the ASCII controls and the lead bytes of U+0085,
+    // U+2028 and U+2029), and those that make a line other than plain: TAB, space and non-ASCII.
+    enum : unsigned char { MayBreak = 1, NotPlain = 2, Space = 4 };
+    static constexpr auto kinds = [] {
+        std::array<unsigned char, 256> table{};
         for (int c = 0; c <= '\r'; ++c)
-            table[static_cast<std::size_t>(c)] = true;
-        table[0xC2] = table[0xE2] = true;
+            table[static_cast<std::size_t>(c)] = MayBreak;
+        for (int c = 0x80; c < 0x100; ++c)
+            table[static_cast<std::size_t>(c)] = NotPlain;
+        table['\t'] |= NotPlain;
+        table[' '] = Space;
+        table[0xC2] = table[0xE2] = MayBreak | NotPlain;
         return table;
     }();
     const auto* bytes = reinterpret_cast<const unsigned char*>(text_.data());
-    for (const auto size = text_.size(); pos_ < size; ++pos_)
-        if (mayBreak[bytes[pos_]] && (breakLength = BreakLength(text_.substr(pos_))) != 0)
+    unsigned char seen = 0, previous = 0;
+    for (const auto size = text_.size(); pos_ < size; ++pos_) {
+        const auto kind = kinds[bytes[pos_]];
+        if ((kind & MayBreak) != 0 && (breakLength = BreakLength(text_.substr(pos_))) != 0)
             break;
+        seen |= kind | ((kind & previous & Space) != 0 ? NotPlain : 0);
+        previous = kind;
+    }
+    line.plain = (seen & NotPlain) == 0;
     const auto end = pos_;
     pos_ += breakLength;
     done_ = pos_ >= text_.size();

@@ -27,13 +27,14 @@ std::size_t BreakLength(std::string_view text);
 bool IsTrimmed(char c);
 std::string_view TrimTrackerLine(std::string_view text);
 
-// Writes text into out with every run of blanks as one space.
-void CollapseBlanks(std::string_view text, std::string& out);
+// text with every run of blanks as one space, in buffer.
+std::string_view CollapseBlanks(std::string_view text, std::string& buffer);
 
 struct TrackerLine {
     int number = 0;        // counted from 1 in the checked text
     bool first = false;    // the Tracker's line 1: the first line of the text once it is trimmed
     std::string_view text; // trimmed; empty for a blank line
+    bool plain = false;    // ASCII without TABs or two spaces in a row: its blanks need no collapsing
 };
 
 // Hands out the lines of a UTF-8 text one by one, with the lines the Tracker empties ("0",
