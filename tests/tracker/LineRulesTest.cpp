@@ -22,7 +22,7 @@ Ids onLine(const std::string& line, const ColourCodes& colours = Colours())
 TEST(LineShapes, GeometryLinesHaveTheirTypesNumbersAndColours)
 {
     for (const auto* line :
-         {"2 24 0 0 0 1 0 0", "3 16 0 0 0 1 0 0 0 1 0",
+         {"2 24 0 0 0 1 0 0", "3 16 0 0 0 1 0 0 0 1 0", "4  16 0 0 0 1 0 0 1 1 0 0  1 0",
           "3\t16  .5 -.5 0 1 0 0\xC2\xA0\xC2\xA0"
           "0 1 0",
           "4 16 0 0 0 1 0 0 1 1 0 0 1 0", "5 24 0 0 0 1 0 0 0 1 0 1 1 0", "3 0x2FF0000 0 0 0 1 0 0 0 1 0",
