@@ -1,9 +1,20 @@
 #include "NumberFormats.h"
 
+#include <array>
+
 namespace {
 
 bool isDigit(char c) { return c >= '0' && c <= '9'; }
-bool isBlankByte(char c) { return c == ' ' || c == '\t' || c == '\xA0'; }
+
+// Words end at a blank; fractions start at a dot.
+enum ByteKind : unsigned char { Other, Blank, Dot };
+constexpr auto ByteKinds = [] {
+    std::array<ByteKind, 256> kinds{};
+    kinds[' '] = kinds['\t'] = kinds[0xA0] = Blank;
+    kinds['.'] = Dot;
+    return kinds;
+}();
+ByteKind kindOf(char c) { return ByteKinds[static_cast<unsigned char>(c)]; }
 
 std::size_t digitsFrom(std::string_view text, std::size_t i)
 {
@@ -34,8 +45,8 @@ NumberFormatFindings CheckNumberFormats(std::string_view text)
     for (std::size_t start = 0; start < text.size();) {
         auto end = start;
         auto firstDot = std::string_view::npos;
-        for (; end < text.size() && !isBlankByte(text[end]); ++end)
-            if (text[end] == '.' && firstDot == std::string_view::npos)
+        for (ByteKind kind{}; end < text.size() && (kind = kindOf(text[end])) != Blank; ++end)
+            if (kind == Dot && firstDot == std::string_view::npos)
                 firstDot = end;
         const auto word = text.substr(start, end - start);
         for (auto dot = firstDot; dot < end; ++dot) {
@@ -53,7 +64,7 @@ NumberFormatFindings CheckNumberFormats(std::string_view text)
             hasLeadingZero(word))
             found.leadingZero = word;
         start = end;
-        while (start < text.size() && isBlankByte(text[start]))
+        while (start < text.size() && kindOf(text[start]) == Blank)
             ++start;
     }
     return found;
