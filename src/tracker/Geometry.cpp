@@ -31,8 +31,6 @@ double cosineBetween(const Point& u, const Point& v)
 
 double degreesOf(double cosine) { return std::acos(cosine) * 180 / std::numbers::pi; }
 
-double angleBetween(const Point& u, const Point& v) { return degreesOf(cosineBetween(u, v)); }
-
 } // namespace
 
 bool IsSingularPlacement(const std::array<double, 12>& m)
@@ -45,7 +43,9 @@ bool IsSingularPlacement(const std::array<double, 12>& m)
 
 std::optional<double> ColinearAngle(const Point* p, int count)
 {
-    // The largest angle has the smallest cosine: only the two extremes need their angle.
+    // The largest angle has the smallest cosine: only the two extremes need their angle, and
+    // only when their cosines come near the limits (cos 179.9 and cos 0.025 degrees).
+    constexpr double NearlyStraight = -0.9999984769, NearlyFolded = 0.9999999048;
     double smallestCosine = 1, largestCosine = -1;
     for (int k = 0; k < count; ++k) {
         const auto& corner = p[(k + 1) % count];
@@ -53,6 +53,8 @@ std::optional<double> ColinearAngle(const Point* p, int count)
         smallestCosine = std::min(smallestCosine, cosine);
         largestCosine = std::max(largestCosine, cosine);
     }
+    if (smallestCosine > NearlyStraight + 1e-9 && largestCosine < NearlyFolded - 1e-9)
+        return std::nullopt;
     if (const auto largest = degreesOf(smallestCosine); largest > 179.9)
         return largest;
     if (const auto smallest = degreesOf(largestCosine); smallest < 0.025)
@@ -74,7 +76,7 @@ bool IsConvexQuad(const std::array<Point, 4>& p)
 
 double QuadBend(const std::array<Point, 4>& p)
 {
-    const auto alongTwoFour = angleBetween(triangleNormal(p[0], p[1], p[3]), triangleNormal(p[1], p[2], p[3]));
-    const auto alongOneThree = angleBetween(triangleNormal(p[0], p[2], p[3]), triangleNormal(p[0], p[1], p[2]));
-    return std::max(alongTwoFour, alongOneThree);
+    const auto alongTwoFour = cosineBetween(triangleNormal(p[0], p[1], p[3]), triangleNormal(p[1], p[2], p[3]));
+    const auto alongOneThree = cosineBetween(triangleNormal(p[0], p[2], p[3]), triangleNormal(p[0], p[1], p[2]));
+    return degreesOf(std::min(alongTwoFour, alongOneThree)); // the larger angle has the smaller cosine
 }

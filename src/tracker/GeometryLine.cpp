@@ -138,7 +138,9 @@ std::optional<bool> readPlainNumber(std::string_view text, std::size_t& pos, dou
     pos += word.size();
     if (count == 0 || word.back() == '.')
         return false;
-    value = static_cast<double>(digits) / PowersOfTen[fraction];
+    value = static_cast<double>(digits); // exact, and most numbers of a part are whole
+    if (fraction > 0)
+        value /= PowersOfTen[fraction];
     value = negative ? -value : value;
     return true;
 }
