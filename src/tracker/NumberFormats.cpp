@@ -1,20 +1,9 @@
 #include "NumberFormats.h"
 
-#include <array>
-
 namespace {
 
 bool isDigit(char c) { return c >= '0' && c <= '9'; }
-
-// Words end at a blank; fractions start at a dot.
-enum ByteKind : unsigned char { Other, Blank, Dot };
-constexpr auto ByteKinds = [] {
-    std::array<ByteKind, 256> kinds{};
-    kinds[' '] = kinds['\t'] = kinds[0xA0] = Blank;
-    kinds['.'] = Dot;
-    return kinds;
-}();
-ByteKind kindOf(char c) { return ByteKinds[static_cast<unsigned char>(c)]; }
+bool isBlankByte(char c) { return c == ' ' || c == '\t' || c == '\xA0'; }
 
 std::size_t digitsFrom(std::string_view text, std::size_t i)
 {
@@ -22,6 +11,17 @@ std::size_t digitsFrom(std::string_view text, std::size_t i)
     while (end < text.size() && isDigit(text[end]))
         ++end;
     return end - i;
+}
+
+// The blank-delimited word around position i.
+std::string_view wordAround(std::string_view text, std::size_t i)
+{
+    auto start = i, end = i;
+    while (start > 0 && !isBlankByte(text[start - 1]))
+        --start;
+    while (end < text.size() && !isBlankByte(text[end]))
+        ++end;
+    return text.substr(start, end - start);
 }
 
 // "-?0\d+(\.\d+)?", the whole word.
@@ -36,36 +36,48 @@ bool hasLeadingZero(std::string_view word)
     return i == word.size();
 }
 
+// Both fraction rules look at the digits after each dot.
+void checkFractions(std::string_view text, NumberFormatFindings& found)
+{
+    bool precisionDecided = false;
+    for (auto dot = text.find('.'); dot != std::string_view::npos; dot = text.find('.', dot + 1)) {
+        const auto fraction = digitsFrom(text, dot + 1);
+        const auto end = dot + 1 + fraction;
+        if (!precisionDecided && fraction >= 5) {
+            precisionDecided = true;
+            found.tooPrecise = fraction >= 6 ? wordAround(text, dot) : std::string_view();
+        }
+        if (found.trailingZero.empty() && fraction > 0 && text[end - 1] == '0' &&
+            (end == text.size() || isBlankByte(text[end])))
+            found.trailingZero = wordAround(text, dot);
+    }
+}
+
+// A word with a leading zero starts with "0" and a digit, or "-0" and a digit.
+void checkLeadingZeros(std::string_view text, NumberFormatFindings& found)
+{
+    for (std::size_t i = 0; i + 1 < text.size(); ++i) {
+        if (text[i] != '0' || !isDigit(text[i + 1]))
+            continue;
+        const auto start = i > 0 && text[i - 1] == '-' ? i - 1 : i;
+        if (start > 0 && !isBlankByte(text[start - 1]))
+            continue;
+        auto end = i;
+        while (end < text.size() && !isBlankByte(text[end]))
+            ++end;
+        if (end < text.size() && hasLeadingZero(text.substr(start, end - start))) {
+            found.leadingZero = text.substr(start, end - start);
+            return;
+        }
+    }
+}
+
 } // namespace
 
 NumberFormatFindings CheckNumberFormats(std::string_view text)
 {
     NumberFormatFindings found;
-    bool precisionDecided = false;
-    for (std::size_t start = 0; start < text.size();) {
-        auto end = start;
-        auto firstDot = std::string_view::npos;
-        for (ByteKind kind{}; end < text.size() && (kind = kindOf(text[end])) != Blank; ++end)
-            if (kind == Dot && firstDot == std::string_view::npos)
-                firstDot = end;
-        const auto word = text.substr(start, end - start);
-        for (auto dot = firstDot; dot < end; ++dot) {
-            if (text[dot] != '.')
-                continue;
-            const auto fraction = digitsFrom(text, dot + 1);
-            if (!precisionDecided && fraction >= 5) {
-                precisionDecided = true;
-                found.tooPrecise = fraction >= 6 ? word : std::string_view();
-            }
-            if (found.trailingZero.empty() && fraction > 0 && dot + 1 + fraction == end && text[end - 1] == '0')
-                found.trailingZero = word;
-        }
-        if (found.leadingZero.empty() && (word[0] == '0' || word[0] == '-') && end < text.size() &&
-            hasLeadingZero(word))
-            found.leadingZero = word;
-        start = end;
-        while (start < text.size() && kindOf(text[start]) == Blank)
-            ++start;
-    }
+    checkFractions(text, found);
+    checkLeadingZeros(text, found);
     return found;
 }

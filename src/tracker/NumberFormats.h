@@ -16,5 +16,5 @@ struct NumberFormatFindings {
     std::string_view leadingZero;
 };
 
-// The three rules in one pass over the words of text.
+// The three rules over text.
 NumberFormatFindings CheckNumberFormats(std::string_view text);

@@ -21,12 +21,12 @@ Ids onLine(const std::string& line, const ColourCodes& colours = Colours())
 
 TEST(LineShapes, GeometryLinesHaveTheirTypesNumbersAndColours)
 {
-    for (const auto* line :
-         {"2 24 0 0 0 1 0 0", "3 16 0 0 0 1 0 0 0 1 0", "4  16 0 0 0 1 0 0 1 1 0 0  1 0",
-          "3\t16  .5 -.5 0 1 0 0\xC2\xA0\xC2\xA0"
-          "0 1 0",
-          "4 16 0 0 0 1 0 0 1 1 0 0 1 0", "5 24 0 0 0 1 0 0 0 1 0 1 1 0", "3 0x2FF0000 0 0 0 1 0 0 0 1 0",
-          "1 16 0 0 0 1 0 0 0 1 0 0 0 1 s\\3001s01.dat", "1 16 0 0 0 1 0 0 0 1 0 0 0 1x.dat"})
+    for (const auto* line : {"2 24 0 0 0 1 0 0", "3 16 0 0 0 1 0 0 0 1 0", "4  16 0 0 0 1 0 0 1 1 0 0  1 0",
+                             "3\t16  .5 -.5 0 1 0 0\xC2\xA0\xC2\xA0"
+                             "0 1 0",
+                             "4 16 0 0 0 1 0 0 1 1 0 0 1 0", "5 24 0 0 0 1 0 0 0 1 0 1 1 0",
+                             "3 0x2FF0000 0 0 0 1 0 0 0 1 0", "1 16 0 0 0 1 0 0 0 1 0 0 0 1 s\\3001s01.dat",
+                             "1 16 0 0 0 1 0 0 0 1 0 0 0 1x.dat", "1 16 0 0 0 1 0 0 0 1 0 0 0 1 a01 b.dat"})
         EXPECT_EQ(onLine(line), Ids{}) << line;
     for (const auto* line :
          {"3 16 0 0 0 1 0 0 0 1", "3 16 0 0 0 1 0 0 0 1 0 7", "3 16 +5 0 0 1 0 0 0 1 0", "3 16 5. 0 0 1 0 0 0 1 0",
