@@ -36,40 +36,31 @@ bool hasLeadingZero(std::string_view word)
     return i == word.size();
 }
 
-// Both fraction rules look at the digits after each dot.
-void checkFractions(std::string_view text, NumberFormatFindings& found)
+// Both fraction rules look at the digits after a dot.
+void checkFraction(std::string_view text, std::size_t dot, bool& precisionDecided, NumberFormatFindings& found)
 {
-    bool precisionDecided = false;
-    for (auto dot = text.find('.'); dot != std::string_view::npos; dot = text.find('.', dot + 1)) {
-        const auto fraction = digitsFrom(text, dot + 1);
-        const auto end = dot + 1 + fraction;
-        if (!precisionDecided && fraction >= 5) {
-            precisionDecided = true;
-            found.tooPrecise = fraction >= 6 ? wordAround(text, dot) : std::string_view();
-        }
-        if (found.trailingZero.empty() && fraction > 0 && text[end - 1] == '0' &&
-            (end == text.size() || isBlankByte(text[end])))
-            found.trailingZero = wordAround(text, dot);
+    const auto fraction = digitsFrom(text, dot + 1);
+    const auto end = dot + 1 + fraction;
+    if (!precisionDecided && fraction >= 5) {
+        precisionDecided = true;
+        found.tooPrecise = fraction >= 6 ? wordAround(text, dot) : std::string_view();
     }
+    if (found.trailingZero.empty() && fraction > 0 && text[end - 1] == '0' &&
+        (end == text.size() || isBlankByte(text[end])))
+        found.trailingZero = wordAround(text, dot);
 }
 
-// A word with a leading zero starts with "0" and a digit, or "-0" and a digit.
-void checkLeadingZeros(std::string_view text, NumberFormatFindings& found)
+// A word with a leading zero starts with "0" and a digit, or "-0" and a digit, at i.
+void checkLeadingZero(std::string_view text, std::size_t i, NumberFormatFindings& found)
 {
-    for (std::size_t i = 0; i + 1 < text.size(); ++i) {
-        if (text[i] != '0' || !isDigit(text[i + 1]))
-            continue;
-        const auto start = i > 0 && text[i - 1] == '-' ? i - 1 : i;
-        if (start > 0 && !isBlankByte(text[start - 1]))
-            continue;
-        auto end = i;
-        while (end < text.size() && !isBlankByte(text[end]))
-            ++end;
-        if (end < text.size() && hasLeadingZero(text.substr(start, end - start))) {
-            found.leadingZero = text.substr(start, end - start);
-            return;
-        }
-    }
+    const auto start = i > 0 && text[i - 1] == '-' ? i - 1 : i;
+    if (start > 0 && !isBlankByte(text[start - 1]))
+        return;
+    auto end = i;
+    while (end < text.size() && !isBlankByte(text[end]))
+        ++end;
+    if (end < text.size() && hasLeadingZero(text.substr(start, end - start)))
+        found.leadingZero = text.substr(start, end - start);
 }
 
 } // namespace
@@ -77,7 +68,12 @@ void checkLeadingZeros(std::string_view text, NumberFormatFindings& found)
 NumberFormatFindings CheckNumberFormats(std::string_view text)
 {
     NumberFormatFindings found;
-    checkFractions(text, found);
-    checkLeadingZeros(text, found);
+    bool precisionDecided = false;
+    for (std::size_t i = 0; i < text.size(); ++i) {
+        if (text[i] == '.')
+            checkFraction(text, i, precisionDecided, found);
+        else if (text[i] == '0' && found.leadingZero.empty() && i + 1 < text.size() && isDigit(text[i + 1]))
+            checkLeadingZero(text, i, found);
+    }
     return found;
 }
