@@ -9,6 +9,7 @@
 #include "Batch.h"
 #include "CliFiles.h"
 #include "Clock.h"
+#include "ColourSource.h"
 #include "Composer.h"
 #include "ConsoleDialogs.h"
 #include "FileSave.h"
@@ -24,12 +25,16 @@ namespace {
 
 using TrackerFindings = std::vector<TrackerFinding>;
 
+std::string programFolder()
+{
+    std::error_code error;
+    return std::filesystem::read_symlink("/proc/self/exe", error).parent_path().string();
+}
+
 // The official categories, from the category list the window uses.
 bool readCategories(StringList& categories, std::ostream& err)
 {
-    std::error_code error;
-    const auto programFolder = std::filesystem::read_symlink("/proc/self/exe", error).parent_path().string();
-    const auto path = ListFilePath(ListFolderOfThisProgram(programFolder), ListKind::Category);
+    const auto path = ListFilePath(ListFolderOfThisProgram(programFolder()), ListKind::Category);
     try {
         categories = ReadListFile(path);
         return true;
@@ -37,6 +42,26 @@ bool readCategories(StringList& categories, std::ostream& err)
         err << "quillmark-cli: cannot read the category list " << path << ": " << failure.description() << '\n';
         return false;
     }
+}
+
+// Where the Tracker's colour codes come from; none when the built-in list cannot be read.
+std::unique_ptr<ColourSource> colourSource(const std::string& ldconfig, std::ostream& err)
+{
+    const auto path = DataFileOfThisProgram(programFolder(), BuiltInColoursFile);
+    try {
+        return std::make_unique<ColourSource>(ReadBuiltInColours(path), ldconfig, [&err](const std::string& text) {
+            err << "quillmark-cli: " << text << '\n';
+        });
+    } catch (const QmError& failure) {
+        err << "quillmark-cli: cannot read the colour list " << path << ": " << failure.description() << '\n';
+        return nullptr;
+    }
+}
+
+// "line 12: " before a finding about one line.
+std::string linePrefix(const TrackerFinding& finding)
+{
+    return finding.line > 0 ? "line " + std::to_string(finding.line) + ": " : "";
 }
 
 std::string firstLine(const std::string& text) { return text.substr(0, text.find('\r')); }
@@ -53,9 +78,12 @@ std::string checkJson(const HeaderData& header, const SaveFindings& findings, co
                       {"color", findings.fixups.color}};
     if (tracker != nullptr) {
         json["tracker"] = nlohmann::ordered_json::array();
-        for (const auto& finding : *tracker)
-            json["tracker"].push_back(
-                {{"id", finding.id}, {"level", LevelText(finding.level)}, {"text", finding.text}});
+        for (const auto& finding : *tracker) {
+            auto& entry = json["tracker"].emplace_back(nlohmann::ordered_json{
+                {"id", finding.id}, {"level", LevelText(finding.level)}, {"text", finding.text}});
+            if (finding.line > 0)
+                entry["line"] = finding.line;
+        }
     }
     return json.dump() + '\n';
 }
@@ -72,7 +100,8 @@ std::string findingLines(const std::string& path, const SaveFindings& findings, 
             lines += path + ": fix-up offered: " + what + '\n';
     if (tracker != nullptr)
         for (const auto& finding : *tracker)
-            lines += path + ": tracker " + LevelText(finding.level) + " " + finding.id + ": " + finding.text + '\n';
+            lines += path + ": tracker " + LevelText(finding.level) + " " + finding.id + ": " + linePrefix(finding) +
+                     finding.text + '\n';
     return lines.empty() ? path + ": ok\n" : lines;
 }
 
@@ -176,14 +205,18 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
              std::ostream& out, std::ostream& err)
 {
     StringList categories;
-    if (options.tracker && !readCategories(categories, err))
+    std::unique_ptr<ColourSource> colours;
+    if (options.tracker && (!readCategories(categories, err) || !(colours = colourSource(options.ldconfig, err))))
         return ExitStatus::Unreadable;
     return runBatch(arguments, batch, out, err, [&](const std::string& path) {
-        return reportOn(path, {}, [&](HeaderData& header, ConsoleDialogs&, FileReport& report) {
+        return reportOn(path, {}, [&](HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
             const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
             TrackerFindings tracker; // empty unless asked for
-            if (options.tracker)
-                tracker = CheckRecordForTracker(header, ComposeHeader(header), categories);
+            if (options.tracker) {
+                const auto& codes =
+                    colours->forPart(path, [&dialogs](const std::string& text) { dialogs.message({text}); });
+                tracker = CheckRecordForTracker(header, ComposeHeader(header), categories, codes);
+            }
             const auto* trackerFindings = options.tracker ? &tracker : nullptr;
             report.out = options.json ? checkJson(header, findings, trackerFindings)
                                       : findingLines(header.FilePath, findings, trackerFindings);

@@ -15,6 +15,7 @@ struct BatchOptions {
 struct CheckOptions {
     bool json = false;
     bool tracker = false; // the Parts Tracker's rules too
+    std::string ldconfig; // the LDConfig.ldr for the Tracker's colour codes; empty: search above each file
 };
 
 // check: every save check on every file (folders searched for part files), without writing.

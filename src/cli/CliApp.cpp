@@ -40,8 +40,12 @@ int RunCli(int argc, const char* const* argv, std::ostream& out, std::ostream& e
                  "error. Exit status 1 when any file would be refused, 2 when one cannot be read.");
     check->add_flag("--json", checkOptions.json, "One JSON object per file and line");
     check->add_flag("--tracker", checkOptions.tracker,
-                    "Check the Parts Tracker's header rules too (an error there refuses the file). Rules that need "
-                    "the Tracker's database (registered authors, duplicates, held subfiles) are not checked.");
+                    "Check the Parts Tracker's header and line rules too (an error there refuses the file). Rules "
+                    "that need the Tracker's database (registered authors, duplicates, held subfiles) are not "
+                    "checked.");
+    check->add_option("--ldconfig", checkOptions.ldconfig,
+                      "The LDConfig.ldr whose colour codes --tracker accepts (default: the first LDConfig.ldr in "
+                      "the file's folder or above it, else the built-in list)");
     addBatchOptions(check);
     check->add_option("FILE", checkFiles, "Part files or folders to check")->required();
 

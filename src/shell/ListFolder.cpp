@@ -127,3 +127,13 @@ std::string FirstOpenFolder(const std::string& programFolder, const std::string&
 {
     return listFolder == programFolder ? programFolder : QDir::homePath().toStdString();
 }
+
+std::string DataFileOfThisProgram(const std::string& programFolder, const std::string& name)
+{
+    std::error_code error;
+    const auto beside = fs::path(programFolder) / name;
+    if (fs::is_regular_file(beside, error))
+        return beside.string();
+    const auto defaults = QDir(QString::fromStdString(programFolder)).filePath(QUILLMARK_DEFAULTS_FROM_PROGRAM);
+    return (fs::path(QDir::cleanPath(defaults).toStdString()) / name).string();
+}

@@ -19,3 +19,7 @@ std::string ListFolderOfThisProgram(const std::string& programFolder);
 // The folder the Open dialog starts in until "LastPath" is stored: the program's folder when
 // the lists stand there, the user's home otherwise.
 std::string FirstOpenFolder(const std::string& programFolder, const std::string& listFolder);
+
+// A data file the program only reads (not a list the user edits): beside the program when it
+// stands there, else among the installed defaults.
+std::string DataFileOfThisProgram(const std::string& programFolder, const std::string& name);

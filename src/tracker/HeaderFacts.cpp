@@ -5,12 +5,13 @@
 namespace {
 
 // The value after a meta line's keyword ("0 !LICENSE value"), or a null string for another line.
-QString valueAfter(const QString& line, const QString& keyword)
+QString valueAfter(const QString& line, QLatin1StringView keyword)
 {
-    const auto start = QStringLiteral("0 ") + keyword;
-    if (!line.startsWith(start) || (line.size() > start.size() && line.at(start.size()) != ' '))
+    const auto end = 2 + keyword.size();
+    if (!line.startsWith(u"0 ") || !QStringView(line).mid(2).startsWith(keyword) ||
+        (line.size() > end && line.at(end) != ' '))
         return {};
-    return line.mid(start.size()).trimmed();
+    return line.mid(end).trimmed();
 }
 
 void takeTypeLine(HeaderFacts& facts, const QString& value)
@@ -24,31 +25,36 @@ void takeTypeLine(HeaderFacts& facts, const QString& value)
         facts.qualifier = words.at(1);
 }
 
-bool isGeometryLine(const QString& line)
+bool isSpace(char c) { return c == ' ' || (c >= '\t' && c <= '\r'); }
+
+// A line of type 1 to 5 ends the header, even with blanks before it.
+bool isGeometryLine(std::string_view line)
 {
-    static const QRegularExpression geometry(QStringLiteral("^\\s*[1-5]\\s"));
-    return geometry.match(line).hasMatch();
+    std::size_t i = 0;
+    while (i < line.size() && isSpace(line[i]))
+        ++i;
+    return i + 1 < line.size() && line[i] >= '1' && line[i] <= '5' && isSpace(line[i + 1]);
 }
 
 void takeHeaderLine(HeaderFacts& facts, const QString& line, QString& firstCategory)
 {
-    if (auto v = valueAfter(line, "Name:"); !v.isNull()) {
+    if (auto v = valueAfter(line, QLatin1StringView("Name:")); !v.isNull()) {
         if (facts.name.isEmpty()) {
             facts.hasName = !v.isEmpty();
             facts.name = v;
         }
-    } else if (v = valueAfter(line, "Author:"); !v.isNull()) {
+    } else if (v = valueAfter(line, QLatin1StringView("Author:")); !v.isNull()) {
         facts.hasAuthor = true;
         facts.author = v;
-    } else if (v = valueAfter(line, "!LDRAW_ORG"); !v.isNull()) {
+    } else if (v = valueAfter(line, QLatin1StringView("!LDRAW_ORG")); !v.isNull()) {
         takeTypeLine(facts, v);
-    } else if (v = valueAfter(line, "!LICENSE"); !v.isNull()) {
+    } else if (v = valueAfter(line, QLatin1StringView("!LICENSE")); !v.isNull()) {
         facts.hasLicense = true;
         facts.license = v.simplified(); // runs of blanks collapsed
-    } else if (v = valueAfter(line, "!CATEGORY"); !v.isNull()) {
+    } else if (v = valueAfter(line, QLatin1StringView("!CATEGORY")); !v.isNull()) {
         if (firstCategory.isNull())
             firstCategory = v;
-    } else if (v = valueAfter(line, "!KEYWORDS"); !v.isNull()) {
+    } else if (v = valueAfter(line, QLatin1StringView("!KEYWORDS")); !v.isNull()) {
         for (const auto& keyword : v.split(','))
             if (!keyword.trimmed().isEmpty())
                 facts.keywords << keyword.trimmed();
@@ -68,24 +74,27 @@ QString PlainType(const QString& type)
     return type.startsWith("Unofficial_") ? type.mid(QStringLiteral("Unofficial_").size()) : type;
 }
 
-HeaderFacts ReadHeaderFacts(const QString& text)
+const QStringList KnownPartTypes = {"Part",         "Subpart",  "Primitive", "8_Primitive",
+                                    "48_Primitive", "Shortcut", "Helper"};
+
+HeaderFacts ReadHeaderFacts(std::string_view text)
 {
     HeaderFacts facts;
-    const auto lines = text.split(QStringLiteral("\r\n"));
-    if (!lines.isEmpty() && lines.at(0).startsWith("0 "))
-        facts.description = lines.at(0).mid(2).trimmed();
+    QString firstCategory;
+    for (std::size_t start = 0, number = 0; start <= text.size(); ++number) {
+        const auto end = std::min(text.find("\r\n", start), text.size());
+        const auto bytes = text.substr(start, end - start);
+        start = end + 2;
+        if (isGeometryLine(bytes))
+            break;
+        const auto line = QString::fromUtf8(bytes.data(), static_cast<qsizetype>(bytes.size()));
+        if (number == 0 && line.startsWith("0 "))
+            facts.description = line.mid(2).trimmed();
+        else if (number > 0)
+            takeHeaderLine(facts, line, firstCategory);
+    }
     static const QRegularExpression prefix(QStringLiteral("^[~_=|]+"));
     facts.prefix = prefix.match(facts.description).captured(0);
-    QString firstCategory;
-    bool inHeader = true;
-    for (qsizetype i = 1; i < lines.size(); ++i) {
-        const auto& line = lines.at(i);
-        inHeader = inHeader && !isGeometryLine(line);
-        if (inHeader)
-            takeHeaderLine(facts, line, firstCategory);
-        if (line.trimmed().startsWith("1 "))
-            facts.subfileLines << line.trimmed();
-    }
     static const QRegularExpression blanks(QStringLiteral("\\s+"));
     facts.category = !firstCategory.isNull()
                          ? firstCategory

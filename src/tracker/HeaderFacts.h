@@ -2,6 +2,7 @@
 
 #include <QString>
 #include <QStringList>
+#include <string_view>
 
 // A part file's header as the Parts Tracker reads it: the meta lines up to the first line of
 // another type, as Unicode text.
@@ -19,10 +20,13 @@ struct HeaderFacts {
     QStringList historyLines; // whole lines
     QStringList previewLines; // whole lines
     QString firstBfcLine;     // whole line
-    QStringList subfileLines; // the type 1 lines of the whole file
 };
 
-HeaderFacts ReadHeaderFacts(const QString& text);
+// Reads the header of a UTF-8 text whose lines end in CR LF.
+HeaderFacts ReadHeaderFacts(std::string_view text);
+
+// The part types the library knows, without "Unofficial_".
+extern const QStringList KnownPartTypes;
 
 // Type without "Unofficial_".
 QString PlainType(const QString& type);

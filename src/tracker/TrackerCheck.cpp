@@ -2,12 +2,14 @@
 
 #include <QRegularExpression>
 
+#include "Findings.h"
 #include "HeaderFacts.h"
+#include "LineChecks.h"
+#include "MetaLine.h"
 #include "Text.h"
 
 namespace {
 
-const QStringList KnownTypes = {"Part", "Subpart", "Primitive", "8_Primitive", "48_Primitive", "Shortcut", "Helper"};
 const QStringList RetiredCategories = {"Minifig", "Pov-RAY", "Lever", "Grab", "Forklift"};
 const QStringList ApprovedLicences = {"Licensed under CC BY 4.0 : see CAreadme.txt",
                                       "Licensed under CC BY 2.0 and CC BY 4.0 : see CAreadme.txt",
@@ -18,12 +20,12 @@ const QStringList PreviewRotations = {
 
 struct Part {
     HeaderFacts facts;
-    QString fileName;       // the file's own name
-    QString baseName;       // lower case, without ".dat"
-    QString plainType;      // the type without "Unofficial_"
-    bool partsType = false; // Part or Shortcut
-    bool pattern = false;   // a parts-type file whose last suffix starts with "p"
-    QStringList categories;
+    QString fileName;                       // the file's own name
+    QString baseName;                       // lower case, without ".dat"
+    QString plainType;                      // the type without "Unofficial_"
+    bool partsType = false;                 // Part or Shortcut
+    bool pattern = false;                   // a parts-type file whose name ends in a pattern's suffix
+    const StringList* categories = nullptr; // the official ones, as the list file holds them
 
     bool inCategory(std::initializer_list<const char*> names) const
     {
@@ -32,19 +34,6 @@ struct Part {
                 return true;
         return false;
     }
-};
-
-class Findings {
-public:
-    void error(const char* id, const QString& text) { list_.push_back({id, FindingLevel::Error, text.toStdString()}); }
-    void warning(const char* id, const QString& text)
-    {
-        list_.push_back({id, FindingLevel::Warning, text.toStdString()});
-    }
-    std::vector<TrackerFinding> take() { return std::move(list_); }
-
-private:
-    std::vector<TrackerFinding> list_;
 };
 
 QString quoted(const QString& text) { return "\"" + text + "\""; }
@@ -74,7 +63,7 @@ bool checkPresence(const Part& part, Findings& findings)
     const std::pair<bool, const char*> needs[] = {
         {!f.description.isEmpty(), "The description (line 1) is missing."},
         {f.hasName, "The \"0 Name:\" line is missing or empty."},
-        {f.hasType && KnownTypes.contains(part.plainType),
+        {f.hasType && KnownPartTypes.contains(part.plainType),
          "The \"0 !LDRAW_ORG\" line is missing or names no known type."},
         {f.hasLicense, "The \"0 !LICENSE\" line is missing."},
         {f.hasAuthor && authorWellFormed(f.author),
@@ -89,6 +78,25 @@ bool checkPresence(const Part& part, Findings& findings)
     return complete;
 }
 
+// The list file's entries are UTF-8, or Latin-1 when they are not valid UTF-8.
+bool isOfficial(const QString& category, const StringList& categories)
+{
+    const auto utf8 = category.toStdString();
+    for (const auto& entry : categories)
+        if (entry != "<none>" && (IsValidUtf8(entry) ? entry == utf8 : QString::fromLatin1(entry) == category))
+            return true;
+    return false;
+}
+
+QString replacementOf(const QString& retiredCategory)
+{
+    if (retiredCategory == "Minifig")
+        return "use a suitable active Minifig category";
+    if (retiredCategory == "Forklift")
+        return "use Vehicle";
+    return "no replacement";
+}
+
 void checkLicenceAndCategory(const Part& part, Findings& findings)
 {
     const auto& f = part.facts;
@@ -97,18 +105,17 @@ void checkLicenceAndCategory(const Part& part, Findings& findings)
     if (f.qualifier == "Physical_Colour" && !part.inCategory({"Obsolete"}))
         findings.error("type.phycolor",
                        "Physical_Colour is only allowed in category Obsolete, not " + quoted(f.category) + ".");
-    if (part.partsType && !part.categories.contains(f.category) && !RetiredCategories.contains(f.category))
+    if (part.partsType && !isOfficial(f.category, *part.categories) && !RetiredCategories.contains(f.category))
         findings.error("category.invalid", "The category " + quoted(f.category) + " is not an official one.");
-    if (RetiredCategories.contains(f.category))
-        findings.warning("warning.minifigcategory", "The category " + quoted(f.category) + " is retired.");
+    if (part.partsType && RetiredCategories.contains(f.category))
+        findings.warning("warning.minifigcategory",
+                         "The category " + quoted(f.category) + " is retired: " + replacementOf(f.category) + ".");
 }
 
 void checkHistory(const Part& part, Findings& findings)
 {
-    static const QRegularExpression form(
-        QStringLiteral("^0 !HISTORY \\d{4}-\\d{2}-\\d{2} (?:\\[[^\\]]+\\]|\\{[^}]+\\}) +\\S"));
     for (const auto& line : part.facts.historyLines)
-        if (!form.match(line).hasMatch())
+        if (!IsHistoryLine(line))
             findings.error("history.invalid",
                            "The history line " + quoted(line) + " is not \"0 !HISTORY YYYY-MM-DD [user] comment\".");
 }
@@ -170,18 +177,16 @@ void checkDescription(const Part& part, Findings& findings)
         findings.error("description.invalidchars",
                        "The description " + quoted(f.description) + " holds control characters.");
     checkDescriptionPrefix(part, findings);
-    static const QRegularExpression single(QStringLiteral("(\\S+) (\\d)(?= |$)(?: (\\S+))?"));
-    for (auto it = single.globalMatch(f.description); it.hasNext();) {
-        const auto match = it.next();
-        const auto before = match.captured(1), after = match.captured(3);
-        if (before.endsWith(' ') || QStringList{"Type", "Phase", "Functions"}.contains(before) ||
-            QStringList{"Ball", "Balls", "Stripe", "Stripes", "White"}.contains(after))
-            continue;
+    // A number after exactly one blank, other than a two-digit one, a size in inches or a fraction,
+    // "Type 2", "Phase 1", "Functions 3", or a number of balls, stripes or white parts.
+    static const QRegularExpression singleBlankNumber(
+        QStringLiteral("(?<!\\s)\\s(?<!Type\\s)(?<!Phase\\s)(?<!Functions\\s)\\d(?:\\.\\d+)?\\b(?![\\d\"/-])"
+                       "(?!\\s+(?:Ball|Balls|Stripe|Stripes|White)\\b)"),
+        QRegularExpression::CaseInsensitiveOption | QRegularExpression::UseUnicodePropertiesOption);
+    if (const auto match = singleBlankNumber.match(f.description); match.hasMatch())
         findings.warning("warning.descriptionnumbers",
-                         "The number " + match.captured(2) + " in " + quoted(f.description) +
+                         "The number " + match.captured(0).trimmed() + " in " + quoted(f.description) +
                              " has one blank before it; the library writes two (\"Brick  1 x  2\").");
-        break;
-    }
 }
 
 void checkPattern(const Part& part, Findings& findings)
@@ -232,11 +237,6 @@ void checkBody(const Part& part, Findings& findings)
                                                                 quoted(f.category) + ", not Obsolete."
                                                           : "The category is Obsolete, but the description " +
                                                                 quoted(f.description) + " does not say so.");
-    for (const auto& line : f.subfileLines) {
-        const auto file = line.section(' ', 14, -1, QString::SectionSkipEmpty);
-        if (file.compare(f.name, Qt::CaseInsensitive) == 0)
-            findings.error("circularreference", "The file uses itself: " + quoted(line));
-    }
     for (const auto& line : f.previewLines) {
         const auto words = line.split(' ', Qt::SkipEmptyParts);
         if (words.size() != 15 || !PreviewRotations.contains(words.mid(6).join(' ')))
@@ -244,11 +244,46 @@ void checkBody(const Part& part, Findings& findings)
     }
 }
 
-// "3626bp01" is a pattern; "-f1" at the end of a name is passed over.
-bool isPatternName(const QString& baseName)
+// The strict reading of a name's suffix, token by token, each at the first form that fits; the
+// kinds of the tokens read, or none when a part of the suffix fits no form.
+std::optional<QString> suffixTokens(const QString& suffix)
 {
-    static const QRegularExpression pattern(QStringLiteral("^.+p[0-9a-z]{2,4}(?:-f\\d*)?$"));
-    return pattern.match(baseName).hasMatch();
+    static const QRegularExpression token(
+        QStringLiteral("\\G(?:(p)\\d{4}|(p)[cd][0-9a-z][0-9a-l]|(p)[0-9a-z]{2}|([cdk])[0-9a-z]{2}|(-)f[0-9a-z])"));
+    QString kinds;
+    for (qsizetype at = 0; at < suffix.size();) {
+        const auto match = token.match(suffix, at);
+        if (!match.hasMatch())
+            return std::nullopt;
+        for (int group = 1; group <= match.lastCapturedIndex(); ++group)
+            kinds += match.captured(group);
+        at = match.capturedEnd();
+    }
+    return kinds;
+}
+
+// A pattern's name ends in a suffix of pattern tokens ("p" and two to four characters), maybe
+// with colour or flex tokens ("c01", "d01", "k01") and a trailing "-f" token. The suffix is the
+// leftmost tail made of such tokens in their loose form; it must then read in the strict form,
+// and its last token (before "-f") must be a pattern token. So "3626bpx1", "973p37", "4073pc01"
+// ("pc01": p, a c/d, a character, a character up to "l") and "3001p1234" are patterns;
+// "22385p026" ("p02" then a lone "6"), "3002p18b" and "3001p01c01" (ends in "c01") are not.
+bool isPatternName(const QString& fileName)
+{
+    static const QRegularExpression looseSuffix(QStringLiteral("(?:p[a-z0-9]{2,4}|[cdk][0-9a-z]{2})+(?:-f[0-9a-z])?$"));
+    auto base = fileName.toLower();
+    base = base.mid(std::max(base.lastIndexOf('\\'), base.lastIndexOf('/')) + 1);
+    if (base.endsWith(".dat"))
+        base.chop(4);
+    const auto suffix = looseSuffix.match(base);
+    if (!suffix.hasMatch())
+        return false;
+    auto kinds = suffixTokens(suffix.captured(0));
+    if (!kinds)
+        return false;
+    if (kinds->endsWith('-'))
+        kinds->chop(1);
+    return kinds->endsWith('p');
 }
 
 QString fromFile(std::string_view bytes)
@@ -262,18 +297,21 @@ QString fromFile(std::string_view bytes)
 const char* LevelText(FindingLevel level) { return level == FindingLevel::Error ? "error" : "warning"; }
 
 std::vector<TrackerFinding> CheckForTracker(std::string_view text, const std::string& fileName,
-                                            const StringList& categories)
+                                            const StringList& categories, const ColourCodes& colours)
 {
+    const bool utf8 = IsValidUtf8(text);
+    std::string converted;
+    if (!utf8)
+        converted = Latin1ToUtf8(text);
+    const auto utf8Text = utf8 ? text : std::string_view(converted);
     Part part;
-    part.facts = ReadHeaderFacts(fromFile(text));
+    part.facts = ReadHeaderFacts(utf8Text);
     part.fileName = fromFile(fileName);
     part.baseName = part.fileName.toLower().section('.', 0, 0);
     part.plainType = PlainType(part.facts.type);
     part.partsType = part.plainType == "Part" || part.plainType == "Shortcut";
-    part.pattern = part.partsType && isPatternName(part.baseName);
-    for (const auto& category : categories)
-        if (category != "<none>")
-            part.categories << fromFile(category);
+    part.pattern = part.partsType && isPatternName(part.fileName);
+    part.categories = &categories;
     Findings findings;
     if (checkPresence(part, findings)) {
         checkLicenceAndCategory(part, findings);
@@ -283,14 +321,18 @@ std::vector<TrackerFinding> CheckForTracker(std::string_view text, const std::st
         checkPattern(part, findings);
         checkTypeQualifiers(part, findings);
         checkBody(part, findings);
+        const auto name = part.facts.name.toStdString();
+        const LinePart linePart{colours, name,
+                                part.partsType && part.facts.category == QLatin1String("Sticker Shortcut")};
+        CheckLines(utf8Text, linePart, findings);
     }
     return findings.take();
 }
 
 std::vector<TrackerFinding> CheckRecordForTracker(const HeaderData& header, const std::string& composedHeader,
-                                                  const StringList& categories)
+                                                  const StringList& categories, const ColourCodes& colours)
 {
     const auto slash = header.FilePath.rfind('/');
     const auto fileName = slash == std::string::npos ? header.FilePath : header.FilePath.substr(slash + 1);
-    return CheckForTracker(composedHeader + header.Body + "\r\n", fileName, categories);
+    return CheckForTracker(composedHeader + header.Body + "\r\n", fileName, categories, colours);
 }

@@ -2,10 +2,12 @@
 #include <QComboBox>
 #include <QLineEdit>
 
+#include "ColourSource.h"
 #include "Dialogs.h"
 #include "DocumentQuestions.h"
 #include "ErrorReport.h"
 #include "FileText.h"
+#include "ListFolder.h"
 #include "frmList.h"
 #include "frmMain.h"
 #include "frmOption.h"
@@ -47,9 +49,20 @@ void frmMain::MTrackerCheck_Click()
 {
     if (openInProgress())
         return;
-    const auto findings = CheckRecordForTracker(app_.Header, newHeaderText_, EntriesOf(app_.Lists, ListKind::Category));
-    frmTracker dialog(findings, this);
-    dialog.exec();
+    try {
+        const auto report = [this](const std::string& text) {
+            services_.dialogs.message({text, ProgramTitle, Buttons::Ok, Icon::Exclamation, Answer::Ok});
+        };
+        const auto builtIn = ReadBuiltInColours(DataFileOfThisProgram(app_.ProgramFolder, BuiltInColoursFile));
+        ColourSource colours(builtIn, "", report);
+        const auto findings =
+            CheckRecordForTracker(app_.Header, newHeaderText_, EntriesOf(app_.Lists, ListKind::Category),
+                                  colours.forPart(app_.Header.FilePath, report));
+        frmTracker dialog(findings, QString::fromStdString(app_.Header.FilePath), this);
+        dialog.exec();
+    } catch (const std::exception& error) {
+        ReportError(services_.dialogs, ErrorOf(error), {"MTrackerCheck_Click", OwnerKind::Formular, "frmMain"});
+    }
 }
 
 void frmMain::MEinstellDefault_Click()

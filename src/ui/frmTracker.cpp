@@ -1,51 +1,116 @@
 #include "frmTracker.h"
 
+#include <QClipboard>
+#include <QGuiApplication>
+#include <QHBoxLayout>
 #include <QHeaderView>
 #include <QLabel>
 #include <QPushButton>
 #include <QTableWidget>
+#include <QVBoxLayout>
 #include <algorithm>
 
 #include "TwipLayout.h"
 
 namespace {
 
+enum Column { LevelColumn, IdColumn, LineColumn, MessageColumn };
+
 QString verdict(const std::vector<TrackerFinding>& findings)
 {
     const auto errors = std::count_if(findings.begin(), findings.end(),
                                       [](const TrackerFinding& f) { return f.level == FindingLevel::Error; });
     if (findings.empty())
-        return "Nothing to fix: the Parts Tracker's header rules find nothing.";
+        return "Nothing to fix: the Parts Tracker's rules find nothing.";
     return errors == 0 ? "The Parts Tracker would accept this file, with the warnings below."
                        : QString("The Parts Tracker would refuse this file: %1 error(s) to fix.").arg(errors);
 }
 
+// Errors before warnings, then by id, then by line.
+bool listedBefore(const TrackerFinding& a, const TrackerFinding& b)
+{
+    return std::tie(a.level, a.id, a.line) < std::tie(b.level, b.id, b.line);
+}
+
+// A line number that sorts as a number; empty for a finding about the whole file, which sorts first.
+class LineItem : public QTableWidgetItem {
+public:
+    explicit LineItem(int line) : QTableWidgetItem(line > 0 ? QString::number(line) : QString()), line_(line) {}
+    bool operator<(const QTableWidgetItem& other) const override
+    {
+        return line_ < static_cast<const LineItem&>(other).line_;
+    }
+
+private:
+    int line_;
+};
+
 } // namespace
 
-frmTracker::frmTracker(const std::vector<TrackerFinding>& findings, QWidget* parent) : QDialog(parent)
+frmTracker::frmTracker(const std::vector<TrackerFinding>& findings, const QString& filePath, QWidget* parent)
+    : QDialog(parent), filePath_(filePath)
 {
     setObjectName("frmTracker");
     setWindowTitle("Check for the Parts Tracker");
     setModal(true);
-    setFixedSize(Pixels(9240), Pixels(4200));
-    lblVerdict = PlaceCaptioned<QLabel>(this, "lblVerdict", "", 120, 120, 9000, 255);
-    lblVerdict->setText(verdict(findings));
-    tbFindings = PlaceChild<QTableWidget>(this, "tbFindings", 120, 480, 9000, 3000);
-    tbFindings->setColumnCount(3);
-    tbFindings->setHorizontalHeaderLabels({"Level", "Id", "Message"});
+    resize(Pixels(9240), Pixels(4200));
+    lblVerdict = new QLabel(verdict(findings), this);
+    lblVerdict->setObjectName("lblVerdict");
+    lblVerdict->setWordWrap(true);
+    tbFindings = new QTableWidget(this);
+    tbFindings->setObjectName("tbFindings");
+    cmdCopy = new QPushButton("Copy", this);
+    cmdCopy->setObjectName("cmdCopy");
+    cmdClose = new QPushButton("Close", this);
+    cmdClose->setObjectName("cmdClose");
+    cmdClose->setDefault(true);
+    auto* buttons = new QHBoxLayout;
+    buttons->addStretch();
+    buttons->addWidget(cmdCopy);
+    buttons->addWidget(cmdClose);
+    auto* layout = new QVBoxLayout(this);
+    layout->addWidget(lblVerdict);
+    layout->addWidget(tbFindings, 1);
+    layout->addLayout(buttons);
+    fillTable(findings);
+    connect(cmdCopy, &QPushButton::clicked, this, [this] { QGuiApplication::clipboard()->setText(findingsText()); });
+    connect(cmdClose, &QPushButton::clicked, this, &QDialog::accept);
+}
+
+void frmTracker::fillTable(std::vector<TrackerFinding> findings)
+{
+    std::stable_sort(findings.begin(), findings.end(), listedBefore);
+    tbFindings->setColumnCount(4);
+    tbFindings->setHorizontalHeaderLabels({"Level", "Id", "Line", "Message"});
     tbFindings->setRowCount(static_cast<int>(findings.size()));
     tbFindings->setEditTriggers(QAbstractItemView::NoEditTriggers);
+    tbFindings->setSelectionBehavior(QAbstractItemView::SelectRows);
+    tbFindings->setWordWrap(true);
     tbFindings->verticalHeader()->hide();
+    tbFindings->verticalHeader()->setSectionResizeMode(QHeaderView::ResizeToContents);
     tbFindings->horizontalHeader()->setStretchLastSection(true);
     for (int row = 0; row < tbFindings->rowCount(); ++row) {
         const auto& finding = findings[static_cast<std::size_t>(row)];
-        tbFindings->setItem(row, 0, new QTableWidgetItem(LevelText(finding.level)));
-        tbFindings->setItem(row, 1, new QTableWidgetItem(QString::fromStdString(finding.id)));
-        tbFindings->setItem(row, 2, new QTableWidgetItem(QString::fromStdString(finding.text)));
+        tbFindings->setItem(row, LevelColumn, new QTableWidgetItem(LevelText(finding.level)));
+        tbFindings->setItem(row, IdColumn, new QTableWidgetItem(QString::fromStdString(finding.id)));
+        tbFindings->setItem(row, LineColumn, new LineItem(finding.line));
+        tbFindings->setItem(row, MessageColumn, new QTableWidgetItem(QString::fromStdString(finding.text)));
     }
-    tbFindings->resizeColumnToContents(0);
-    tbFindings->resizeColumnToContents(1);
-    cmdClose = PlaceCaptioned<QPushButton>(this, "cmdClose", "Close", 7800, 3720, 1320, 375);
-    cmdClose->setDefault(true);
-    connect(cmdClose, &QPushButton::clicked, this, &QDialog::accept);
+    for (const auto column : {LevelColumn, IdColumn, LineColumn})
+        tbFindings->resizeColumnToContents(column);
+    // Sorting by level keeps the order within each level: errors first, then by id.
+    tbFindings->horizontalHeader()->setSortIndicator(LevelColumn, Qt::AscendingOrder);
+    tbFindings->setSortingEnabled(true);
+}
+
+QString frmTracker::findingsText() const
+{
+    QString text = filePath_ + '\n';
+    for (int row = 0; row < tbFindings->rowCount(); ++row) {
+        const auto line = tbFindings->item(row, LineColumn)->text();
+        text += tbFindings->item(row, LevelColumn)->text() + ' ' + tbFindings->item(row, IdColumn)->text() + ": " +
+                (line.isEmpty() ? QString() : "line " + line + ": ") + tbFindings->item(row, MessageColumn)->text() +
+                '\n';
+    }
+    return text;
 }

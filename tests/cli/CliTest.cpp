@@ -170,6 +170,41 @@ TEST(CliBatch, SummaryCountsEachFinding)
               "  fix-up offered: 0 WRITE lines in the body: 2\n");
 }
 
+// The line of the text that saving path would write on which text starts, counted from 1.
+int savedLineOf(const std::string& path, const std::string& text)
+{
+    const auto saved = RunCliWith({"print", path}).out;
+    return static_cast<int>(std::count(saved.begin(), saved.begin() + saved.find(text), '\n')) + 1;
+}
+
+TEST(CliTracker, LineFindingsNameTheirLineAndColoursComeFromTheLibrarysLDConfig)
+{
+    TempDir dir;
+    std::filesystem::create_directories(dir.path() / "library/parts");
+    dir.write("library/LDConfig.ldr", "0 !COLOUR Main_Colour CODE 16 VALUE #FFFF80 EDGE #333333\r\n");
+    const auto bad = dir.write("library/parts/3001.dat",
+                               "0 Brick  2 x  4\r\n0 Name: 3001.dat\r\n0 Author: Sam Sample [ssample]\r\n"
+                               "0 !LDRAW_ORG Part UPDATE 2024-01\r\n"
+                               "0 !LICENSE Licensed under CC BY 4.0 : see CAreadme.txt\r\n0 BFC CERTIFY CCW\r\n"
+                               "3 16 0 0 0 1 0 0 0 1\r\n3 4 0 0 0 1 0 0 0 1 0\r\n");
+    const auto invalid = savedLineOf(bad, "3 16 "), red = savedLineOf(bad, "3 4 ");
+    const auto text = RunCliWith({"check", "--tracker", "--quiet", bad});
+    EXPECT_EQ(text.status, 1);
+    EXPECT_NE(text.out.find(bad + ": tracker error line.invalid: line " + std::to_string(invalid) + ": "),
+              std::string::npos)
+        << text.out;
+    const auto json = nlohmann::json::parse(RunCliWith({"check", "--tracker", "--json", bad}).out);
+    ASSERT_EQ(json["tracker"].size(), 2u) << json.dump();
+    EXPECT_EQ(json["tracker"][0]["line"], invalid);
+    EXPECT_EQ(json["tracker"][1]["id"], "line.invalidcolor");
+    EXPECT_EQ(json["tracker"][1]["line"], red);
+    const auto malformed = dir.write("LDConfig.ldr", "0 !COLOUR Red CODE 4\r\n");
+    const auto builtIn = RunCliWith({"check", "--tracker", "--quiet", "--ldconfig", malformed, bad, bad});
+    EXPECT_EQ(builtIn.out.find("invalidcolor"), std::string::npos) << "the built-in list has 4";
+    EXPECT_EQ(std::count(builtIn.err.begin(), builtIn.err.end(), '\n'), 1) << builtIn.err;
+    EXPECT_NE(builtIn.err.find(malformed), std::string::npos);
+}
+
 // The subparts of the corpus: real files in hundreds, checked with the Parts Tracker's rules too.
 TEST(CliBatch, ManyThreadsWriteWhatOneThreadWrites)
 {

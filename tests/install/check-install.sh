@@ -14,7 +14,7 @@ usr="$dest/usr"
 id=io.github.quillmark.Quillmark
 doc=share/doc/quillmark
 for file in bin/quillmark bin/quillmark-cli \
-            share/quillmark/category.txt share/quillmark/parttype.txt share/quillmark/bfc.txt share/quillmark/licenses.txt \
+            share/quillmark/category.txt share/quillmark/parttype.txt share/quillmark/bfc.txt share/quillmark/licenses.txt share/quillmark/colourcodes.txt \
             share/applications/$id.desktop share/mime/packages/$id.xml share/metainfo/$id.metainfo.xml \
             share/icons/hicolor/48x48/apps/$id.png share/icons/hicolor/scalable/apps/$id.svg \
             share/man/man1/quillmark.1.gz share/man/man1/quillmark-cli.1.gz $doc/copyright $doc/changelog.gz; do

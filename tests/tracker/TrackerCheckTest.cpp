@@ -4,35 +4,15 @@
 #include <set>
 
 #include "TrackerCheck.h"
+#include "TrackerTestParts.h"
 
 namespace {
-
-const StringList Categories = {"<none>", "Brick", "Hose", "Technic", "Moved", "Obsolete", "Minifig Accessory"};
-
-// A header the Tracker accepts, with the body line after it.
-std::string cleanPart(const std::string& description = "Brick  2 x  4", const std::string& name = "3001.dat",
-                      const std::string& type = "Part", const std::string& extra = "")
-{
-    return "0 " + description + "\r\n0 Name: " + name + "\r\n0 Author: Jane Doe [jdoe]\r\n0 !LDRAW_ORG " + type +
-           "\r\n0 !LICENSE Licensed under CC BY 4.0 : see CAreadme.txt\r\n\r\n0 BFC CERTIFY CCW\r\n\r\n" + extra +
-           "1 16 0 0 0 1 0 0 0 1 0 0 0 1 stud.dat\r\n";
-}
-
-std::set<std::string> idsOf(const std::string& text, const std::string& fileName = "3001.dat")
-{
-    std::set<std::string> ids;
-    for (const auto& finding : CheckForTracker(text, fileName, Categories))
-        ids.insert(finding.id);
-    return ids;
-}
-
-using Ids = std::set<std::string>;
 
 TEST(TrackerRules, AMissingOrMalformedHeaderLineStopsEveryOtherRule)
 {
     auto text = cleanPart("Brick 1 x 2", "x3001.dat");
     text.replace(text.find("Jane Doe [jdoe]"), 15, "Jane [j d]");
-    const auto findings = CheckForTracker(text, "x3001.dat", Categories);
+    const auto findings = CheckForTracker(text, "x3001.dat", Categories, Colours());
     ASSERT_EQ(findings.size(), 1u);
     EXPECT_EQ(findings[0].id, "missing");
     EXPECT_EQ(findings[0].level, FindingLevel::Error);
@@ -45,7 +25,7 @@ TEST(TrackerRules, AMissingOrMalformedHeaderLineStopsEveryOtherRule)
 TEST(TrackerRules, LicenceAndBfc)
 {
     auto text = cleanPart();
-    EXPECT_EQ(CheckForTracker(text, "3001.dat", Categories).size(), 0u);
+    EXPECT_EQ(CheckForTracker(text, "3001.dat", Categories, Colours()).size(), 0u);
     text.replace(text.find("Licensed under CC BY 4.0"), 24, "Licensed  under CC BY 4.0"); // blanks collapse
     EXPECT_EQ(idsOf(text), Ids{});
     text.replace(text.find("CC BY 4.0"), 9, "CCAL 2.0");
@@ -77,7 +57,7 @@ TEST(TrackerRules, DescriptionPrefixesAndCharacters)
     EXPECT_EQ(idsOf(cleanPart("|Brick", "t3001.dat"), "t3001.dat"), Ids{});
     EXPECT_EQ(idsOf(cleanPart("Brick", "3001.dat", "Part", "0 !CATEGORY Moved\r\n")),
               Ids{"description.movedorobsolete"});
-    EXPECT_EQ(idsOf(cleanPart("Brick\t2")), Ids{"description.invalidchars"});
+    EXPECT_EQ(idsOf(cleanPart("Brick\t2")), (Ids{"description.invalidchars", "warning.descriptionnumbers"}));
     EXPECT_EQ(idsOf(cleanPart("Brick 1 x 2")), Ids{"warning.descriptionnumbers"});
     EXPECT_EQ(idsOf(cleanPart("Technic Ball Joint Type 2")), Ids{});
     EXPECT_EQ(idsOf(cleanPart("Brick with 1 White Stripe")), Ids{}) << "before White";
@@ -111,13 +91,78 @@ TEST(TrackerRules, HistoryPreviewAndSelfReference)
                               "0 !PREVIEW 16 0 0 0 0 0 1 0 1 0 -1 0 0\r\n")),
               Ids{});
     EXPECT_EQ(idsOf(cleanPart("Brick", "3001.dat", "Part", "0 !HISTORY 2024-1-2 [jdoe] made\r\n")),
-              Ids{"history.invalid"});
+              (Ids{"history.invalid", "line.invalid"}));
     EXPECT_EQ(idsOf(cleanPart("Brick", "3001.dat", "Part", "0 !HISTORY 2024-01-02 [jdoe]\r\n")),
-              Ids{"history.invalid"});
+              (Ids{"history.invalid", "line.invalid"}));
     EXPECT_EQ(idsOf(cleanPart("Brick", "3001.dat", "Part", "0 !PREVIEW 16 0 0 0 1 1 0 0 1 0 0 0 1\r\n")),
               Ids{"warning.previewinvalid"});
     EXPECT_EQ(idsOf(cleanPart("Brick", "3001.dat", "Part", "1 16 0 0 0 1 0 0 0 1 0 0 0 1 3001.DAT\r\n")),
               Ids{"circularreference"});
+}
+
+} // namespace
+
+namespace {
+
+bool warns(const std::string& description, const char* id = "warning.descriptionnumbers")
+{
+    return idsOf(cleanPart(description)).contains(id);
+}
+
+TEST(TrackerRules, AcceptedLicencesFoldersAndTheFirstBfcLine)
+{
+    auto cc0 = cleanPart();
+    cc0.replace(cc0.find("Licensed under CC BY 4.0"), 24, "Marked with CC0 1.0");
+    EXPECT_EQ(idsOf(cc0), Ids{});
+    EXPECT_EQ(idsOf(cleanPart("Cylinder  1.0", "8\\4-4cyli.dat", "8_Primitive"), "4-4cyli.dat"), Ids{});
+    EXPECT_EQ(idsOf(cleanPart("Cylinder  1.0", "48\\4-4cyli.dat", "8_Primitive"), "4-4cyli.dat"), Ids{"type.path"});
+    EXPECT_EQ(idsOf(cleanPart("Brick  2 x  4", "3001.dat", "Part", "0 BFC INVERTNEXT\r\n")), Ids{})
+        << "a body that starts with INVERTNEXT";
+}
+
+TEST(TrackerRules, RetiredCategoriesOnPartsOnlyNameTheirReplacement)
+{
+    const auto message = [](const std::string& description, const std::string& type = "Part") {
+        for (const auto& f :
+             CheckForTracker(cleanPart(description, "3001.dat", type), "3001.dat", Categories, Colours()))
+            if (f.id == "warning.minifigcategory")
+                return f.text;
+        return std::string("none");
+    };
+    EXPECT_NE(message("Minifig Hat").find("use a suitable active Minifig category"), std::string::npos);
+    EXPECT_NE(message("Forklift Arm", "Shortcut").find("use Vehicle"), std::string::npos);
+    EXPECT_NE(message("Lever Small").find("no replacement"), std::string::npos);
+    EXPECT_EQ(message("~Minifig Hat", "Subpart"), "none");
+    EXPECT_EQ(message("Lever Small", "Primitive"), "none");
+    EXPECT_EQ(message("minifig Hat"), "none") << "compared with its case";
+}
+
+TEST(TrackerRules, DescriptionNumbersAfterOneBlank)
+{
+    for (const auto* description : {"Brick 1 x 2", "Cone 18 x 0.25", "Brick  1 x 2"})
+        EXPECT_TRUE(warns(description)) << description;
+    for (const auto* description : {"Brick  1 x  2", "Tile 12 x 12", "Hose 3\"", "Wheel 3-Spoke", "Type 2 Ball",
+                                    "Technic Ball Joint Type 2", "Brick with 1 White Stripe", "Tile 1/2"})
+        EXPECT_FALSE(warns(description)) << description;
+}
+
+TEST(TrackerRules, PatternNamesAreSplitAsTheTrackerSplitsThem)
+{
+    for (const auto* base : {"3626bpx1", "973p37", "4073pc01", "3001p1234", "3001P01", "3001p01-f1"}) {
+        const auto file = std::string(base) + ".dat";
+        EXPECT_TRUE(idsOf(cleanPart("Brick with Stars", file), file).contains("description.patternword")) << base;
+    }
+    for (const auto* base : {"22385p026", "3002p18b", "3001p01c01", "3001c01"}) {
+        const auto file = std::string(base) + ".dat";
+        EXPECT_EQ(idsOf(cleanPart("Brick with Stars", file), file), Ids{}) << base;
+    }
+}
+
+TEST(TrackerRules, HistoryUsersAndBlanks)
+{
+    const auto history = [](const std::string& line) { return idsOf(cleanPart("Brick", "3001.dat", "Part", line)); };
+    EXPECT_EQ(history("0 !HISTORY\t2024-01-02  {Jane Doe}\tmade\r\n"), Ids{});
+    EXPECT_EQ(history("0 !HISTORY 2024-01-02 [J.C. Tchang] made\r\n"), (Ids{"history.invalid", "line.invalid"}));
 }
 
 } // namespace

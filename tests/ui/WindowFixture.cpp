@@ -14,7 +14,7 @@ const std::string GoodPart = "0 Brick  2 x 4\r\n0 Name: 3001.dat\r\n0 Author: Sa
 
 WindowTest::WindowTest()
 {
-    for (const char* list : {"category.txt", "parttype.txt", "bfc.txt", "licenses.txt"})
+    for (const char* list : {"category.txt", "parttype.txt", "bfc.txt", "licenses.txt", "colourcodes.txt"})
         std::filesystem::copy_file(std::filesystem::path(QUILLMARK_PROGRAM_FOLDER) / list, programFolder.path() / list);
     app.ProgramFolder = programFolder.path().string();
 }

@@ -1,0 +1,83 @@
+// The Parts Tracker dialog: its table's order, sorting, growing, and copying.
+#include <QApplication>
+#include <QClipboard>
+#include <QHeaderView>
+#include <QPushButton>
+#include <QTableWidget>
+#include <QTest>
+#include <gtest/gtest.h>
+
+#include "frmTracker.h"
+
+namespace {
+
+const std::string LongMessage = "The quad is not quite flat: it bends by 2.430 degrees, which the library accepts "
+                                "with a warning but would rather see split into two triangles.";
+
+const std::vector<TrackerFinding> Findings = {{"warning.notcoplaner", FindingLevel::Warning, LongMessage, 12},
+                                              {"line.invalid", FindingLevel::Error, "Not a valid LDraw line.", 30},
+                                              {"bfc", FindingLevel::Error, "The first BFC line is missing.", 0},
+                                              {"line.colinear", FindingLevel::Error, "On one line.", 9}};
+
+QStringList column(const QTableWidget& table, int column)
+{
+    QStringList texts;
+    for (int row = 0; row < table.rowCount(); ++row)
+        texts << table.item(row, column)->text();
+    return texts;
+}
+
+void clickHeader(QTableWidget& table, int section)
+{
+    auto* header = table.horizontalHeader();
+    QTest::mouseClick(
+        header->viewport(), Qt::LeftButton, {},
+        QPoint(header->sectionViewportPosition(section) + header->sectionSize(section) / 2, header->height() / 2));
+}
+
+TEST(TrackerDialog, ListsErrorsFirstAndSortsByTheClickedColumn)
+{
+    frmTracker dialog(Findings, "/parts/3001.dat");
+    dialog.show();
+    ASSERT_TRUE(QTest::qWaitForWindowExposed(&dialog));
+    auto& table = *dialog.findChild<QTableWidget*>("tbFindings");
+    EXPECT_EQ(column(table, 1), QStringList({"bfc", "line.colinear", "line.invalid", "warning.notcoplaner"}));
+    clickHeader(table, 2);
+    EXPECT_EQ(column(table, 2), QStringList({"", "9", "12", "30"}));
+    clickHeader(table, 2);
+    EXPECT_EQ(column(table, 2), QStringList({"30", "12", "9", ""}));
+}
+
+TEST(TrackerDialog, GrowsWithTheTableAndWrapsLongMessages)
+{
+    frmTracker dialog(Findings, "/parts/3001.dat");
+    dialog.show();
+    auto& table = *dialog.findChild<QTableWidget*>("tbFindings");
+    ASSERT_TRUE(QTest::qWaitForWindowExposed(&dialog));
+    const auto before = table.size();
+    dialog.resize(dialog.width() + 200, dialog.height() + 100);
+    QApplication::processEvents();
+    EXPECT_EQ(table.size(), before + QSize(200, 100));
+    const int longRow = 3; // the warning, listed last
+    dialog.resize(3000, dialog.height());
+    QApplication::processEvents();
+    EXPECT_EQ(table.rowHeight(longRow), table.rowHeight(0)) << "room enough for one line";
+    dialog.resize(500, dialog.height());
+    QApplication::processEvents();
+    EXPECT_GT(table.rowHeight(longRow), table.rowHeight(0)) << "the long message wraps";
+}
+
+TEST(TrackerDialog, CopyPutsThePathAndEveryFindingOnTheClipboard)
+{
+    frmTracker dialog(Findings, "/parts/3001.dat");
+    QApplication::clipboard()->clear();
+    dialog.findChild<QPushButton*>("cmdCopy")->click();
+    EXPECT_EQ(QApplication::clipboard()->text(), "/parts/3001.dat\n"
+                                                 "error bfc: The first BFC line is missing.\n"
+                                                 "error line.colinear: line 9: On one line.\n"
+                                                 "error line.invalid: line 30: Not a valid LDraw line.\n"
+                                                 "warning warning.notcoplaner: line 12: " +
+                                                     QString::fromStdString(LongMessage) + "\n");
+}
+
+} // namespace
