@@ -96,11 +96,12 @@ void frmTracker::fillTable(std::vector<TrackerFinding> findings)
         tbFindings->setItem(row, LineColumn, new LineItem(finding.line));
         tbFindings->setItem(row, MessageColumn, new QTableWidgetItem(QString::fromStdString(finding.text)));
     }
-    for (const auto column : {LevelColumn, IdColumn, LineColumn})
-        tbFindings->resizeColumnToContents(column);
     // Sorting by level keeps the order within each level: errors first, then by id.
     tbFindings->horizontalHeader()->setSortIndicator(LevelColumn, Qt::AscendingOrder);
     tbFindings->setSortingEnabled(true);
+    // Measured with the sort arrow in place, so that no column title is cut.
+    for (const auto column : {LevelColumn, IdColumn, LineColumn})
+        tbFindings->resizeColumnToContents(column);
 }
 
 QString frmTracker::findingsText() const
