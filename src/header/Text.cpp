@@ -109,6 +109,11 @@ bool ContainsIgnoreCase(std::string_view text, std::string_view needle)
     return false;
 }
 
+bool StartsWithIgnoreCase(std::string_view text, std::string_view prefix)
+{
+    return text.size() >= prefix.size() && equalIgnoreCaseAt(text, 0, prefix);
+}
+
 bool IsValidUtf8(std::string_view bytes)
 {
     for (std::size_t i = 0; i < bytes.size();) {
