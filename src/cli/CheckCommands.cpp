@@ -11,6 +11,7 @@
 #include "Clock.h"
 #include "Composer.h"
 #include "ConsoleDialogs.h"
+#include "FieldsJson.h"
 #include "FileSave.h"
 #include "ListFolder.h"
 #include "PartFileList.h"
@@ -44,7 +45,7 @@ std::string firstLine(const std::string& text) { return text.substr(0, text.find
 std::string checkJson(const HeaderData& header, const SaveFindings& findings, const TrackerFindings* tracker)
 {
     nlohmann::ordered_json json;
-    json["FilePath"] = Latin1ToUtf8(header.FilePath);
+    json["FilePath"] = PathForJson(header.FilePath);
     json["refusals"] = findings.refusals;
     json["missing_username"] = findings.missingUserName;
     json["fixups"] = {{"certify_invertnext", findings.fixups.certifyInvertNext},
@@ -60,8 +61,9 @@ std::string checkJson(const HeaderData& header, const SaveFindings& findings, co
     return json.dump() + '\n';
 }
 
-std::string findingLines(const std::string& path, const SaveFindings& findings, const TrackerFindings* tracker)
+std::string findingLines(const std::string& filePath, const SaveFindings& findings, const TrackerFindings* tracker)
 {
+    const auto path = ShownText(filePath);
     std::string lines;
     for (const auto& refusal : findings.refusals)
         lines += path + ": refused: " + firstLine(refusal) + '\n';
@@ -85,19 +87,20 @@ void noteFindings(FileReport& report, const SaveFindings& findings)
 }
 
 // Opens the file at path and lets handle fill the report; an unreadable file is reported as such.
-FileReport reportOn(const std::string& path, ConsoleDialogs::Answerer answerer,
-                    const std::function<void(HeaderData&, ConsoleDialogs&, FileReport&)>& handle)
+// Quiet, the messages of the file's dialogs are not shown.
+FileReport reportOn(const std::string& path, bool quiet, ConsoleDialogs::Answerer answerer,
+                    const std::function<void(OpenedPart&, ConsoleDialogs&, FileReport&)>& handle)
 {
     FileReport report;
-    std::ostringstream err;
-    ConsoleDialogs dialogs(err, std::move(answerer));
-    auto header = OpenForCli(path, dialogs, err);
-    if (!header) {
+    std::ostringstream err, discarded;
+    ConsoleDialogs dialogs(quiet ? discarded : err, std::move(answerer));
+    auto opened = OpenForCli(path, dialogs, err);
+    if (!opened) {
         report.unreadable = true;
         report.status = ExitStatus::Unreadable;
     } else {
         try {
-            handle(*header, dialogs, report);
+            handle(*opened, dialogs, report);
         } catch (const std::exception& failure) {
             ReportUnreadable(path, failure, err);
             report = FileReport{};
@@ -112,9 +115,13 @@ FileReport reportOn(const std::string& path, ConsoleDialogs::Answerer answerer,
 int runBatch(const std::vector<std::string>& arguments, const BatchOptions& batch, std::ostream& out, std::ostream& err,
              const std::function<FileReport(const std::string&)>& work)
 {
-    const auto files = ExpandPartFiles(arguments);
+    const auto found = ExpandPartFiles(arguments);
+    const auto& files = found.files;
+    for (const auto& problem : found.problems)
+        err << "quillmark-cli: cannot read folder " << ShownText(problem.path) << ": " << problem.reason << '\n';
     Summary summary;
-    int status = ExitStatus::Ok;
+    summary.addWalks(found);
+    int status = found.problems.empty() ? ExitStatus::Ok : ExitStatus::Unreadable;
     RunInOrder(
         files.size(), ThreadsFor(batch.threads), [&](std::size_t index) { return work(files[index]); },
         [&](FileReport& report) {
@@ -145,13 +152,16 @@ private:
     std::map<std::string, std::mutex> locks_;
 };
 
-std::string savedLine(const std::string& path, const SaveOptions& options, const SaveResult& result,
+std::string savedLine(const std::string& filePath, const SaveOptions& options, const SaveResult& result,
                       ConsoleDialogs& dialogs, FileReport& report)
 {
+    const auto path = ShownText(filePath);
     switch (result.outcome) {
     case SaveOutcome::Saved:
         report.saving = FileReport::Saving::Saved;
-        return "saved " + path + (options.backup ? " (backup: " + result.backupPath + ")" : " (no backup)") + '\n';
+        return "saved " + path + (options.backup ? " (backup: " + ShownText(result.backupPath) + ")" : " (no backup)") +
+               '\n';
+    case SaveOutcome::Unchanged: report.saving = FileReport::Saving::Unchanged; return "unchanged " + path + '\n';
     case SaveOutcome::Declined:
         report.saving = FileReport::Saving::Skipped;
         report.status = ExitStatus::Refused;
@@ -160,14 +170,15 @@ std::string savedLine(const std::string& path, const SaveOptions& options, const
         report.saving = FileReport::Saving::Failed;
         report.status = ExitStatus::SaveFailed;
         return "failed " + path + ": " +
-               (dialogs.lastTitle() == ChangedOnDiskTitle ? "changed while saving" : dialogs.lastMessage()) + '\n';
+               (dialogs.lastTitle() == ChangedOnDiskTitle ? "changed while saving" : OneLine(dialogs.lastMessage())) +
+               '\n';
     case SaveOutcome::Refused:
     case SaveOutcome::DescriptionTooLong: break;
     }
     report.saving = FileReport::Saving::Skipped;
     report.status = ExitStatus::Refused;
     report.refusals.push_back(firstLine(dialogs.lastMessage()));
-    return "skipped " + path + ": " + firstLine(dialogs.lastMessage()) + '\n';
+    return "skipped " + path + ": " + OneLine(firstLine(dialogs.lastMessage())) + '\n';
 }
 
 } // namespace
@@ -179,7 +190,8 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
     if (options.tracker && !readCategories(categories, err))
         return ExitStatus::Unreadable;
     return runBatch(arguments, batch, out, err, [&](const std::string& path) {
-        return reportOn(path, {}, [&](HeaderData& header, ConsoleDialogs&, FileReport& report) {
+        return reportOn(path, batch.quiet, {}, [&](OpenedPart& opened, ConsoleDialogs&, FileReport& report) {
+            const auto& header = opened.header;
             const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
             TrackerFindings tracker; // empty unless asked for
             if (options.tracker)
@@ -213,11 +225,17 @@ int RunSave(const std::vector<std::string>& arguments, const SaveOptions& option
     FileLocks locks;
     return runBatch(arguments, batch, out, err, [&](const std::string& path) {
         const std::lock_guard lock(locks.of(path));
-        return reportOn(path, answer, [&](HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
-            const SaveContext context{dialogs,        clock,
-                                      options.backup, [&header] { return ComposeHeader(header); },
-                                      [] {},          batch.limitDescription};
-            report.out = savedLine(header.FilePath, options, CheckHeaderAndSave(header, context), dialogs, report);
-        });
+        return reportOn(
+            path, batch.quiet, answer, [&](OpenedPart& opened, ConsoleDialogs& dialogs, FileReport& report) {
+                auto& header = opened.header;
+                const SaveContext context{dialogs,
+                                          clock,
+                                          options.backup,
+                                          [&header] { return ComposeHeader(header); },
+                                          [] {},
+                                          batch.limitDescription,
+                                          opened.content->view()};
+                report.out = savedLine(header.FilePath, options, CheckHeaderAndSave(header, context), dialogs, report);
+            });
     });
 }

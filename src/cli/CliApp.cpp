@@ -2,7 +2,9 @@
 
 #include <CLI/CLI.hpp>
 
+#include "Batch.h"
 #include "CheckCommands.h"
+#include "CliFiles.h"
 #include "ConsoleDialogs.h"
 #include "PrintCommands.h"
 
@@ -15,7 +17,8 @@ int RunCli(int argc, const char* const* argv, std::ostream& out, std::ostream& e
 
     std::vector<std::string> fieldsFiles;
     auto* fields = app.add_subcommand(
-        "fields", "Print, per FILE, one JSON line with the header record after opening it (texts as ISO-8859-1).");
+        "fields", "Print, per FILE, one JSON line with the header record after opening it (texts as ISO-8859-1; "
+                  "the two paths as UTF-8 when their bytes are valid UTF-8, else as ISO-8859-1 too).");
     fields->add_option("FILE", fieldsFiles, "Part files to read")->required();
 
     std::string printFile;
@@ -28,8 +31,12 @@ int RunCli(int argc, const char* const* argv, std::ostream& out, std::ostream& e
     bool noLengthLimit = false;
     const auto addBatchOptions = [&](CLI::App* command) {
         command->add_flag("--no-length-limit", noLengthLimit, "Allow part descriptions of any length");
-        command->add_option("-j,--jobs", batch.threads, "Files worked on at once (default: one per core)");
-        command->add_flag("--quiet", batch.quiet, "No summary at the end on standard error");
+        command->add_option("-j,--jobs", batch.threads, "Files worked on at once, 1 to 1024 (default: one per core)")
+            ->check(CLI::Range(1u, MaxThreads));
+        command->add_flag(
+            "--quiet", batch.quiet,
+            "Print the line of each file, and only on standard error the files and folders that cannot be "
+            "read: no messages, progress or summary");
     };
 
     std::vector<std::string> checkFiles;
@@ -38,7 +45,9 @@ int RunCli(int argc, const char* const* argv, std::ostream& out, std::ostream& e
         "check", "Run every save check on each FILE, or each part file (*.dat) below a FOLDER, without writing: "
                  "refusals, a missing user name, and the fix-ups a save would offer; then a summary on standard "
                  "error. Exit status 1 when any file would be refused, 2 when one cannot be read.");
-    check->add_flag("--json", checkOptions.json, "One JSON object per file and line");
+    check->add_flag("--json", checkOptions.json,
+                    "One JSON object per file and line. A path is given as UTF-8 when its bytes are valid UTF-8, "
+                    "otherwise each byte as the ISO-8859-1 character of that code");
     check->add_flag("--tracker", checkOptions.tracker,
                     "Check the Parts Tracker's header rules too (an error there refuses the file). Rules that need "
                     "the Tracker's database (registered authors, duplicates, held subfiles) are not checked.");
@@ -62,7 +71,7 @@ int RunCli(int argc, const char* const* argv, std::ostream& out, std::ostream& e
     try {
         app.parse(argc, argv);
     } catch (const CLI::ParseError& error) {
-        return app.exit(error, out, err);
+        return app.exit(error, out, err) == 0 ? ExitStatus::Ok : ExitStatus::Usage;
     }
 
     ConsoleDialogs dialogs(err);

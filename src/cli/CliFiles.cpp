@@ -5,12 +5,11 @@
 #include "ConsoleDialogs.h"
 #include "OpenDocument.h"
 #include "ParseProgress.h"
-#include "PartFile.h"
 #include "QmError.h"
 
 void ReportUnreadable(const std::string& path, const std::exception& failure, std::ostream& err)
 {
-    err << "quillmark-cli: cannot read " << path << ": " << ErrorOf(failure).description() << '\n';
+    err << "quillmark-cli: cannot read " << ShownText(path) << ": " << OneLine(ErrorOf(failure).description()) << '\n';
 }
 
 namespace {
@@ -29,16 +28,15 @@ int handleCatching(const std::string& path, HeaderData& header, std::ostream& er
 
 } // namespace
 
-std::optional<HeaderData> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err)
+std::optional<OpenedPart> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err)
 {
     dialogs.setCurrentFile(path);
     try {
-        const FileBytes content(path);
-        HeaderData header;
+        OpenedPart opened{std::make_unique<FileBytes>(path), {}};
         ParseProgress silent;
-        OpenPartFileContent(header, path, content.view(), dialogs, silent);
-        header.ReadStamp = content.stamp();
-        return header;
+        OpenPartFileContent(opened.header, path, opened.content->view(), dialogs, silent);
+        opened.header.ReadStamp = opened.content->stamp();
+        return opened;
     } catch (const std::exception& failure) {
         ReportUnreadable(path, failure, err);
         return std::nullopt;
@@ -50,8 +48,8 @@ int ForEachOpenedFile(const std::vector<std::string>& paths, ConsoleDialogs& dia
 {
     int status = ExitStatus::Ok;
     for (const auto& path : paths) {
-        auto header = OpenForCli(path, dialogs, err);
-        status = std::max(status, header ? handleCatching(path, *header, err, handle) : ExitStatus::Unreadable);
+        auto opened = OpenForCli(path, dialogs, err);
+        status = std::max(status, opened ? handleCatching(path, opened->header, err, handle) : ExitStatus::Unreadable);
     }
     return status;
 }

@@ -12,9 +12,9 @@ TEST(DeleteRotationLines, RemovesLinesStartingWithTheKeywordInAnyCase)
                        "0 rotation x\r\n0 // see 0 ROTATION y\r\n0 ROTATIONS\r\n\r\n2 24 b";
     DeleteRotationLines(body);
     EXPECT_EQ(body, "1 16 a.dat\r\n0 // see 0 ROTATION y\r\n0 ROTATIONS\r\n\r\n2 24 b");
-    std::string trailing = "1 a\r\n";
-    DeleteRotationLines(trailing);
-    EXPECT_EQ(trailing, "1 a\r\n");
+    body = "1 a\r\n";
+    DeleteRotationLines(body);
+    EXPECT_EQ(body, "1 a\r\n");
 }
 
 // A question is asked exactly when its answer Yes would change the body.
