@@ -13,6 +13,7 @@
 #include "ConsoleDialogs.h"
 #include "FieldsJson.h"
 #include "FileSave.h"
+#include "HeaderEdits.h"
 #include "ListFolder.h"
 #include "PartFileList.h"
 #include "QmError.h"
@@ -20,32 +21,73 @@
 #include "Summary.h"
 #include "Text.h"
 #include "TrackerCheck.h"
+#include "UnifiedDiff.h"
 
 namespace {
 
 using TrackerFindings = std::vector<TrackerFinding>;
 
-// The official categories, from the category list the window uses.
-bool readCategories(StringList& categories, std::ostream& err)
+// A standard list, from the list file the window uses.
+bool readList(ListKind kind, StringList& entries, std::ostream& err)
 {
     std::error_code error;
     const auto programFolder = std::filesystem::read_symlink("/proc/self/exe", error).parent_path().string();
-    const auto path = ListFilePath(ListFolderOfThisProgram(programFolder), ListKind::Category);
+    const auto path = ListFilePath(ListFolderOfThisProgram(programFolder), kind);
     try {
-        categories = ReadListFile(path);
+        entries = ReadListFile(path);
         return true;
     } catch (const QmError& failure) {
-        err << "quillmark-cli: cannot read the category list " << path << ": " << failure.description() << '\n';
+        err << "quillmark-cli: cannot read the list " << path << ": " << failure.description() << '\n';
         return false;
     }
 }
 
+// A value that must be an entry of its standard list: when it is not, says so naming the entries.
+bool inList(const std::optional<std::string>& value, ListKind kind, const char* option, std::ostream& err,
+            std::initializer_list<std::string_view> alsoAllowed = {})
+{
+    StringList entries;
+    if (!value || std::find(alsoAllowed.begin(), alsoAllowed.end(), *value) != alsoAllowed.end())
+        return true;
+    if (!readList(kind, entries, err))
+        return false;
+    if (std::find(entries.begin(), entries.end(), *value) != entries.end())
+        return true;
+    err << "quillmark-cli: " << option << " " << ShownText(*value) << " is not in the list:";
+    for (const auto& entry : entries)
+        err << (&entry == &entries.front() ? " " : ", ") << ShownText(entry);
+    err << '\n';
+    return false;
+}
+
+// The edits that can be checked before any file is touched.
+bool editsValid(HeaderEdits& edits, std::ostream& err)
+{
+    const bool listed = inList(edits.type, ListKind::PartType, "--type", err) &&
+                        inList(edits.license, ListKind::License, "--license", err, {CurrentLicense}) &&
+                        inList(edits.bfc, ListKind::Bfc, "--bfc", err) &&
+                        inList(edits.category, ListKind::Category, "--category", err, {""});
+    if (!listed)
+        return false;
+    const auto& tag = edits.update;
+    if (tag && !(tag->size() == 7 && (*tag)[4] == '-' &&
+                 std::all_of(tag->begin(), tag->end(), [](char c) { return c == '-' || (c >= '0' && c <= '9'); }))) {
+        err << "quillmark-cli: --update " << ShownText(*tag) << " is not YYYY-RR\n";
+        return false;
+    }
+    if (edits.addHistory && edits.historyUser.empty()) {
+        err << "quillmark-cli: --add-history needs a user: --as USER, or a user name in the preferences\n";
+        return false;
+    }
+    return true;
+}
+
 std::string firstLine(const std::string& text) { return text.substr(0, text.find('\r')); }
 
-std::string checkJson(const HeaderData& header, const SaveFindings& findings, const TrackerFindings* tracker)
+nlohmann::ordered_json checkJson(const HeaderData& header, const SaveFindings& findings, const TrackerFindings* tracker)
 {
     nlohmann::ordered_json json;
-    json["FilePath"] = PathForJson(header.FilePath);
+    json["FilePath"] = TextForJson(header.FilePath);
     json["refusals"] = findings.refusals;
     json["missing_username"] = findings.missingUserName;
     json["fixups"] = {{"certify_invertnext", findings.fixups.certifyInvertNext},
@@ -58,7 +100,7 @@ std::string checkJson(const HeaderData& header, const SaveFindings& findings, co
             json["tracker"].push_back(
                 {{"id", finding.id}, {"level", LevelText(finding.level)}, {"text", finding.text}});
     }
-    return json.dump() + '\n';
+    return json;
 }
 
 std::string findingLines(const std::string& filePath, const SaveFindings& findings, const TrackerFindings* tracker)
@@ -162,6 +204,7 @@ std::string savedLine(const std::string& filePath, const SaveOptions& options, c
         return "saved " + path + (options.backup ? " (backup: " + ShownText(result.backupPath) + ")" : " (no backup)") +
                '\n';
     case SaveOutcome::Unchanged: report.saving = FileReport::Saving::Unchanged; return "unchanged " + path + '\n';
+    case SaveOutcome::NotWritten: report.saving = FileReport::Saving::Saved; return {};
     case SaveOutcome::Declined:
         report.saving = FileReport::Saving::Skipped;
         report.status = ExitStatus::Refused;
@@ -187,7 +230,7 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
              std::ostream& out, std::ostream& err)
 {
     StringList categories;
-    if (options.tracker && !readCategories(categories, err))
+    if (options.tracker && !readList(ListKind::Category, categories, err))
         return ExitStatus::Unreadable;
     return runBatch(arguments, batch, out, err, [&](const std::string& path) {
         return reportOn(path, batch.quiet, {}, [&](OpenedPart& opened, ConsoleDialogs&, FileReport& report) {
@@ -197,7 +240,7 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
             if (options.tracker)
                 tracker = CheckRecordForTracker(header, ComposeHeader(header), categories);
             const auto* trackerFindings = options.tracker ? &tracker : nullptr;
-            report.out = options.json ? checkJson(header, findings, trackerFindings)
+            report.out = options.json ? checkJson(header, findings, trackerFindings).dump() + '\n'
                                       : findingLines(header.FilePath, findings, trackerFindings);
             noteFindings(report, findings);
             bool trackerRefuses = false;
@@ -214,6 +257,14 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
 int RunSave(const std::vector<std::string>& arguments, const SaveOptions& options, const BatchOptions& batch,
             std::ostream& out, std::ostream& err)
 {
+    return RunEdit(arguments, options, {}, batch, out, err);
+}
+
+int RunEdit(const std::vector<std::string>& arguments, const SaveOptions& options, EditOptions edit,
+            const BatchOptions& batch, std::ostream& out, std::ostream& err)
+{
+    if (!editsValid(edit.edits, err))
+        return ExitStatus::Usage;
     const auto answer = [&options](const MessageBox& box) {
         // Another program's changes since the file was read are never overwritten from here.
         if (box.title == ChangedOnDiskTitle)
@@ -228,14 +279,35 @@ int RunSave(const std::vector<std::string>& arguments, const SaveOptions& option
         return reportOn(
             path, batch.quiet, answer, [&](OpenedPart& opened, ConsoleDialogs& dialogs, FileReport& report) {
                 auto& header = opened.header;
+                if (const auto refusal = ApplyHeaderEdits(header, edit.edits, clock.now())) {
+                    report.saving = FileReport::Saving::Skipped;
+                    report.status = ExitStatus::Refused;
+                    report.out = "skipped " + ShownText(path) + ": " + *refusal + '\n';
+                    return;
+                }
+                if (edit.json) {
+                    const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
+                    auto json = checkJson(header, findings, nullptr);
+                    json["old_header"] = TextForJson(header.OldHeader);
+                    json["new_header"] = TextForJson(ComposeHeader(header));
+                    report.out = json.dump() + '\n';
+                    noteFindings(report, findings);
+                    report.status = findings.refusals.empty() ? ExitStatus::Ok : ExitStatus::Refused;
+                    return;
+                }
                 const SaveContext context{dialogs,
                                           clock,
                                           options.backup,
                                           [&header] { return ComposeHeader(header); },
                                           [] {},
                                           batch.limitDescription,
-                                          opened.content->view()};
-                report.out = savedLine(header.FilePath, options, CheckHeaderAndSave(header, context), dialogs, report);
+                                          opened.content->view(),
+                                          edit.dryRun};
+                const auto result = CheckHeaderAndSave(header, context);
+                report.out = savedLine(header.FilePath, options, result, dialogs, report);
+                if (edit.dryRun &&
+                    (result.outcome == SaveOutcome::NotWritten || result.outcome == SaveOutcome::Unchanged))
+                    report.out = UnifiedDiff(opened.content->view(), SavedText(header, ComposeHeader(header)), path);
             });
     });
 }

@@ -6,6 +6,7 @@
 #include "CheckCommands.h"
 #include "CliFiles.h"
 #include "ConsoleDialogs.h"
+#include "EditCommandLine.h"
 #include "PrintCommands.h"
 
 int RunCli(int argc, const char* const* argv, std::ostream& out, std::ostream& err, bool errIsTerminal)
@@ -57,16 +58,28 @@ int RunCli(int argc, const char* const* argv, std::ostream& out, std::ostream& e
     std::vector<std::string> saveFiles;
     bool noBackup = false;
     SaveOptions saveOptions;
+    const auto addSaveOptions = [&](CLI::App* command) {
+        command->add_flag("--no-backup", noBackup, "Do not keep the old file under a dated backup name");
+        command->add_flag("--fix", saveOptions.fix, "Apply all four body and colour fix-ups");
+        command->add_flag("--allow-missing-username", saveOptions.allowMissingUserName,
+                          "Save files whose author line has no user name");
+        addBatchOptions(command);
+        command->add_option("FILE", saveFiles, "Part files or folders to save")->required();
+    };
     auto* save = app.add_subcommand(
         "save", "Re-save each FILE, or each part file below a FOLDER, as the editor's Save does: checked, "
-                "optionally fixed, with a dated backup. Exit status 1 when a file was skipped, 2 when one cannot "
-                "be read, 3 when a save failed.");
-    save->add_flag("--no-backup", noBackup, "Do not keep the old file under a dated backup name");
-    save->add_flag("--fix", saveOptions.fix, "Apply all four body and colour fix-ups");
-    save->add_flag("--allow-missing-username", saveOptions.allowMissingUserName,
-                   "Save files whose author line has no user name");
-    addBatchOptions(save);
-    save->add_option("FILE", saveFiles, "Part files or folders to save")->required();
+                "optionally fixed, with a dated backup; a file that would stay byte for byte as it is is not "
+                "written. Exit status 1 when a file was skipped, 2 when one cannot be read, 3 when a save failed.");
+    addSaveOptions(save);
+
+    EditOptions editOptions;
+    bool noCategory = false;
+    auto* edit = app.add_subcommand(
+        "edit", "Change the headers of each FILE, or each part file below a FOLDER, and save them as save does. "
+                "Values are the header's own texts; those from a standard list are checked before any file is "
+                "read. Exit statuses as for save, and 2 for a value refused up front.");
+    AddEditOptions(*edit, editOptions, noCategory);
+    addSaveOptions(edit);
 
     try {
         app.parse(argc, argv);
@@ -80,9 +93,15 @@ int RunCli(int argc, const char* const* argv, std::ostream& out, std::ostream& e
         return RunFields(fieldsFiles, dialogs, out, err);
     if (*check)
         return RunCheck(checkFiles, checkOptions, batch, out, err);
-    if (*save) {
-        saveOptions.backup = !noBackup;
+    saveOptions.backup = !noBackup;
+    if (*save)
         return RunSave(saveFiles, saveOptions, batch, out, err);
+    if (*edit) {
+        if (noCategory)
+            editOptions.edits.category = "";
+        if (editOptions.edits.addHistory)
+            editOptions.edits.historyUser = HistoryUser(editOptions.edits.historyUser);
+        return RunEdit(saveFiles, saveOptions, editOptions, batch, out, err);
     }
     return RunPrint(printFile, dialogs, out, err);
 }

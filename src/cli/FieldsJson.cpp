@@ -16,13 +16,13 @@ nlohmann::json textList(const StringList& list)
 
 } // namespace
 
-std::string PathForJson(const std::string& path) { return IsValidUtf8(path) ? path : Latin1ToUtf8(path); }
+std::string TextForJson(const std::string& path) { return IsValidUtf8(path) ? path : Latin1ToUtf8(path); }
 
 std::string FieldsJson(const HeaderData& h)
 {
     nlohmann::ordered_json json;
-    json["FilePath"] = PathForJson(h.FilePath);
-    json["FileFolder"] = PathForJson(h.FileFolder);
+    json["FilePath"] = TextForJson(h.FilePath);
+    json["FileFolder"] = TextForJson(h.FileFolder);
     json["PartName"] = Latin1ToUtf8(h.PartName);
     json["PartDescription"] = Latin1ToUtf8(h.PartDescription);
     json["NeedsWork"] = h.NeedsWork;

@@ -99,6 +99,14 @@ std::array<std::string_view, 4> SavedPieces(const HeaderData& header, const std:
     return {TextBeforeHeader(header), newHeader, header.Body, CrLf};
 }
 
+std::string SavedText(const HeaderData& header, const std::string& newHeader)
+{
+    std::string text;
+    for (const auto piece : SavedPieces(header, newHeader))
+        text += piece;
+    return text;
+}
+
 bool SaveWouldWrite(const HeaderData& header, const std::string& newHeader, std::string_view bytes)
 {
     for (const auto piece : SavedPieces(header, newHeader)) {

@@ -25,6 +25,9 @@ inline constexpr const char* ChangedOnDiskTitle = "File Changed on Disk";
 // and one CR LF.
 std::array<std::string_view, 4> SavedPieces(const HeaderData& header, const std::string& newHeader);
 
+// The text a save writes, in one piece.
+std::string SavedText(const HeaderData& header, const std::string& newHeader);
+
 // True when a save would write exactly bytes.
 bool SaveWouldWrite(const HeaderData& header, const std::string& newHeader, std::string_view bytes);
 

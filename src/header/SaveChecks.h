@@ -39,6 +39,7 @@ enum class SaveOutcome {
     Declined,           // the user did not want to save without a user name
     Failed,             // writing failed, and was reported
     Unchanged,          // the file holds the text already, so nothing was written
+    NotWritten,         // checked and fixed up, and not written: a dry run
 };
 
 // What the save needs from whoever holds the header: the composed text to write, and a way to
@@ -52,6 +53,7 @@ struct SaveContext {
     bool limitDescription = true; // off: the description may be of any length
     // The file's bytes as read, when a save that would write them again is to write nothing.
     std::optional<std::string_view> heldBytes = std::nullopt;
+    bool dryRun = false; // everything but the writing
 };
 
 struct SaveResult {

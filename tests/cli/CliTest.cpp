@@ -16,6 +16,7 @@
 #include "CliApp.h"
 #include "Corpus.h"
 #include "TempDir.h"
+#include "UnifiedDiff.h"
 
 namespace fs = std::filesystem;
 
@@ -327,6 +328,69 @@ TEST(CliBatch, SummaryCountsEachFinding)
               "4 files, 2 refused, 2 without user name, 1 unreadable\n"
               "  refused: Length of the part description is limited to 64 character!: 2\n"
               "  fix-up offered: 0 WRITE lines in the body: 2\n");
+}
+
+// Hunks as diff -u makes them: three lines of context, near changes in one hunk, an insertion at
+// the start, a last line without a line end.
+TEST(UnifiedDiff, AsDiffMakesIt)
+{
+    std::string before, after = "new\n";
+    for (int line = 1; line <= 30; ++line) {
+        const auto text = "line " + std::to_string(line) + (line % 10 == 0 ? "\r\n" : "\n");
+        before += text;
+        after += line == 5 || line == 11 || line == 25 ? "" : line == 30 ? "line 30" : text;
+    }
+    TempDir dir;
+    const auto command = "diff -u '" + dir.write("a", before) + "' '" + dir.write("b", after) + "' | tail -n +3 >'" +
+                         dir.file("diff") + "'";
+    ASSERT_EQ(std::system(command.c_str()), 0);
+    EXPECT_EQ(UnifiedDiff(before, after, "p.dat"), "--- a/p.dat\n+++ b/p.dat\n" + ReadBytes(dir.file("diff")));
+    EXPECT_EQ(UnifiedDiff(before, before, "p.dat"), "");
+    EXPECT_EQ(UnifiedDiff("", "x\n", "p.dat"), "--- a/p.dat\n+++ b/p.dat\n@@ -0,0 +1 @@\n+x\n");
+}
+
+// Real files: one refused (no user name), two edited. The dry run's diff, applied by patch to a
+// copy, gives what the edit writes; an edit that changes nothing more writes nothing.
+TEST(CliEdit, TheDryRunsDiffIsWhatTheEditWritesAndUnknownListValuesAreRefusedFirst)
+{
+    TempDir dir;
+    const std::vector<std::string> names = {"104.dat", "391.dat", "s/2895s01.dat"};
+    for (const auto* copy : {"lib/s", "copy/lib/s"})
+        fs::create_directories(dir.path() / copy);
+    std::error_code missing;
+    for (const auto& name : names)
+        for (const auto* copy : {"lib/", "copy/lib/"})
+            if (!fs::copy_file(QUILLMARK_CORPUS_DIR "/parts/" + name, dir.file(copy + name), missing))
+                GTEST_SKIP() << "no corpus folder beside the project";
+            else
+                fs::permissions(dir.file(copy + name), fs::perms::owner_write, fs::perm_options::add);
+    std::vector<std::string> edit = {"edit",   "--license", "current", "--name-from-path", "--add-history",
+                                     "Edited", "--as",      "jtester", "--no-backup",      "lib"};
+    const auto inDir = [&dir] { fs::current_path(dir.path()); };
+    edit.push_back("--dry-run");
+    const auto dry = RunCliInChild(edit, inDir);
+    edit.pop_back();
+    EXPECT_EQ(dry.status, 1);
+    EXPECT_EQ(dry.out.find("--- a/lib/104.dat\n+++ b/lib/104.dat\n@@ -2,10 +2,12 @@\n 0 Name: 104.dat\r\n"), 0u);
+    EXPECT_EQ(ReadBytes(dir.file("lib/104.dat")), ReadBytes(dir.file("copy/lib/104.dat")));
+    TempDir::writeTo(dir.file("edits.diff"), dry.out);
+    ASSERT_EQ(std::system(("cd '" + dir.file("copy") + "' && patch -s -p1 <../edits.diff").c_str()), 0);
+    EXPECT_EQ(RunCliInChild(edit, inDir).status, 1);
+    for (const auto& name : names)
+        EXPECT_TRUE(ReadBytes(dir.file("lib/" + name)) == ReadBytes(dir.file("copy/lib/" + name))) << name;
+    EXPECT_NE(ReadBytes(dir.file("lib/104.dat")).find("0 !HISTORY 2"), std::string::npos);
+    const auto again = RunCliInChild({"edit", "--license", "current", "--name-from-path", "--no-backup", "lib"}, inDir);
+    EXPECT_EQ(again.out, "unchanged lib/104.dat\nskipped lib/391.dat: no user name set\nunchanged lib/s/2895s01.dat\n");
+    const auto unknown = RunCliWith({"edit", "--type", "Brik", "--no-backup", dir.file("lib")});
+    EXPECT_EQ(unknown.status, 2);
+    EXPECT_EQ(unknown.out, "");
+    EXPECT_EQ(unknown.err.find("quillmark-cli: --type Brik is not in the list: Part, Subpart, "), 0u);
+    const auto before = ReadBytes(dir.file("lib/104.dat"));
+    const auto json =
+        nlohmann::json::parse(RunCliWith({"edit", "--json", "--description", "X", dir.file("lib/104.dat")}).out);
+    EXPECT_EQ(json["new_header"].get<std::string>().rfind("0 X\r\n0 Name: 104.dat\r\n", 0), 0u);
+    EXPECT_EQ(json["old_header"].get<std::string>().rfind("0 Antenna  6H\r\n", 0), 0u);
+    EXPECT_EQ(ReadBytes(dir.file("lib/104.dat")), before);
 }
 
 // The subparts of the corpus: real files in hundreds, checked with the Parts Tracker's rules too.
