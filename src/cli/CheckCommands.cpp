@@ -11,13 +11,11 @@
 #include "Clock.h"
 #include "Composer.h"
 #include "ConsoleDialogs.h"
+#include "EditCommandLine.h"
 #include "FieldsJson.h"
 #include "FileSave.h"
 #include "HeaderEdits.h"
-#include "ListFolder.h"
 #include "PartFileList.h"
-#include "QmError.h"
-#include "StandardLists.h"
 #include "Summary.h"
 #include "Text.h"
 #include "TrackerCheck.h"
@@ -26,61 +24,6 @@
 namespace {
 
 using TrackerFindings = std::vector<TrackerFinding>;
-
-// A standard list, from the list file the window uses.
-bool readList(ListKind kind, StringList& entries, std::ostream& err)
-{
-    std::error_code error;
-    const auto programFolder = std::filesystem::read_symlink("/proc/self/exe", error).parent_path().string();
-    const auto path = ListFilePath(ListFolderOfThisProgram(programFolder), kind);
-    try {
-        entries = ReadListFile(path);
-        return true;
-    } catch (const QmError& failure) {
-        err << "quillmark-cli: cannot read the list " << path << ": " << failure.description() << '\n';
-        return false;
-    }
-}
-
-// A value that must be an entry of its standard list: when it is not, says so naming the entries.
-bool inList(const std::optional<std::string>& value, ListKind kind, const char* option, std::ostream& err,
-            std::initializer_list<std::string_view> alsoAllowed = {})
-{
-    StringList entries;
-    if (!value || std::find(alsoAllowed.begin(), alsoAllowed.end(), *value) != alsoAllowed.end())
-        return true;
-    if (!readList(kind, entries, err))
-        return false;
-    if (std::find(entries.begin(), entries.end(), *value) != entries.end())
-        return true;
-    err << "quillmark-cli: " << option << " " << ShownText(*value) << " is not in the list:";
-    for (const auto& entry : entries)
-        err << (&entry == &entries.front() ? " " : ", ") << ShownText(entry);
-    err << '\n';
-    return false;
-}
-
-// The edits that can be checked before any file is touched.
-bool editsValid(HeaderEdits& edits, std::ostream& err)
-{
-    const bool listed = inList(edits.type, ListKind::PartType, "--type", err) &&
-                        inList(edits.license, ListKind::License, "--license", err, {CurrentLicense}) &&
-                        inList(edits.bfc, ListKind::Bfc, "--bfc", err) &&
-                        inList(edits.category, ListKind::Category, "--category", err, {""});
-    if (!listed)
-        return false;
-    const auto& tag = edits.update;
-    if (tag && !(tag->size() == 7 && (*tag)[4] == '-' &&
-                 std::all_of(tag->begin(), tag->end(), [](char c) { return c == '-' || (c >= '0' && c <= '9'); }))) {
-        err << "quillmark-cli: --update " << ShownText(*tag) << " is not YYYY-RR\n";
-        return false;
-    }
-    if (edits.addHistory && edits.historyUser.empty()) {
-        err << "quillmark-cli: --add-history needs a user: --as USER, or a user name in the preferences\n";
-        return false;
-    }
-    return true;
-}
 
 std::string firstLine(const std::string& text) { return text.substr(0, text.find('\r')); }
 
@@ -204,7 +147,7 @@ std::string savedLine(const std::string& filePath, const SaveOptions& options, c
         return "saved " + path + (options.backup ? " (backup: " + ShownText(result.backupPath) + ")" : " (no backup)") +
                '\n';
     case SaveOutcome::Unchanged: report.saving = FileReport::Saving::Unchanged; return "unchanged " + path + '\n';
-    case SaveOutcome::NotWritten: report.saving = FileReport::Saving::Saved; return {};
+    case SaveOutcome::NotWritten: report.saving = FileReport::Saving::Previewed; return {};
     case SaveOutcome::Declined:
         report.saving = FileReport::Saving::Skipped;
         report.status = ExitStatus::Refused;
@@ -230,7 +173,7 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
              std::ostream& out, std::ostream& err)
 {
     StringList categories;
-    if (options.tracker && !readList(ListKind::Category, categories, err))
+    if (options.tracker && !ReadStandardList(ListKind::Category, categories, err))
         return ExitStatus::Unreadable;
     return runBatch(arguments, batch, out, err, [&](const std::string& path) {
         return reportOn(path, batch.quiet, {}, [&](OpenedPart& opened, ConsoleDialogs&, FileReport& report) {
@@ -263,7 +206,7 @@ int RunSave(const std::vector<std::string>& arguments, const SaveOptions& option
 int RunEdit(const std::vector<std::string>& arguments, const SaveOptions& options, EditOptions edit,
             const BatchOptions& batch, std::ostream& out, std::ostream& err)
 {
-    if (!editsValid(edit.edits, err))
+    if (!EditsValid(edit.edits, err))
         return ExitStatus::Usage;
     const auto answer = [&options](const MessageBox& box) {
         // Another program's changes since the file was read are never overwritten from here.

@@ -1,11 +1,14 @@
 #include "CliFiles.h"
 
 #include <algorithm>
+#include <filesystem>
 
 #include "ConsoleDialogs.h"
+#include "ListFolder.h"
 #include "OpenDocument.h"
 #include "ParseProgress.h"
 #include "QmError.h"
+#include "StandardLists.h"
 
 void ReportUnreadable(const std::string& path, const std::exception& failure, std::ostream& err)
 {
@@ -52,4 +55,18 @@ int ForEachOpenedFile(const std::vector<std::string>& paths, ConsoleDialogs& dia
         status = std::max(status, opened ? handleCatching(path, opened->header, err, handle) : ExitStatus::Unreadable);
     }
     return status;
+}
+
+bool ReadStandardList(ListKind kind, StringList& entries, std::ostream& err)
+{
+    std::error_code error;
+    const auto programFolder = std::filesystem::read_symlink("/proc/self/exe", error).parent_path().string();
+    const auto path = ListFilePath(ListFolderOfThisProgram(programFolder), kind);
+    try {
+        entries = ReadListFile(path);
+        return true;
+    } catch (const QmError& failure) {
+        err << "quillmark-cli: cannot read the list " << path << ": " << failure.description() << '\n';
+        return false;
+    }
 }

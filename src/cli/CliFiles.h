@@ -8,6 +8,7 @@
 #include <vector>
 
 #include "HeaderData.h"
+#include "ListKinds.h"
 #include "PartFile.h"
 
 class ConsoleDialogs;
@@ -33,6 +34,10 @@ struct OpenedPart {
 // Opens path as the Open command does. When the file cannot be read, says so in one line on
 // err and returns nullopt.
 std::optional<OpenedPart> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err);
+
+// A standard list, from the list file the window uses. When it cannot be read, says so on err
+// and returns false.
+bool ReadStandardList(ListKind kind, StringList& entries, std::ostream& err);
 
 // Runs handle on every file that opens and returns the worst status: Unreadable for a file that
 // did not open, otherwise the largest that handle returned.

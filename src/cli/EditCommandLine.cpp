@@ -1,5 +1,9 @@
 #include "EditCommandLine.h"
 
+#include <algorithm>
+
+#include "CliFiles.h"
+#include "ConsoleDialogs.h"
 #include "IniSettingsStore.h"
 #include "Preferences.h"
 
@@ -15,6 +19,24 @@ void addKeywordList(CLI::App& command, const std::string& name, StringList& fiel
 {
     command.add_option_function<std::string>(
         name, [&field](const std::string& value) { field = SplitKeywords(value); }, help);
+}
+
+// A value that must be an entry of its standard list: when it is not, says so naming the entries.
+bool inList(const std::optional<std::string>& value, ListKind kind, const char* option, std::ostream& err,
+            std::initializer_list<std::string_view> alsoAllowed = {})
+{
+    StringList entries;
+    if (!value || std::find(alsoAllowed.begin(), alsoAllowed.end(), *value) != alsoAllowed.end())
+        return true;
+    if (!ReadStandardList(kind, entries, err))
+        return false;
+    if (std::find(entries.begin(), entries.end(), *value) != entries.end())
+        return true;
+    err << "quillmark-cli: " << option << " " << ShownText(*value) << " is not in the list:";
+    for (const auto& entry : entries)
+        err << (&entry == &entries.front() ? " " : ", ") << ShownText(entry);
+    err << '\n';
+    return false;
 }
 
 } // namespace
@@ -53,4 +75,25 @@ std::string HistoryUser(const std::string& given)
     Preferences preferences;
     LadeDefaults(preferences, IniSettingsStore());
     return preferences.DefaultUserName;
+}
+
+bool EditsValid(const HeaderEdits& edits, std::ostream& err)
+{
+    const bool listed = inList(edits.type, ListKind::PartType, "--type", err) &&
+                        inList(edits.license, ListKind::License, "--license", err, {CurrentLicense}) &&
+                        inList(edits.bfc, ListKind::Bfc, "--bfc", err) &&
+                        inList(edits.category, ListKind::Category, "--category", err, {""});
+    if (!listed)
+        return false;
+    const auto& tag = edits.update;
+    if (tag && !(tag->size() == 7 && (*tag)[4] == '-' &&
+                 std::all_of(tag->begin(), tag->end(), [](char c) { return c == '-' || (c >= '0' && c <= '9'); }))) {
+        err << "quillmark-cli: --update " << ShownText(*tag) << " is not YYYY-RR\n";
+        return false;
+    }
+    if (edits.addHistory && edits.historyUser.empty()) {
+        err << "quillmark-cli: --add-history needs a user: --as USER, or a user name in the preferences\n";
+        return false;
+    }
+    return true;
 }

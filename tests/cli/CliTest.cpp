@@ -371,6 +371,7 @@ TEST(CliEdit, TheDryRunsDiffIsWhatTheEditWritesAndUnknownListValuesAreRefusedFir
     const auto dry = RunCliInChild(edit, inDir);
     edit.pop_back();
     EXPECT_EQ(dry.status, 1);
+    EXPECT_NE(dry.err.find("; 0 saved, 2 would be saved, 0 unchanged, 1 skipped, 0 failed\n"), std::string::npos);
     EXPECT_EQ(dry.out.find("--- a/lib/104.dat\n+++ b/lib/104.dat\n@@ -2,10 +2,12 @@\n 0 Name: 104.dat\r\n"), 0u);
     EXPECT_EQ(ReadBytes(dir.file("lib/104.dat")), ReadBytes(dir.file("copy/lib/104.dat")));
     TempDir::writeTo(dir.file("edits.diff"), dry.out);
