@@ -20,8 +20,59 @@ Lines linesOf(std::string_view text)
 
 enum class Op { Keep, Remove, Add };
 
-// The shortest edit script between a and b (Myers), kept lines at both ends taken off first. A
-// trace of every step lets the walk back find the path; past maxSteps the rest is replaced whole.
+// Myers' search for the shortest edit script: row d holds, for each diagonal k = x - y from -d to
+// d, the furthest x that d added or removed lines reach.
+class Trace {
+public:
+    long at(long d, long k) const { return rows_[static_cast<std::size_t>(d)][static_cast<std::size_t>(k + d)]; }
+    long steps() const { return static_cast<long>(rows_.size()) - 1; }
+    // Step d on diagonal k came down from k + 1 (a line added) rather than across from k - 1 (removed).
+    bool cameDown(long d, long k) const { return k == -d || (k != d && at(d - 1, k - 1) < at(d - 1, k + 1)); }
+
+    // False when the ends lie more than maxSteps apart.
+    template <typename Same>
+    bool search(long n, long m, long maxSteps, Same same)
+    {
+        for (long d = 0; d <= std::min(n + m, maxSteps); ++d) {
+            rows_.emplace_back(static_cast<std::size_t>(2 * d + 1));
+            bool reached = false;
+            for (long k = -d; k <= d; k += 2) {
+                long x = d == 0 ? 0 : cameDown(d, k) ? at(d - 1, k + 1) : at(d - 1, k - 1) + 1;
+                while (x < n && x - k < m && same(x, x - k))
+                    ++x;
+                rows_.back()[static_cast<std::size_t>(k + d)] = x;
+                reached = reached || (x >= n && x - k >= m);
+            }
+            if (reached)
+                return true;
+        }
+        return false;
+    }
+
+    // The path from the end back to the start, as operations in their forward order.
+    std::vector<Op> path(long x, long y) const
+    {
+        std::vector<Op> backwards;
+        for (long d = steps(); d > 0; --d) {
+            const long k = x - y;
+            const bool down = cameDown(d, k);
+            const long startX = down ? at(d - 1, k + 1) : at(d - 1, k - 1) + 1;
+            for (; x > startX; --x, --y)
+                backwards.push_back(Op::Keep);
+            backwards.push_back(down ? Op::Add : Op::Remove);
+            x -= down ? 0 : 1;
+            y -= down ? 1 : 0;
+        }
+        backwards.insert(backwards.end(), static_cast<std::size_t>(x), Op::Keep);
+        return {backwards.rbegin(), backwards.rend()};
+    }
+
+private:
+    std::vector<std::vector<long>> rows_;
+};
+
+// The shortest edit script between a and b, the kept lines at both ends taken off first. Lines
+// too far apart for a short search are all replaced.
 std::vector<Op> editScript(const Lines& a, const Lines& b)
 {
     std::size_t head = 0, tail = 0;
@@ -33,49 +84,14 @@ std::vector<Op> editScript(const Lines& a, const Lines& b)
     const auto same = [&](long x, long y) {
         return a[head + static_cast<std::size_t>(x)] == b[head + static_cast<std::size_t>(y)];
     };
-    constexpr long maxSteps = 1000;
-    std::vector<std::vector<long>> trace; // trace[d][k + d]: the furthest x on diagonal k after d steps
-    std::vector<long> middle;
-    for (long d = 0; d <= std::min(n + m, maxSteps) && middle.empty(); ++d) {
-        std::vector<long> v(static_cast<std::size_t>(2 * d + 1));
-        const auto at = [&](const std::vector<long>& row, long k, long width) {
-            return row[static_cast<std::size_t>(k + width)];
-        };
-        for (long k = -d; k <= d; k += 2) {
-            long x = d == 0 ? 0
-                     : (k == -d || (k != d && at(trace.back(), k - 1, d - 1) < at(trace.back(), k + 1, d - 1)))
-                         ? at(trace.back(), k + 1, d - 1)
-                         : at(trace.back(), k - 1, d - 1) + 1;
-            while (x < n && x - k < m && same(x, x - k))
-                ++x;
-            v[static_cast<std::size_t>(k + d)] = x;
-            if (x >= n && x - k >= m)
-                middle = {k};
-        }
-        trace.push_back(std::move(v));
-    }
     std::vector<Op> script(head, Op::Keep);
-    if (middle.empty()) { // too far apart: all of one side out, all of the other in
+    Trace trace;
+    if (trace.search(n, m, 1000, same)) {
+        const auto middle = trace.path(n, m);
+        script.insert(script.end(), middle.begin(), middle.end());
+    } else {
         script.insert(script.end(), static_cast<std::size_t>(n), Op::Remove);
         script.insert(script.end(), static_cast<std::size_t>(m), Op::Add);
-    } else {
-        std::vector<Op> backwards;
-        long x = n, y = m;
-        for (auto d = static_cast<long>(trace.size()) - 1; d > 0; --d) {
-            const auto& previous = trace[static_cast<std::size_t>(d - 1)];
-            const long k = x - y;
-            const auto prev = [&](long kk) { return previous[static_cast<std::size_t>(kk + d - 1)]; };
-            const bool down = k == -d || (k != d && prev(k - 1) < prev(k + 1));
-            const long startX = down ? prev(k + 1) : prev(k - 1) + 1;
-            const long startY = startX - k;
-            for (; x > startX && y > startY; --x, --y)
-                backwards.push_back(Op::Keep);
-            backwards.push_back(down ? Op::Add : Op::Remove);
-            x = down ? x : x - 1;
-            y = down ? y - 1 : y;
-        }
-        backwards.insert(backwards.end(), static_cast<std::size_t>(x), Op::Keep);
-        script.insert(script.end(), backwards.rbegin(), backwards.rend());
     }
     script.insert(script.end(), tail, Op::Keep);
     return script;
