@@ -7,6 +7,7 @@
 #include <cstdio>
 #include <mutex>
 #include <optional>
+#include <system_error>
 #include <thread>
 #include <vector>
 
@@ -44,6 +45,15 @@ private:
     std::chrono::steady_clock::time_point lastDrawn_{};
 };
 
+FileReport takeWhenDone(std::optional<FileReport>& slot, std::mutex& mutex, std::condition_variable& finished)
+{
+    std::unique_lock lock(mutex);
+    finished.wait(lock, [&slot] { return slot.has_value(); });
+    auto report = std::move(*slot);
+    slot.reset();
+    return report;
+}
+
 } // namespace
 
 void RunInOrder(std::size_t count, unsigned threads, const std::function<FileReport(std::size_t)>& work,
@@ -62,15 +72,16 @@ void RunInOrder(std::size_t count, unsigned threads, const std::function<FileRep
         }
     };
     std::vector<std::jthread> pool;
-    for (std::size_t i = 0; i < std::min<std::size_t>(threads, count); ++i)
-        pool.emplace_back(worker);
+    try {
+        for (std::size_t i = 0; i < std::min<std::size_t>(threads, count); ++i)
+            pool.emplace_back(worker);
+    } catch (const std::system_error&) {
+        // A process or thread limit: the run goes on with the threads it has.
+    }
     ProgressLine line(progress, count);
     for (std::size_t index = 0; index < count; ++index) {
-        std::unique_lock lock(mutex);
-        finished.wait(lock, [&] { return reports[index].has_value(); });
-        auto report = std::move(*reports[index]);
-        reports[index].reset();
-        lock.unlock();
+        // Without a single thread of its own, the calling thread does the work, one file at a time.
+        auto report = pool.empty() ? work(next++) : takeWhenDone(reports[index], mutex, finished);
         emit(report);
         line.show(index + 1);
     }

@@ -13,5 +13,8 @@
 void RunInOrder(std::size_t count, unsigned threads, const std::function<FileReport(std::size_t)>& work,
                 const std::function<void(FileReport&)>& emit, std::ostream* progress);
 
+// The most threads a run may be asked for.
+inline constexpr unsigned MaxThreads = 1024;
+
 // The threads to use: the number asked for, or one per core when it is 0.
 unsigned ThreadsFor(unsigned asked);

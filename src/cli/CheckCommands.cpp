@@ -12,42 +12,26 @@
 #include "ColourSource.h"
 #include "Composer.h"
 #include "ConsoleDialogs.h"
+#include "EditCommandLine.h"
+#include "FieldsJson.h"
 #include "FileSave.h"
+#include "HeaderEdits.h"
 #include "ListFolder.h"
 #include "PartFileList.h"
 #include "QmError.h"
-#include "StandardLists.h"
 #include "Summary.h"
 #include "Text.h"
 #include "TrackerCheck.h"
+#include "UnifiedDiff.h"
 
 namespace {
 
 using TrackerFindings = std::vector<TrackerFinding>;
 
-std::string programFolder()
-{
-    std::error_code error;
-    return std::filesystem::read_symlink("/proc/self/exe", error).parent_path().string();
-}
-
-// The official categories, from the category list the window uses.
-bool readCategories(StringList& categories, std::ostream& err)
-{
-    const auto path = ListFilePath(ListFolderOfThisProgram(programFolder()), ListKind::Category);
-    try {
-        categories = ReadListFile(path);
-        return true;
-    } catch (const QmError& failure) {
-        err << "quillmark-cli: cannot read the category list " << path << ": " << failure.description() << '\n';
-        return false;
-    }
-}
-
 // Where the Tracker's colour codes come from; none when the built-in list cannot be read.
 std::unique_ptr<ColourSource> colourSource(const std::string& ldconfig, std::ostream& err)
 {
-    const auto path = DataFileOfThisProgram(programFolder(), BuiltInColoursFile);
+    const auto path = DataFileOfThisProgram(ProgramFolder(), BuiltInColoursFile);
     try {
         return std::make_unique<ColourSource>(ReadBuiltInColours(path), ldconfig, [&err](const std::string& text) {
             err << "quillmark-cli: " << text << '\n';
@@ -66,10 +50,10 @@ std::string linePrefix(const TrackerFinding& finding)
 
 std::string firstLine(const std::string& text) { return text.substr(0, text.find('\r')); }
 
-std::string checkJson(const HeaderData& header, const SaveFindings& findings, const TrackerFindings* tracker)
+nlohmann::ordered_json checkJson(const HeaderData& header, const SaveFindings& findings, const TrackerFindings* tracker)
 {
     nlohmann::ordered_json json;
-    json["FilePath"] = Latin1ToUtf8(header.FilePath);
+    json["FilePath"] = TextForJson(header.FilePath);
     json["refusals"] = findings.refusals;
     json["missing_username"] = findings.missingUserName;
     json["fixups"] = {{"certify_invertnext", findings.fixups.certifyInvertNext},
@@ -85,11 +69,12 @@ std::string checkJson(const HeaderData& header, const SaveFindings& findings, co
                 entry["line"] = finding.line;
         }
     }
-    return json.dump() + '\n';
+    return json;
 }
 
-std::string findingLines(const std::string& path, const SaveFindings& findings, const TrackerFindings* tracker)
+std::string findingLines(const std::string& filePath, const SaveFindings& findings, const TrackerFindings* tracker)
 {
+    const auto path = ShownText(filePath);
     std::string lines;
     for (const auto& refusal : findings.refusals)
         lines += path + ": refused: " + firstLine(refusal) + '\n';
@@ -114,19 +99,20 @@ void noteFindings(FileReport& report, const SaveFindings& findings)
 }
 
 // Opens the file at path and lets handle fill the report; an unreadable file is reported as such.
-FileReport reportOn(const std::string& path, ConsoleDialogs::Answerer answerer,
-                    const std::function<void(HeaderData&, ConsoleDialogs&, FileReport&)>& handle)
+// Quiet, the messages of the file's dialogs are not shown.
+FileReport reportOn(const std::string& path, bool quiet, ConsoleDialogs::Answerer answerer, KeepBytes keep,
+                    const std::function<void(OpenedPart&, ConsoleDialogs&, FileReport&)>& handle)
 {
     FileReport report;
-    std::ostringstream err;
-    ConsoleDialogs dialogs(err, std::move(answerer));
-    auto header = OpenForCli(path, dialogs, err);
-    if (!header) {
+    std::ostringstream err, discarded;
+    ConsoleDialogs dialogs(quiet ? discarded : err, std::move(answerer));
+    auto opened = OpenForCli(path, dialogs, err, keep);
+    if (!opened) {
         report.unreadable = true;
         report.status = ExitStatus::Unreadable;
     } else {
         try {
-            handle(*header, dialogs, report);
+            handle(*opened, dialogs, report);
         } catch (const std::exception& failure) {
             ReportUnreadable(path, failure, err);
             report = FileReport{};
@@ -141,9 +127,13 @@ FileReport reportOn(const std::string& path, ConsoleDialogs::Answerer answerer,
 int runBatch(const std::vector<std::string>& arguments, const BatchOptions& batch, std::ostream& out, std::ostream& err,
              const std::function<FileReport(const std::string&)>& work)
 {
-    const auto files = ExpandPartFiles(arguments);
+    const auto found = ExpandPartFiles(arguments);
+    const auto& files = found.files;
+    for (const auto& problem : found.problems)
+        err << "quillmark-cli: cannot read folder " << ShownText(problem.path) << ": " << problem.reason << '\n';
     Summary summary;
-    int status = ExitStatus::Ok;
+    summary.addWalks(found);
+    int status = found.problems.empty() ? ExitStatus::Ok : ExitStatus::Unreadable;
     RunInOrder(
         files.size(), ThreadsFor(batch.threads), [&](std::size_t index) { return work(files[index]); },
         [&](FileReport& report) {
@@ -174,13 +164,17 @@ private:
     std::map<std::string, std::mutex> locks_;
 };
 
-std::string savedLine(const std::string& path, const SaveOptions& options, const SaveResult& result,
+std::string savedLine(const std::string& filePath, const SaveOptions& options, const SaveResult& result,
                       ConsoleDialogs& dialogs, FileReport& report)
 {
+    const auto path = ShownText(filePath);
     switch (result.outcome) {
     case SaveOutcome::Saved:
         report.saving = FileReport::Saving::Saved;
-        return "saved " + path + (options.backup ? " (backup: " + result.backupPath + ")" : " (no backup)") + '\n';
+        return "saved " + path + (options.backup ? " (backup: " + ShownText(result.backupPath) + ")" : " (no backup)") +
+               '\n';
+    case SaveOutcome::Unchanged: report.saving = FileReport::Saving::Unchanged; return "unchanged " + path + '\n';
+    case SaveOutcome::NotWritten: report.saving = FileReport::Saving::Previewed; return {};
     case SaveOutcome::Declined:
         report.saving = FileReport::Saving::Skipped;
         report.status = ExitStatus::Refused;
@@ -189,14 +183,15 @@ std::string savedLine(const std::string& path, const SaveOptions& options, const
         report.saving = FileReport::Saving::Failed;
         report.status = ExitStatus::SaveFailed;
         return "failed " + path + ": " +
-               (dialogs.lastTitle() == ChangedOnDiskTitle ? "changed while saving" : dialogs.lastMessage()) + '\n';
+               (dialogs.lastTitle() == ChangedOnDiskTitle ? "changed while saving" : OneLine(dialogs.lastMessage())) +
+               '\n';
     case SaveOutcome::Refused:
     case SaveOutcome::DescriptionTooLong: break;
     }
     report.saving = FileReport::Saving::Skipped;
     report.status = ExitStatus::Refused;
     report.refusals.push_back(firstLine(dialogs.lastMessage()));
-    return "skipped " + path + ": " + firstLine(dialogs.lastMessage()) + '\n';
+    return "skipped " + path + ": " + OneLine(firstLine(dialogs.lastMessage())) + '\n';
 }
 
 } // namespace
@@ -206,10 +201,13 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
 {
     StringList categories;
     std::unique_ptr<ColourSource> colours;
-    if (options.tracker && (!readCategories(categories, err) || !(colours = colourSource(options.ldconfig, err))))
+    if (options.tracker && (!ReadStandardList(ListKind::Category, categories, err) ||
+                            !(colours = colourSource(options.ldconfig, err))))
         return ExitStatus::Unreadable;
     return runBatch(arguments, batch, out, err, [&](const std::string& path) {
-        return reportOn(path, {}, [&](HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
+        return reportOn(path, batch.quiet, {}, KeepBytes::No,
+                        [&](OpenedPart& opened, ConsoleDialogs& dialogs, FileReport& report) {
+            const auto& header = opened.header;
             const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
             TrackerFindings tracker; // empty unless asked for
             if (options.tracker) {
@@ -218,7 +216,7 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
                 tracker = CheckRecordForTracker(header, ComposeHeader(header), categories, codes);
             }
             const auto* trackerFindings = options.tracker ? &tracker : nullptr;
-            report.out = options.json ? checkJson(header, findings, trackerFindings)
+            report.out = options.json ? checkJson(header, findings, trackerFindings).dump() + '\n'
                                       : findingLines(header.FilePath, findings, trackerFindings);
             noteFindings(report, findings);
             bool trackerRefuses = false;
@@ -235,6 +233,14 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
 int RunSave(const std::vector<std::string>& arguments, const SaveOptions& options, const BatchOptions& batch,
             std::ostream& out, std::ostream& err)
 {
+    return RunEdit(arguments, options, {}, batch, out, err);
+}
+
+int RunEdit(const std::vector<std::string>& arguments, const SaveOptions& options, EditOptions edit,
+            const BatchOptions& batch, std::ostream& out, std::ostream& err)
+{
+    if (!EditsValid(edit.edits, err))
+        return ExitStatus::Usage;
     const auto answer = [&options](const MessageBox& box) {
         // Another program's changes since the file was read are never overwritten from here.
         if (box.title == ChangedOnDiskTitle)
@@ -246,11 +252,39 @@ int RunSave(const std::vector<std::string>& arguments, const SaveOptions& option
     FileLocks locks;
     return runBatch(arguments, batch, out, err, [&](const std::string& path) {
         const std::lock_guard lock(locks.of(path));
-        return reportOn(path, answer, [&](HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
-            const SaveContext context{dialogs,        clock,
-                                      options.backup, [&header] { return ComposeHeader(header); },
-                                      [] {},          batch.limitDescription};
-            report.out = savedLine(header.FilePath, options, CheckHeaderAndSave(header, context), dialogs, report);
-        });
+        return reportOn(
+            path, batch.quiet, answer, KeepBytes::Yes,
+            [&](OpenedPart& opened, ConsoleDialogs& dialogs, FileReport& report) {
+                auto& header = opened.header;
+                if (const auto refusal = ApplyHeaderEdits(header, edit.edits, clock.now())) {
+                    report.saving = FileReport::Saving::Skipped;
+                    report.status = ExitStatus::Refused;
+                    report.out = "skipped " + ShownText(path) + ": " + *refusal + '\n';
+                    return;
+                }
+                if (edit.json) {
+                    const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
+                    auto json = checkJson(header, findings, nullptr);
+                    json["old_header"] = TextForJson(header.OldHeader);
+                    json["new_header"] = TextForJson(ComposeHeader(header));
+                    report.out = json.dump() + '\n';
+                    noteFindings(report, findings);
+                    report.status = findings.refusals.empty() ? ExitStatus::Ok : ExitStatus::Refused;
+                    return;
+                }
+                const SaveContext context{dialogs,
+                                          clock,
+                                          options.backup,
+                                          [&header] { return ComposeHeader(header); },
+                                          [] {},
+                                          batch.limitDescription,
+                                          opened.content->view(),
+                                          edit.dryRun};
+                const auto result = CheckHeaderAndSave(header, context);
+                report.out = savedLine(header.FilePath, options, result, dialogs, report);
+                if (edit.dryRun &&
+                    (result.outcome == SaveOutcome::NotWritten || result.outcome == SaveOutcome::Unchanged))
+                    report.out = UnifiedDiff(opened.content->view(), SavedText(header, ComposeHeader(header)), path);
+            });
     });
 }

@@ -4,6 +4,8 @@
 #include <string>
 #include <vector>
 
+#include "HeaderEdits.h"
+
 // How check and save work through many files.
 struct BatchOptions {
     unsigned threads = 0;         // 0: one per core
@@ -31,3 +33,14 @@ struct SaveOptions {
 // save: re-saves every file as "&Save" does, answering its questions by the options.
 int RunSave(const std::vector<std::string>& arguments, const SaveOptions& options, const BatchOptions& batch,
             std::ostream& out, std::ostream& err);
+
+struct EditOptions {
+    HeaderEdits edits;
+    bool dryRun = false; // a diff of what the save would write instead of the save
+    bool json = false;   // one JSON object per file with its old and new header, nothing written
+};
+
+// edit: save with the edits made to each record first. Values that must come from a standard
+// list, or an added history line without a user, are refused before any file is read.
+int RunEdit(const std::vector<std::string>& arguments, const SaveOptions& options, EditOptions edit,
+            const BatchOptions& batch, std::ostream& out, std::ostream& err);

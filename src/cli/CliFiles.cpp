@@ -1,21 +1,23 @@
 #include "CliFiles.h"
 
 #include <algorithm>
+#include <filesystem>
 
 #include "ConsoleDialogs.h"
+#include "ListFolder.h"
 #include "OpenDocument.h"
 #include "ParseProgress.h"
-#include "PartFile.h"
 #include "QmError.h"
+#include "StandardLists.h"
 #include "TextFile.h"
 
 void ReportUnreadable(const std::string& path, const std::exception& failure, std::ostream& err)
 {
     if (dynamic_cast<const NotTextFileError*>(&failure) != nullptr) {
-        err << "quillmark-cli: " << failure.what() << '\n'; // it names the file itself
+        err << "quillmark-cli: " << ShownText(failure.what()) << '\n'; // it names the file itself
         return;
     }
-    err << "quillmark-cli: cannot read " << path << ": " << ErrorOf(failure).description() << '\n';
+    err << "quillmark-cli: cannot read " << ShownText(path) << ": " << OneLine(ErrorOf(failure).description()) << '\n';
 }
 
 namespace {
@@ -34,16 +36,19 @@ int handleCatching(const std::string& path, HeaderData& header, std::ostream& er
 
 } // namespace
 
-std::optional<HeaderData> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err)
+std::optional<OpenedPart> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err, KeepBytes keep)
 {
     dialogs.setCurrentFile(path);
     try {
-        FileBytes content(path);
-        HeaderData header;
+        OpenedPart opened{std::make_unique<FileBytes>(path), {}};
+        opened.header.ReadStamp = opened.content->stamp();
         ParseProgress silent;
-        OpenPartFileContent(header, path, content.takeBytes(), dialogs, silent);
-        header.ReadStamp = content.stamp();
-        return header;
+        // Without the bytes to keep, they become the body: the file is in memory once.
+        auto bytes = keep == KeepBytes::Yes ? std::string(opened.content->view()) : opened.content->takeBytes();
+        if (keep == KeepBytes::No)
+            opened.content.reset();
+        OpenPartFileContent(opened.header, path, std::move(bytes), dialogs, silent);
+        return opened;
     } catch (const std::exception& failure) {
         ReportUnreadable(path, failure, err);
         return std::nullopt;
@@ -55,8 +60,26 @@ int ForEachOpenedFile(const std::vector<std::string>& paths, ConsoleDialogs& dia
 {
     int status = ExitStatus::Ok;
     for (const auto& path : paths) {
-        auto header = OpenForCli(path, dialogs, err);
-        status = std::max(status, header ? handleCatching(path, *header, err, handle) : ExitStatus::Unreadable);
+        auto opened = OpenForCli(path, dialogs, err);
+        status = std::max(status, opened ? handleCatching(path, opened->header, err, handle) : ExitStatus::Unreadable);
     }
     return status;
+}
+
+std::string ProgramFolder()
+{
+    std::error_code error;
+    return std::filesystem::read_symlink("/proc/self/exe", error).parent_path().string();
+}
+
+bool ReadStandardList(ListKind kind, StringList& entries, std::ostream& err)
+{
+    const auto path = ListFilePath(ListFolderOfThisProgram(ProgramFolder()), kind);
+    try {
+        entries = ReadListFile(path);
+        return true;
+    } catch (const QmError& failure) {
+        err << "quillmark-cli: cannot read the list " << path << ": " << failure.description() << '\n';
+        return false;
+    }
 }

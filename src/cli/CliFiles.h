@@ -1,12 +1,15 @@
 #pragma once
 
 #include <functional>
+#include <memory>
 #include <optional>
 #include <ostream>
 #include <string>
 #include <vector>
 
 #include "HeaderData.h"
+#include "ListKinds.h"
+#include "PartFile.h"
 
 class ConsoleDialogs;
 
@@ -15,15 +18,34 @@ namespace ExitStatus {
 inline constexpr int Ok = 0;
 inline constexpr int Refused = 1;
 inline constexpr int Unreadable = 2;
+inline constexpr int Usage = 2; // the command line itself is wrong
 inline constexpr int SaveFailed = 3;
 } // namespace ExitStatus
 
 // The one line that names a file that could not be read or worked on.
 void ReportUnreadable(const std::string& path, const std::exception& failure, std::ostream& err);
 
+// A part file as opened, with the bytes it was read from when they were kept.
+struct OpenedPart {
+    std::unique_ptr<FileBytes> content; // null unless kept
+    HeaderData header;
+};
+
+// Whether an open keeps the file's bytes beside the record, for a save that compares its text with
+// them: a copy, where otherwise the bytes themselves become the body.
+enum class KeepBytes { No, Yes };
+
 // Opens path as the Open command does. When the file cannot be read, says so in one line on
 // err and returns nullopt.
-std::optional<HeaderData> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err);
+std::optional<OpenedPart> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err,
+                                     KeepBytes keep = KeepBytes::No);
+
+// The folder of the running program, where a build keeps its list and data files.
+std::string ProgramFolder();
+
+// A standard list, from the list file the window uses. When it cannot be read, says so on err
+// and returns false.
+bool ReadStandardList(ListKind kind, StringList& entries, std::ostream& err);
 
 // Runs handle on every file that opens and returns the worst status: Unreadable for a file that
 // did not open, otherwise the largest that handle returned.

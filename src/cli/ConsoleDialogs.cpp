@@ -22,4 +22,26 @@ std::string ConsoleDialogs::input(const std::string& /*prompt*/, const std::stri
 
 std::optional<std::string> ConsoleDialogs::openFile(const OpenFileRequest& /*request*/) { return std::nullopt; }
 
-std::string OneLine(const std::string& text) { return ReplaceAll(text, "\r\n", "; "); }
+void ConsoleDialogs::setCurrentFile(const std::string& path) { currentFile_ = ShownText(path); }
+
+std::string ShownText(std::string_view text)
+{
+    std::string shown;
+    shown.reserve(text.size());
+    for (const char c : text) {
+        const auto code = static_cast<unsigned char>(c);
+        if (code >= 0x20 && code != 0x7F)
+            shown += c;
+        else if (c == '\n' || c == '\r' || c == '\t')
+            shown += c == '\n' ? "\\n" : c == '\r' ? "\\r" : "\\t";
+        else {
+            constexpr char Hex[] = "0123456789abcdef";
+            shown += "\\x";
+            shown += Hex[code >> 4];
+            shown += Hex[code & 0xF];
+        }
+    }
+    return shown;
+}
+
+std::string OneLine(const std::string& text) { return ShownText(ReplaceAll(text, "\r\n", "; ")); }

@@ -3,6 +3,7 @@
 #include <functional>
 #include <ostream>
 #include <string>
+#include <string_view>
 
 #include "Dialogs.h"
 
@@ -15,7 +16,7 @@ public:
 
     explicit ConsoleDialogs(std::ostream& err, Answerer answerer = {});
 
-    void setCurrentFile(const std::string& path) { currentFile_ = path; }
+    void setCurrentFile(const std::string& path);
     // The text of the last box shown, answered or not.
     const std::string& lastMessage() const { return lastMessage_; }
     const std::string& lastTitle() const { return lastTitle_; }
@@ -32,5 +33,9 @@ private:
     std::string lastTitle_;
 };
 
-// A message on one line: its CR LF become "; ".
+// Text as one line on the console, each control character shown as an escape: "\n", "\r", "\t",
+// or "\x" and two hex digits. A file's name may hold any of them.
+std::string ShownText(std::string_view text);
+
+// A message on one line: its CR LF become "; ", any other control character an escape.
 std::string OneLine(const std::string& text);

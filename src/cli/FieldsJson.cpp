@@ -16,11 +16,13 @@ nlohmann::json textList(const StringList& list)
 
 } // namespace
 
+std::string TextForJson(const std::string& path) { return IsValidUtf8(path) ? path : Latin1ToUtf8(path); }
+
 std::string FieldsJson(const HeaderData& h)
 {
     nlohmann::ordered_json json;
-    json["FilePath"] = Latin1ToUtf8(h.FilePath);
-    json["FileFolder"] = Latin1ToUtf8(h.FileFolder);
+    json["FilePath"] = TextForJson(h.FilePath);
+    json["FileFolder"] = TextForJson(h.FileFolder);
     json["PartName"] = Latin1ToUtf8(h.PartName);
     json["PartDescription"] = Latin1ToUtf8(h.PartDescription);
     json["NeedsWork"] = h.NeedsWork;

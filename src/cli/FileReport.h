@@ -18,7 +18,7 @@ struct FileReport {
     bool missingUserName = false;
     FixUpOffers fixups;
     std::vector<std::string> trackerIds; // one per finding of the Parts Tracker's rules
-    enum class Saving { NotAsked, Saved, Skipped, Failed } saving = Saving::NotAsked;
+    enum class Saving { NotAsked, Saved, Previewed, Unchanged, Skipped, Failed } saving = Saving::NotAsked;
 };
 
 // Each fix-up with the words the output uses for it.

@@ -3,6 +3,7 @@
 #include "CliFiles.h"
 #include "Composer.h"
 #include "FieldsJson.h"
+#include "FileSave.h"
 #include "Text.h"
 
 int RunFields(const std::vector<std::string>& paths, ConsoleDialogs& dialogs, std::ostream& out, std::ostream& err)
@@ -17,8 +18,7 @@ int RunPrint(const std::string& path, ConsoleDialogs& dialogs, std::ostream& out
 {
     return ForEachOpenedFile({path}, dialogs, err, [&out](HeaderData& header) {
         const auto newHeader = ComposeHeader(header);
-        for (const std::string_view piece :
-             {TextBeforeHeader(header), std::string_view(newHeader), std::string_view(header.Body), CrLf})
+        for (const auto piece : SavedPieces(header, newHeader))
             out.write(piece.data(), static_cast<std::streamsize>(piece.size()));
         return ExitStatus::Ok;
     });

@@ -1,5 +1,12 @@
 #include "Summary.h"
 
+void Summary::addWalks(const PartFileList& found)
+{
+    unreadable_ += found.problems.size();
+    backupsSkipped_ += found.backupsSkipped;
+    linksSkipped_ += found.linksSkipped;
+}
+
 void Summary::add(const FileReport& report)
 {
     ++files_;
@@ -18,6 +25,8 @@ void Summary::add(const FileReport& report)
         ++trackerIds_[id];
     saving_ = saving_ || report.saving != FileReport::Saving::NotAsked;
     saved_ += report.saving == FileReport::Saving::Saved ? 1 : 0;
+    previewed_ += report.saving == FileReport::Saving::Previewed ? 1 : 0;
+    unchanged_ += report.saving == FileReport::Saving::Unchanged ? 1 : 0;
     skipped_ += report.saving == FileReport::Saving::Skipped ? 1 : 0;
     failed_ += report.saving == FileReport::Saving::Failed ? 1 : 0;
 }
@@ -26,8 +35,13 @@ void Summary::print(std::ostream& err) const
 {
     err << files_ << " files, " << refused_ << " refused, " << missingUserName_ << " without user name, " << unreadable_
         << " unreadable";
+    if (backupsSkipped_ > 0)
+        err << ", " << backupsSkipped_ << " backups skipped";
+    if (linksSkipped_ > 0)
+        err << ", " << linksSkipped_ << " links skipped";
     if (saving_)
-        err << "; " << saved_ << " saved, " << skipped_ << " skipped, " << failed_ << " failed";
+        err << "; " << saved_ << " saved, " << (previewed_ > 0 ? std::to_string(previewed_) + " would be saved, " : "")
+            << unchanged_ << " unchanged, " << skipped_ << " skipped, " << failed_ << " failed";
     err << '\n';
     for (const auto& [reason, count] : reasons_)
         err << "  refused: " << reason << ": " << count << '\n';

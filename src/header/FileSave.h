@@ -1,6 +1,8 @@
 #pragma once
 
+#include <array>
 #include <string>
+#include <string_view>
 
 #include "Clock.h"
 #include "HeaderData.h"
@@ -12,8 +14,22 @@ class Dialogs;
 // path gives "unbenannt_Backup_....txt". A file name without "." throws QmError 5.
 std::string MakeBackupName(const std::string& path, const LocalDateTime& stamp);
 
+// True when a file name (without folder) has the form MakeBackupName gives, with or without a
+// " (n)" after the stamp.
+bool IsBackupName(std::string_view fileName);
+
 // The title of the question asked before overwriting a file that changed since it was read.
 inline constexpr const char* ChangedOnDiskTitle = "File Changed on Disk";
+
+// What a save writes, piece by piece: what stood before the header, the new header, the body
+// and one CR LF.
+std::array<std::string_view, 4> SavedPieces(const HeaderData& header, const std::string& newHeader);
+
+// The text a save writes, in one piece.
+std::string SavedText(const HeaderData& header, const std::string& newHeader);
+
+// True when a save would write exactly bytes.
+bool SaveWouldWrite(const HeaderData& header, const std::string& newHeader, std::string_view bytes);
 
 struct FileSaveResult {
     bool saved = false;

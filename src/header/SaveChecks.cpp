@@ -93,6 +93,11 @@ SaveResult CheckHeaderAndSave(HeaderData& h, const SaveContext& context)
             return {SaveOutcome::Declined, {}};
     }
     offerFixUps(h, context);
-    const auto saved = FileSave(h, context.newHeader(), context.makeBackup, context.clock, dialogs);
+    const auto newHeader = context.newHeader();
+    if (context.heldBytes && SaveWouldWrite(h, newHeader, *context.heldBytes))
+        return {SaveOutcome::Unchanged, {}};
+    if (context.dryRun)
+        return {SaveOutcome::NotWritten, {}};
+    const auto saved = FileSave(h, newHeader, context.makeBackup, context.clock, dialogs);
     return {saved.saved ? SaveOutcome::Saved : SaveOutcome::Failed, saved.backupPath};
 }

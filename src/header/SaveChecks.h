@@ -1,7 +1,9 @@
 #pragma once
 
 #include <functional>
+#include <optional>
 #include <string>
+#include <string_view>
 #include <vector>
 
 #include "HeaderData.h"
@@ -36,6 +38,8 @@ enum class SaveOutcome {
     Refused,            // another check stopped the save
     Declined,           // the user did not want to save without a user name
     Failed,             // writing failed, and was reported
+    Unchanged,          // the file holds the text already, so nothing was written
+    NotWritten,         // checked and fixed up, and not written: a dry run
 };
 
 // What the save needs from whoever holds the header: the composed text to write, and a way to
@@ -47,6 +51,9 @@ struct SaveContext {
     std::function<std::string()> newHeader;
     std::function<void()> recompose;
     bool limitDescription = true; // off: the description may be of any length
+    // The file's bytes as read, when a save that would write them again is to write nothing.
+    std::optional<std::string_view> heldBytes = std::nullopt;
+    bool dryRun = false; // everything but the writing
 };
 
 struct SaveResult {

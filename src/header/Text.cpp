@@ -109,6 +109,11 @@ bool ContainsIgnoreCase(std::string_view text, std::string_view needle)
     return false;
 }
 
+bool StartsWithIgnoreCase(std::string_view text, std::string_view prefix)
+{
+    return text.size() >= prefix.size() && equalIgnoreCaseAt(text, 0, prefix);
+}
+
 namespace {
 
 // Part files are mostly ASCII: 64 bytes are tested at once, as eight words.

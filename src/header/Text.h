@@ -27,6 +27,8 @@ std::string ToUpperAscii(std::string_view text);
 
 // True when needle occurs in text, comparing ASCII letters without regard to case.
 bool ContainsIgnoreCase(std::string_view text, std::string_view needle);
+// True when text begins with prefix, comparing ASCII letters without regard to case.
+bool StartsWithIgnoreCase(std::string_view text, std::string_view prefix);
 
 bool IsValidUtf8(std::string_view bytes);
 // Checks bytes as UTF-8 from position from (the start of a character) up to at least until: the

@@ -1,5 +1,7 @@
 #include "StandardLists.h"
 
+#include <filesystem>
+
 #include "ErrorReport.h"
 #include "LineReader.h"
 #include "PartFile.h"
@@ -21,6 +23,11 @@ StringList loadList(ListKind kind, const std::string& programFolder, Dialogs& di
 
 StringList ReadListFile(const std::string& path)
 {
+    // A list is a few hundred short lines; a file far larger is no list, and its lines would take
+    // many times its size in memory. A file that cannot be looked at is left to the reading.
+    std::error_code unknown;
+    if (const auto size = std::filesystem::file_size(path, unknown); !unknown && size > ListFileLimit)
+        throw QmError(ErrorNumber::PathFileAccessError, "The list file " + path + " is larger than 1 MB");
     const FileBytes bytes(path);
     StringList entries;
     LineReader reader(bytes.view());

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <cstdint>
 #include <string>
 
 #include "Categories.h"
@@ -16,8 +17,11 @@ struct StandardLists {
     StringList Licenses;
 };
 
+inline constexpr std::uintmax_t ListFileLimit = 1024 * 1024;
+
 // One entry per line of the file, exactly as read: lines end at CR LF or a lone CR, nothing is
-// trimmed or skipped. Throws QmError when the file cannot be read.
+// trimmed or skipped. Throws QmError when the file cannot be read, and 75 naming the file when
+// it is larger than ListFileLimit.
 StringList ReadListFile(const std::string& path);
 
 // Each entry followed by CR LF. Throws QmError when the file cannot be written.

@@ -3,6 +3,7 @@
 #include <QRegularExpression>
 
 #include "Findings.h"
+#include "HeaderEdits.h"
 #include "HeaderFacts.h"
 #include "LineChecks.h"
 #include "MetaLine.h"
@@ -120,20 +121,6 @@ void checkHistory(const Part& part, Findings& findings)
                            "The history line " + quoted(line) + " is not \"0 !HISTORY YYYY-MM-DD [user] comment\".");
 }
 
-// The folder that a type's files carry in their "Name:".
-QString folderOfType(const QString& plainType)
-{
-    if (plainType == "Subpart")
-        return "s\\";
-    if (plainType == "8_Primitive")
-        return "8\\";
-    if (plainType == "48_Primitive")
-        return "48\\";
-    if (plainType == "Helper")
-        return "helpers\\";
-    return "";
-}
-
 void checkName(const Part& part, Findings& findings)
 {
     const auto& f = part.facts;
@@ -142,7 +129,7 @@ void checkName(const Part& part, Findings& findings)
     if (part.baseName.startsWith('x'))
         findings.error("name.xparts", "The file name " + quoted(part.fileName) + " starts with \"x\".");
     const auto folder = f.name.left(f.name.lastIndexOf('\\') + 1);
-    const auto wanted = folderOfType(part.plainType);
+    const auto wanted = QString::fromStdString(NameFolderOfType(part.plainType.toStdString()));
     if (folder.compare(wanted, Qt::CaseInsensitive) != 0)
         findings.error("type.path", "A " + part.plainType + " is named " + quoted(wanted + "name.dat") + ", not " +
                                         quoted(f.name) + ".");

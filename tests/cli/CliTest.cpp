@@ -4,15 +4,19 @@
 #include <algorithm>
 #include <fcntl.h>
 #include <filesystem>
+#include <functional>
+#include <grp.h>
 #include <nlohmann/json.hpp>
 #include <pty.h>
 #include <sstream>
+#include <sys/resource.h>
 #include <sys/wait.h>
 #include <unistd.h>
 
 #include "CliApp.h"
 #include "Corpus.h"
 #include "TempDir.h"
+#include "UnifiedDiff.h"
 
 namespace fs = std::filesystem;
 
@@ -50,6 +54,61 @@ std::size_t lineCount(const std::string& text)
     return static_cast<std::size_t>(std::count(text.begin(), text.end(), '\n'));
 }
 
+std::string readAll(int from)
+{
+    std::string text;
+    char buffer[4096];
+    for (ssize_t got; (got = ::read(from, buffer, sizeof buffer)) > 0;)
+        text.append(buffer, static_cast<std::size_t>(got));
+    ::close(from);
+    return text;
+}
+
+// Runs quillmark-cli in a child of this process, after prepare has set the child up (limits,
+// another user, another working folder), so that nothing of it stays with the tests.
+CliRun RunCliInChild(const std::vector<std::string>& args, const std::function<void()>& prepare)
+{
+    int out[2], err[2];
+    if (::pipe(out) != 0 || ::pipe(err) != 0)
+        return {-1, "", "no pipe"};
+    const pid_t child = ::fork();
+    if (child == 0) { // it must never return into the tests, nor run their exit handlers
+        try {
+            prepare();
+            const auto run = RunCliWith(args);
+            for (const auto& [to, text] : {std::pair{out[1], &run.out}, std::pair{err[1], &run.err}})
+                if (::write(to, text->data(), text->size()) < 0)
+                    ::_exit(126);
+            ::_exit(run.status);
+        } catch (...) {
+            ::_exit(127);
+        }
+    }
+    ::close(out[1]);
+    ::close(err[1]);
+    CliRun run{-1, readAll(out[0]), readAll(err[0])};
+    ::waitpid(child, &run.status, 0);
+    run.status = WIFEXITED(run.status) ? WEXITSTATUS(run.status) : -1;
+    return run;
+}
+
+// In a child run as root, becomes the user nobody, for whom permissions count.
+void becomeUnprivileged()
+{
+    if (::geteuid() == 0 && (::setgroups(0, nullptr) != 0 || ::setresgid(65534, 65534, 65534) != 0 ||
+                             ::setresuid(65534, 65534, 65534) != 0))
+        ::_exit(125);
+}
+
+// Lets the child open no more than allowed descriptors beside those it has open.
+void allowDescriptors(int allowed)
+{
+    const int lowestFree = ::dup(STDIN_FILENO);
+    ::close(lowestFree);
+    const rlimit limit{rlim_t(lowestFree + allowed), rlim_t(lowestFree + allowed)};
+    ::setrlimit(RLIMIT_NOFILE, &limit);
+}
+
 TEST(CliFields, OneJsonLinePerFileAndTheUnreadableNamedOnStandardError)
 {
     TempDir dir;
@@ -84,7 +143,7 @@ TEST(CliPrint, WritesTheComposedHeaderTheBodyAndOneCrLf)
     EXPECT_EQ(RunCliWith({"print", dir.write("bom.dat", mark + SamplePart)}).out, mark + run.out);
 }
 
-TEST(CliCheck, ListsEveryFindingInLinesOrJsonAndNeverWrites)
+TEST(CliCheck, ListsEveryFindingInLinesOrJsonAndNeverWritesAndExitsWithTheWorst)
 {
     TempDir dir;
     const auto good = dir.write("good.dat", GoodPart);
@@ -105,6 +164,16 @@ TEST(CliCheck, ListsEveryFindingInLinesOrJsonAndNeverWrites)
               (nlohmann::json{{"certify_invertnext", false}, {"rotation", true}, {"write", false}, {"color", true}}));
     EXPECT_EQ(ReadBytes(bad), NoAuthorPart);
     EXPECT_EQ(NamesIn(dir.path()), (std::set<std::string>{"good.dat", "bad.dat"}));
+    EXPECT_EQ(RunCliWith({"check", "--quiet", bad, good}).status, 1) << "the worst file's status, not the last one's";
+    EXPECT_EQ(RunCliWith({"check", "--quiet", "--tracker", good}).status, 1) << "no name line, an unknown licence";
+
+    const auto folder = dir.path().string(); // names shown without control characters, JSON paths as UTF-8
+    EXPECT_EQ(RunCliWith({"check", "--quiet", dir.write("a\nb\x1b.dat", GoodPart)}).out,
+              folder + "/a\\nb\\x1b.dat: ok\n");
+    const auto utf8 = dir.write("\xc3\xa9t\xc3\xa9.dat", GoodPart);
+    const auto latin1 = dir.write("\xe9t\xe9.dat", GoodPart);
+    EXPECT_EQ(nlohmann::json::parse(RunCliWith({"check", "--json", utf8}).out)["FilePath"], utf8);
+    EXPECT_EQ(nlohmann::json::parse(RunCliWith({"check", "--json", latin1}).out)["FilePath"], utf8);
 }
 
 TEST(CliSave, SavesGoodFilesWithBackupSkipsRefusedOnesAndReportsFailures)
@@ -114,8 +183,10 @@ TEST(CliSave, SavesGoodFilesWithBackupSkipsRefusedOnesAndReportsFailures)
     const auto bad = dir.write("bad.dat", NoAuthorPart);
     const auto noDot = dir.write("noext", GoodPart); // no backup name without "."
     const auto printed = RunCliWith({"print", good}).out;
-    const auto run = RunCliWith({"save", good, bad, noDot});
+    const auto run = RunCliWith({"save", "--quiet", good, bad, noDot, dir.file("missing.dat")});
     EXPECT_EQ(run.status, 3);
+    EXPECT_EQ(run.err, "quillmark-cli: cannot read " + dir.file("missing.dat") + ": File not found\n")
+        << "quiet, nothing else";
     EXPECT_EQ(ReadBytes(good), printed);
     EXPECT_EQ(ReadBytes(bad), NoAuthorPart);
     EXPECT_EQ(ReadBytes(noDot), GoodPart);
@@ -123,6 +194,22 @@ TEST(CliSave, SavesGoodFilesWithBackupSkipsRefusedOnesAndReportsFailures)
     EXPECT_NE(run.out.find("skipped " + bad + ": You need to mention the Author!\n"), std::string::npos);
     EXPECT_NE(run.out.find("failed " + noDot + ": Error 5 "), std::string::npos);
     EXPECT_EQ(NamesIn(dir.path()).size(), 4u);
+}
+
+// " parts/a.dat" is not parts/a.dat.
+TEST(CliSave, APathIsTakenByteForByte)
+{
+    TempDir dir;
+    fs::create_directory(dir.path() / " parts");
+    fs::create_directory(dir.path() / "parts");
+    const auto named = dir.write(" parts/a.dat", GoodPart);
+    dir.write("parts/a.dat", GoodPart);
+    const auto run = RunCliInChild({"save", " parts/a.dat"}, [&dir] { fs::current_path(dir.path()); });
+    EXPECT_EQ(run.status, 0) << run.err;
+    EXPECT_NE(ReadBytes(named), GoodPart);
+    EXPECT_EQ(NamesIn(dir.path() / " parts").size(), 2u) << "the backup beside the file";
+    EXPECT_EQ(NamesIn(dir.path() / "parts"), std::set<std::string>{"a.dat"});
+    EXPECT_EQ(ReadBytes(dir.file("parts/a.dat")), GoodPart);
 }
 
 TEST(CliSave, MissingUserNameFixesAndLongDescriptionsEachNeedTheirFlag)
@@ -149,11 +236,88 @@ TEST(CliBatch, FoldersGivePartFilesOfAnyCaseInPathOrderWithoutFollowingLinkedFol
         TempDir::writeTo(lib + name, GoodPart);
     TempDir::writeTo(dir.file("elsewhere/linked.dat"), GoodPart);
     fs::create_directory_symlink(dir.path() / "elsewhere", lib + "/link");
+    const auto outside = dir.write("elsewhere/outside.dat", GoodPart);
+    fs::create_symlink(outside, lib + "/parts/out.dat");
     const auto single = dir.write("z.txt", GoodPart);
-    const auto run = RunCliWith({"check", "--quiet", single, lib});
-    EXPECT_EQ(run.status, 0);
+    const auto run = RunCliWith({"check", single, lib});
     EXPECT_EQ(run.out,
               single + ": ok\n" + lib + "/c.Dat: ok\n" + lib + "/parts/a.dat: ok\n" + lib + "/parts/s/b.DAT: ok\n");
+    EXPECT_EQ(run.err, "4 files, 0 refused, 0 without user name, 0 unreadable, 2 links skipped\n");
+    EXPECT_EQ(RunCliWith({"save", lib}).status, 0);
+    EXPECT_EQ(ReadBytes(outside), GoodPart);
+    EXPECT_EQ(NamesIn(dir.path() / "elsewhere"), (std::set<std::string>{"linked.dat", "outside.dat"}));
+}
+
+TEST(CliBatch, BackupsAreNotWalkedAndAFileAlreadySavedIsNotWrittenAgain)
+{
+    TempDir dir;
+    const auto folder = dir.path().string();
+    const auto part = dir.write("a.dat", GoodPart);
+    ASSERT_EQ(RunCliWith({"save", folder}).status, 0);
+    const auto names = NamesIn(dir.path());
+    const auto backup = dir.file(*names.rbegin()); // after "a.dat"
+    const auto again = RunCliWith({"save", "--no-backup", folder});
+    EXPECT_EQ(again.out, "unchanged " + part + "\n");
+    EXPECT_EQ(again.err, "1 files, 0 refused, 0 without user name, 0 unreadable, 1 backups skipped; "
+                         "0 saved, 1 unchanged, 0 skipped, 0 failed\n");
+    EXPECT_EQ(RunCliWith({"save", folder}).status, 0);
+    EXPECT_EQ(NamesIn(dir.path()), names) << "no backup of a file left as it was";
+    EXPECT_EQ(ReadBytes(backup), GoodPart);
+    EXPECT_EQ(RunCliWith({"check", backup}).out, backup + ": ok\n") << "named, a backup is a file like any";
+}
+
+// Run by a user who may not read one folder, with one descriptor to spare, then none. A first run
+// in each child lets the sanitizers make the checks for which they take descriptors themselves.
+TEST(CliBatch, AWalkHoldsOneDescriptorHoweverDeepAndReportsWhatItCannotRead)
+{
+    TempDir dir;
+    fs::permissions(dir.path(), fs::perms::owner_all | fs::perms::others_read | fs::perms::others_exec);
+    const auto folder = dir.path().string();
+    std::string deep = folder;
+    for (int level = 0; level < 40; ++level)
+        deep += "/d";
+    fs::create_directories(deep);
+    const auto part = dir.write(deep + "/a.dat", GoodPart);
+    const auto locked = dir.path() / "locked";
+    fs::create_directory(locked);
+    dir.write("locked/b.dat", GoodPart);
+    fs::permissions(locked, fs::perms::none);
+    const auto run = RunCliInChild({"check", "-j", "1", folder}, [&folder] {
+        RunCliWith({"check", folder});
+        becomeUnprivileged();
+        allowDescriptors(1);
+    });
+    EXPECT_EQ(run.status, 2);
+    EXPECT_EQ(run.out, part + ": ok\n");
+    EXPECT_EQ(run.err, "quillmark-cli: cannot read folder " + locked.string() +
+                           ": Permission denied\n1 files, 0 refused, 0 without user name, 1 unreadable\n");
+    const auto none = RunCliInChild({"check", folder}, [&folder] {
+        RunCliWith({"check", folder});
+        allowDescriptors(0);
+    });
+    fs::permissions(locked, fs::perms::owner_all);
+    EXPECT_EQ(none.status, 2);
+    EXPECT_NE(none.err.find("cannot read folder " + folder + ": Too many open files\n"), std::string::npos);
+}
+
+TEST(CliBatch, JobsOutsideOneTo1024AreRefusedAndThreadsThatCannotStartAreNotNeeded)
+{
+    TempDir dir;
+    fs::permissions(dir.path(), fs::perms::owner_all | fs::perms::others_read | fs::perms::others_exec);
+    for (const auto* name : {"1.dat", "2.dat", "3.dat"})
+        dir.write(name, GoodPart);
+    for (const auto* jobs : {"0", "-1", "5000"}) {
+        const auto run = RunCliWith({"check", "-j", jobs, dir.path().string()});
+        EXPECT_EQ(run.status, 2) << jobs;
+        EXPECT_NE(run.err.find("--jobs: Value " + std::string(jobs) + " not in range 1 to 1024"), std::string::npos);
+    }
+    const auto run = RunCliInChild({"check", "-j", "4", dir.path().string()}, [] {
+        becomeUnprivileged();
+        const rlimit noNewThreads{1, 1};
+        ::setrlimit(RLIMIT_NPROC, &noNewThreads);
+    });
+    EXPECT_EQ(run.status, 0) << run.err;
+    EXPECT_EQ(lineCount(run.out), 3u);
 }
 
 TEST(CliBatch, SummaryCountsEachFinding)
@@ -205,6 +369,70 @@ TEST(CliTracker, LineFindingsNameTheirLineAndColoursComeFromTheLibrarysLDConfig)
     EXPECT_NE(builtIn.err.find(malformed), std::string::npos);
 }
 
+// Hunks as diff -u makes them: three lines of context, near changes in one hunk, an insertion at
+// the start, a last line without a line end.
+TEST(UnifiedDiff, AsDiffMakesIt)
+{
+    std::string before, after = "new\n";
+    for (int line = 1; line <= 30; ++line) {
+        const auto text = "line " + std::to_string(line) + (line % 10 == 0 ? "\r\n" : "\n");
+        before += text;
+        after += line == 5 || line == 11 || line == 25 ? "" : line == 30 ? "line 30" : text;
+    }
+    TempDir dir;
+    const auto command = "diff -u '" + dir.write("a", before) + "' '" + dir.write("b", after) + "' | tail -n +3 >'" +
+                         dir.file("diff") + "'";
+    ASSERT_EQ(std::system(command.c_str()), 0);
+    EXPECT_EQ(UnifiedDiff(before, after, "p.dat"), "--- a/p.dat\n+++ b/p.dat\n" + ReadBytes(dir.file("diff")));
+    EXPECT_EQ(UnifiedDiff(before, before, "p.dat"), "");
+    EXPECT_EQ(UnifiedDiff("", "x\n", "p.dat"), "--- a/p.dat\n+++ b/p.dat\n@@ -0,0 +1 @@\n+x\n");
+}
+
+// Real files: one refused (no user name), two edited. The dry run's diff, applied by patch to a
+// copy, gives what the edit writes; an edit that changes nothing more writes nothing.
+TEST(CliEdit, TheDryRunsDiffIsWhatTheEditWritesAndUnknownListValuesAreRefusedFirst)
+{
+    TempDir dir;
+    const std::vector<std::string> names = {"104.dat", "391.dat", "s/2895s01.dat"};
+    for (const auto* copy : {"lib/s", "copy/lib/s"})
+        fs::create_directories(dir.path() / copy);
+    std::error_code missing;
+    for (const auto& name : names)
+        for (const auto* copy : {"lib/", "copy/lib/"})
+            if (!fs::copy_file(QUILLMARK_CORPUS_DIR "/parts/" + name, dir.file(copy + name), missing))
+                GTEST_SKIP() << "no corpus folder beside the project";
+            else
+                fs::permissions(dir.file(copy + name), fs::perms::owner_write, fs::perm_options::add);
+    std::vector<std::string> edit = {"edit",   "--license", "current", "--name-from-path", "--add-history",
+                                     "Edited", "--as",      "jtester", "--no-backup",      "lib"};
+    const auto inDir = [&dir] { fs::current_path(dir.path()); };
+    edit.push_back("--dry-run");
+    const auto dry = RunCliInChild(edit, inDir);
+    edit.pop_back();
+    EXPECT_EQ(dry.status, 1);
+    EXPECT_NE(dry.err.find("; 0 saved, 2 would be saved, 0 unchanged, 1 skipped, 0 failed\n"), std::string::npos);
+    EXPECT_EQ(dry.out.find("--- a/lib/104.dat\n+++ b/lib/104.dat\n@@ -2,10 +2,12 @@\n 0 Name: 104.dat\r\n"), 0u);
+    EXPECT_EQ(ReadBytes(dir.file("lib/104.dat")), ReadBytes(dir.file("copy/lib/104.dat")));
+    TempDir::writeTo(dir.file("edits.diff"), dry.out);
+    ASSERT_EQ(std::system(("cd '" + dir.file("copy") + "' && patch -s -p1 <../edits.diff").c_str()), 0);
+    EXPECT_EQ(RunCliInChild(edit, inDir).status, 1);
+    for (const auto& name : names)
+        EXPECT_TRUE(ReadBytes(dir.file("lib/" + name)) == ReadBytes(dir.file("copy/lib/" + name))) << name;
+    EXPECT_NE(ReadBytes(dir.file("lib/104.dat")).find("0 !HISTORY 2"), std::string::npos);
+    const auto again = RunCliInChild({"edit", "--license", "current", "--name-from-path", "--no-backup", "lib"}, inDir);
+    EXPECT_EQ(again.out, "unchanged lib/104.dat\nskipped lib/391.dat: no user name set\nunchanged lib/s/2895s01.dat\n");
+    const auto unknown = RunCliWith({"edit", "--type", "Brik", "--no-backup", dir.file("lib")});
+    EXPECT_EQ(unknown.status, 2);
+    EXPECT_EQ(unknown.out, "");
+    EXPECT_EQ(unknown.err.find("quillmark-cli: --type Brik is not in the list: Part, Subpart, "), 0u);
+    const auto before = ReadBytes(dir.file("lib/104.dat"));
+    const auto json =
+        nlohmann::json::parse(RunCliWith({"edit", "--json", "--description", "X", dir.file("lib/104.dat")}).out);
+    EXPECT_EQ(json["new_header"].get<std::string>().rfind("0 X\r\n0 Name: 104.dat\r\n", 0), 0u);
+    EXPECT_EQ(json["old_header"].get<std::string>().rfind("0 Antenna  6H\r\n", 0), 0u);
+    EXPECT_EQ(ReadBytes(dir.file("lib/104.dat")), before);
+}
+
 // The subparts of the corpus: real files in hundreds, checked with the Parts Tracker's rules too.
 TEST(CliBatch, ManyThreadsWriteWhatOneThreadWrites)
 {
@@ -237,11 +465,7 @@ std::string standardErrorOfCheck(const std::string& folder, bool onTerminal)
         ::_exit(127);
     }
     ::close(ends[1]);
-    std::string shown;
-    char buffer[4096];
-    for (ssize_t got; (got = ::read(ends[0], buffer, sizeof buffer)) > 0;)
-        shown.append(buffer, static_cast<std::size_t>(got));
-    ::close(ends[0]);
+    auto shown = readAll(ends[0]);
     ::waitpid(child, nullptr, 0);
     return shown;
 }

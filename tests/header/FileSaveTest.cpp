@@ -34,14 +34,20 @@ struct stat statOf(const std::string& path)
     return info;
 }
 
-TEST(MakeBackupName, StampBetweenBaseAndExtension)
+TEST(MakeBackupName, StampBetweenBaseAndExtensionAndIsBackupNameKnowsItsNames)
 {
     const LocalDateTime stamp{2008, 8, 10, 14, 5, 9};
     EXPECT_EQ(MakeBackupName("/parts/3001.dat", stamp), "/parts/3001_Backup_2008-08-10_14-05-09.dat");
     EXPECT_EQ(MakeBackupName("/parts/3001.old.dat", stamp), "/parts/3001_Backup_2008-08-10_14-05-09.old.dat");
     EXPECT_EQ(MakeBackupName("3001.dat", stamp), "3001_Backup_2008-08-10_14-05-09.dat");
     EXPECT_EQ(MakeBackupName("  ", stamp), "unbenannt_Backup_2008-08-10_14-05-09.txt");
+    EXPECT_EQ(MakeBackupName(" parts/3001.dat ", stamp), " parts/3001_Backup_2008-08-10_14-05-09.dat ");
     EXPECT_THROW(MakeBackupName("/my.parts/3001", stamp), QmError);
+    for (const auto* name : {"3001_Backup_2008-08-10_14-05-09.dat", "3001_Backup_2008-08-10_14-05-09 (12).old.dat"})
+        EXPECT_TRUE(IsBackupName(name)) << name;
+    for (const auto* name : {"3001_Backup_2008-08-10_14-05-09", "3001_Backup_2008-08-10_14-05-0x.dat",
+                             "3001-Backup_2008-08-10_14-05-09.dat", "3001_Backup_2008-08-10_14-05-09 (x).dat"})
+        EXPECT_FALSE(IsBackupName(name)) << name;
 }
 
 class FileSaving : public ::testing::Test {

@@ -6,37 +6,36 @@
 
 namespace {
 
-TEST(DeleteRotationLines, RemovesLinesStartingWithTheExactKeyword)
+TEST(DeleteRotationLines, RemovesLinesStartingWithTheKeywordInAnyCase)
 {
     std::string body = "0 ROTATION CENTER 0 0 0 1 \"Custom\"\r\n\r\n1 16 a.dat\r\n0 ROTATION CONFIG 0 0\r\n"
-                       "0 rotation x\r\n  0 ROTATION y\r\n\r\n2 24 b";
+                       "0 rotation x\r\n0 // see 0 ROTATION y\r\n0 ROTATIONS\r\n\r\n2 24 b";
     DeleteRotationLines(body);
-    EXPECT_EQ(body, "1 16 a.dat\r\n0 rotation x\r\n  0 ROTATION y\r\n\r\n2 24 b");
-    std::string empty;
-    DeleteRotationLines(empty);
-    EXPECT_EQ(empty, "");
-    std::string trailing = "1 a\r\n";
-    DeleteRotationLines(trailing);
-    EXPECT_EQ(trailing, "1 a\r\n");
+    EXPECT_EQ(body, "1 16 a.dat\r\n0 // see 0 ROTATION y\r\n0 ROTATIONS\r\n\r\n2 24 b");
+    body = "1 a\r\n";
+    DeleteRotationLines(body);
+    EXPECT_EQ(body, "1 a\r\n");
 }
 
-TEST(FixUpTests, LookInAnyCase)
+// A question is asked exactly when its answer Yes would change the body.
+TEST(FixUpTests, FindWhatTheCorrectionChanges)
 {
     EXPECT_TRUE(HasCertifyInvertNext("x\r\n0 bfc certify invertnext"));
-    EXPECT_TRUE(HasRotationLines("0 // see 0 Rotation 1"));
-    EXPECT_FALSE(HasRotationLines("0 ROTATION"));
-    EXPECT_TRUE(HasWriteLines("0 write x"));
-    EXPECT_FALSE(HasWriteLines("0 WRITE"));
+    EXPECT_TRUE(HasRotationLines("1 a\r\n0 Rotation center"));
+    EXPECT_FALSE(HasRotationLines("0 // see 0 ROTATION 1\r\n0 ROTATION"));
+    EXPECT_TRUE(HasWriteLines("1 a\r\n0 write x"));
+    EXPECT_TRUE(HasWriteLines("0 WRITE"));
+    EXPECT_FALSE(HasWriteLines("0 // 10 WRITE x\r\n0 WRITES are fun\r\n1 0 WRITE"));
 }
 
-TEST(FixUpCorrections, ReplaceEveryExactOccurrence)
+TEST(FixUpCorrections, ChangeOnlyTheLinesTheyAreAbout)
 {
     std::string body = "0 BFC CERTIFY INVERTNEXT\r\n1 a\r\n0 BFC CERTIFY INVERTNEXT";
     FixCertifyInvertNext(body);
     EXPECT_EQ(body, "0 BFC INVERTNEXT\r\n1 a\r\n0 BFC INVERTNEXT");
-    body = "0 WRITE Hello\r\n0 // 10 WRITE";
+    body = "0 WRITE Hello\r\n0 // 10 WRITES are fun\r\n0 write x\r\n0 WRITES\r\n0 WRITE";
     RemoveWriteKeywords(body);
-    EXPECT_EQ(body, "0 Hello\r\n0 // 10");
+    EXPECT_EQ(body, "0 Hello\r\n0 // 10 WRITES are fun\r\n0 x\r\n0 WRITES\r\n0");
 }
 
 TEST(RemoveDescriptionTabs, RemovesTabsAfterTellingTheUser)

@@ -15,12 +15,14 @@ TEST(ListFiles, OneEntryPerLineExactlyAsRead)
     EXPECT_EQ(ReadListFile(dir.write("c.txt", "x\ny\n")), (StringList{"x\ny\n"}));
     EXPECT_EQ(ReadListFile(dir.write("d.txt", "x\r\nx\r\n")), (StringList{"x", "x"}));
     EXPECT_EQ(ReadListFile(dir.write("e.txt", "")), StringList{});
+    EXPECT_EQ(ReadListFile(dir.write("f.txt", std::string(ListFileLimit, 'x'))).size(), 1u);
 }
 
-TEST(ListFiles, MissingFileIsReportedAndGivesAnEmptyList)
+TEST(ListFiles, MissingOrHugeFileIsReportedAndGivesAnEmptyList)
 {
     TempDir dir;
     dir.write("category.txt", "Brick\r\n");
+    const auto huge = dir.write("parttype.txt", std::string(ListFileLimit + 1, '\n'));
     ScriptedDialogs dialogs;
     for (int i = 0; i < 3; ++i)
         dialogs.expectMessage(Answer::Ok);
@@ -29,6 +31,8 @@ TEST(ListFiles, MissingFileIsReportedAndGivesAnEmptyList)
     EXPECT_TRUE(lists.PartTypes.empty());
     EXPECT_EQ(EntriesOf(lists, ListKind::Category), StringList{"Brick"});
     ASSERT_EQ(dialogs.messages.size(), 3u);
+    EXPECT_EQ(dialogs.messages[0].text, "Error 75 (The list file " + huge +
+                                            " is larger than 1 MB) in procedure LoadPartTypes of Modul modCategory");
     EXPECT_EQ(dialogs.messages[1].text, "Error 53 (File not found) in procedure LoadBFC of Modul modCategory");
 }
 
