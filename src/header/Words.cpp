@@ -37,5 +37,10 @@ std::string Words::joinedFrom(std::size_t k) const
         return {};
     const auto rest = text_.substr(startOf(k));
     const auto firstText = rest.find_first_not_of(' ');
-    return firstText == std::string_view::npos ? std::string() : std::string(rest.substr(firstText));
+    if (firstText == std::string_view::npos)
+        return {};
+    // Blanks at the end go too: the composer writes the text with a line end right after it, so
+    // any blank left here would be read back as one fewer by the next open, and a file would
+    // change with every save.
+    return std::string(rest.substr(firstText, rest.find_last_not_of(' ') + 1 - firstText));
 }

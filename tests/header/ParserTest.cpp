@@ -123,8 +123,9 @@ TEST(ParserRows, ListLinesKeepTheirWordsJoined)
 
 TEST(ParserRows, CommentsAndDatedLines)
 {
-    const auto h = parseLines({"0 d", "0 // 2004-03-12 [jdoe] fixed", "0 // fixed it", "0 //fixed it",
+    const auto h = parseLines({"0 d", "0 // 2004-03-12 [jdoe] fixed   ", "0 // fixed it   ", "0 //fixed it",
                                "0 2004-3-2 [jdoe] old style", "0 // 2004-03-12"});
+    // Blanks at the end are dropped, all of them: a save writes what the next open reads alike.
     EXPECT_EQ(h.History, (StringList{"2004-03-12 [jdoe] fixed", "2004-03-02 [jdoe] old style", "2004-03-12 "}));
     EXPECT_EQ(h.Comments, (StringList{"// fixed it"}));
     EXPECT_EQ(h.Body, "0 //fixed it");
