@@ -12,9 +12,9 @@
 #include <unistd.h>
 
 #include "FileDescriptor.h"
+#include "Folders.h"
 #include "PartFile.h"
 #include "QmError.h"
-#include "Text.h"
 
 namespace {
 
