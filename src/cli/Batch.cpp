@@ -4,6 +4,7 @@
 #include <atomic>
 #include <chrono>
 #include <condition_variable>
+#include <csignal>
 #include <cstdio>
 #include <mutex>
 #include <optional>
@@ -46,20 +47,25 @@ private:
 
 } // namespace
 
-void RunInOrder(std::size_t count, unsigned threads, const std::function<FileReport(std::size_t)>& work,
-                const std::function<void(FileReport&)>& emit, std::ostream* progress)
+bool RunInOrder(std::size_t count, unsigned threads, const std::function<FileReport(std::size_t)>& work,
+                const std::function<bool(FileReport&)>& emit, std::ostream* progress)
 {
     std::vector<std::optional<FileReport>> reports(count);
     std::mutex mutex;
     std::condition_variable finished;
     std::atomic<std::size_t> next{0};
+    std::atomic<bool> stopped{false};
+    std::size_t working = std::min<std::size_t>(threads, count);
     const auto worker = [&] {
-        for (auto index = next++; index < count; index = next++) {
+        for (auto index = next++; index < count && !stopped && !InterruptPending(); index = next++) {
             auto report = work(index);
             const std::lock_guard lock(mutex);
             reports[index] = std::move(report);
             finished.notify_one();
         }
+        const std::lock_guard lock(mutex);
+        --working;
+        finished.notify_one();
     };
     std::vector<std::jthread> pool;
     for (std::size_t i = 0; i < std::min<std::size_t>(threads, count); ++i)
@@ -67,13 +73,33 @@ void RunInOrder(std::size_t count, unsigned threads, const std::function<FileRep
     ProgressLine line(progress, count);
     for (std::size_t index = 0; index < count; ++index) {
         std::unique_lock lock(mutex);
-        finished.wait(lock, [&] { return reports[index].has_value(); });
+        finished.wait(lock, [&] { return reports[index].has_value() || working == 0; });
+        if (!reports[index].has_value())
+            return false; // the workers stopped before this file
         auto report = std::move(*reports[index]);
         reports[index].reset();
         lock.unlock();
-        emit(report);
+        if (!emit(report))
+            stopped = true;
         line.show(index + 1);
     }
+    return !stopped;
+}
+
+void HoldInterrupts()
+{
+    sigset_t interrupts;
+    ::sigemptyset(&interrupts);
+    ::sigaddset(&interrupts, SIGINT);
+    ::sigaddset(&interrupts, SIGTERM);
+    ::pthread_sigmask(SIG_BLOCK, &interrupts, nullptr);
+}
+
+bool InterruptPending()
+{
+    sigset_t pending;
+    return ::sigpending(&pending) == 0 &&
+           (::sigismember(&pending, SIGINT) == 1 || ::sigismember(&pending, SIGTERM) == 1);
 }
 
 unsigned ThreadsFor(unsigned asked) { return asked > 0 ? asked : std::max(1u, std::thread::hardware_concurrency()); }

@@ -1,5 +1,7 @@
 #include "CheckCommands.h"
 
+#include <cerrno>
+#include <cstring>
 #include <filesystem>
 #include <map>
 #include <mutex>
@@ -13,6 +15,7 @@
 #include "ConsoleDialogs.h"
 #include "FileSave.h"
 #include "ListFolder.h"
+#include "NewFile.h"
 #include "PartFileList.h"
 #include "QmError.h"
 #include "StandardLists.h"
@@ -85,13 +88,13 @@ void noteFindings(FileReport& report, const SaveFindings& findings)
 }
 
 // Opens the file at path and lets handle fill the report; an unreadable file is reported as such.
-FileReport reportOn(const std::string& path, ConsoleDialogs::Answerer answerer,
+FileReport reportOn(const std::string& path, ConsoleDialogs::Answerer answerer, FolderSweeps& sweeps,
                     const std::function<void(HeaderData&, ConsoleDialogs&, FileReport&)>& handle)
 {
     FileReport report;
     std::ostringstream err;
     ConsoleDialogs dialogs(err, std::move(answerer));
-    auto header = OpenForCli(path, dialogs, err);
+    auto header = OpenForCli(path, dialogs, err, &sweeps);
     if (!header) {
         report.unreadable = true;
         report.status = ExitStatus::Unreadable;
@@ -109,21 +112,38 @@ FileReport reportOn(const std::string& path, ConsoleDialogs::Answerer answerer,
     return report;
 }
 
+std::string outputClosedText(int error)
+{
+    const char* name = ::strerrorname_np(error);
+    return std::string("standard output closed (") + (name != nullptr ? name : "error") + ")";
+}
+
 int runBatch(const std::vector<std::string>& arguments, const BatchOptions& batch, std::ostream& out, std::ostream& err,
              const std::function<FileReport(const std::string&)>& work)
 {
     const auto files = ExpandPartFiles(arguments);
     Summary summary;
     int status = ExitStatus::Ok;
-    RunInOrder(
+    int outputError = 0;
+    const bool whole = RunInOrder(
         files.size(), ThreadsFor(batch.threads), [&](std::size_t index) { return work(files[index]); },
         [&](FileReport& report) {
             out << report.out;
             err << report.err;
             summary.add(report);
             status = std::max(status, report.status);
+            if (out || outputError != 0)
+                return true;
+            outputError = errno;
+            return false;
         },
         batch.errIsTerminal && !batch.quiet ? &err : nullptr);
+    if (!whole) {
+        // A reader that went away (quillmark-cli save ... | head) or Ctrl+C ends the run between files.
+        err << "quillmark-cli: " << (outputError != 0 ? outputClosedText(outputError) : "interrupted")
+            << "; the run ends here\n";
+        status = std::max(status, ExitStatus::SaveFailed);
+    }
     if (!batch.quiet)
         summary.print(err);
     return status;
@@ -178,8 +198,9 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
     StringList categories;
     if (options.tracker && !readCategories(categories, err))
         return ExitStatus::Unreadable;
+    FolderSweeps sweeps;
     return runBatch(arguments, batch, out, err, [&](const std::string& path) {
-        return reportOn(path, {}, [&](HeaderData& header, ConsoleDialogs&, FileReport& report) {
+        return reportOn(path, {}, sweeps, [&](HeaderData& header, ConsoleDialogs&, FileReport& report) {
             const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
             TrackerFindings tracker; // empty unless asked for
             if (options.tracker)
@@ -211,12 +232,14 @@ int RunSave(const std::vector<std::string>& arguments, const SaveOptions& option
     };
     const SystemClock clock;
     FileLocks locks;
+    FolderSweeps sweeps;
     return runBatch(arguments, batch, out, err, [&](const std::string& path) {
         const std::lock_guard lock(locks.of(path));
-        return reportOn(path, answer, [&](HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
+        return reportOn(path, answer, sweeps, [&](HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
             const SaveContext context{dialogs,        clock,
                                       options.backup, [&header] { return ComposeHeader(header); },
-                                      [] {},          batch.limitDescription};
+                                      [] {},          batch.limitDescription,
+                                      &sweeps};
             report.out = savedLine(header.FilePath, options, CheckHeaderAndSave(header, context), dialogs, report);
         });
     });

@@ -3,6 +3,7 @@
 #include <algorithm>
 
 #include "ConsoleDialogs.h"
+#include "FileSave.h"
 #include "OpenDocument.h"
 #include "ParseProgress.h"
 #include "PartFile.h"
@@ -29,10 +30,12 @@ int handleCatching(const std::string& path, HeaderData& header, std::ostream& er
 
 } // namespace
 
-std::optional<HeaderData> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err)
+std::optional<HeaderData> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err,
+                                     FolderSweeps* sweeps)
 {
     dialogs.setCurrentFile(path);
     try {
+        RestoreInterruptedSaveOf(path, dialogs, sweeps);
         const FileBytes content(path);
         HeaderData header;
         ParseProgress silent;

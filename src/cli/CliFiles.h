@@ -9,6 +9,7 @@
 #include "HeaderData.h"
 
 class ConsoleDialogs;
+class FolderSweeps;
 
 // Exit statuses shared by the commands; a larger one wins when several apply.
 namespace ExitStatus {
@@ -21,9 +22,10 @@ inline constexpr int SaveFailed = 3;
 // The one line that names a file that could not be read or worked on.
 void ReportUnreadable(const std::string& path, const std::exception& failure, std::ostream& err);
 
-// Opens path as the Open command does. When the file cannot be read, says so in one line on
-// err and returns nullopt.
-std::optional<HeaderData> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err);
+// Opens path as the Open command does, after undoing what a killed save left there. When the file
+// cannot be read, says so in one line on err and returns nullopt. sweeps: see ReplaceOptions.
+std::optional<HeaderData> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err,
+                                     FolderSweeps* sweeps = nullptr);
 
 // Runs handle on every file that opens and returns the worst status: Unreadable for a file that
 // did not open, otherwise the largest that handle returned.

@@ -93,6 +93,6 @@ SaveResult CheckHeaderAndSave(HeaderData& h, const SaveContext& context)
             return {SaveOutcome::Declined, {}};
     }
     offerFixUps(h, context);
-    const auto saved = FileSave(h, context.newHeader(), context.makeBackup, context.clock, dialogs);
+    const auto saved = FileSave(h, context.newHeader(), context.makeBackup, context.clock, dialogs, context.sweeps);
     return {saved.saved ? SaveOutcome::Saved : SaveOutcome::Failed, saved.backupPath};
 }

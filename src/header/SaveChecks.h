@@ -8,6 +8,7 @@
 
 class Clock;
 class Dialogs;
+class FolderSweeps;
 
 inline constexpr std::size_t DescriptionLimit = 64;
 
@@ -46,7 +47,8 @@ struct SaveContext {
     bool makeBackup;
     std::function<std::string()> newHeader;
     std::function<void()> recompose;
-    bool limitDescription = true; // off: the description may be of any length
+    bool limitDescription = true;   // off: the description may be of any length
+    FolderSweeps* sweeps = nullptr; // see ReplaceOptions
 };
 
 struct SaveResult {

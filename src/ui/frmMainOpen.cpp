@@ -92,6 +92,7 @@ void frmMain::readChosenFile(const std::function<void()>& takeFile, bool removeT
     lblStatuszeile->setText("Parsing file. Please wait...");
     AddRecentFile(app_.Recent, services_.store, app_.Header.FilePath);
     showRecentFiles();
+    RestoreInterruptedSaveOf(app_.Header.FilePath, services_.dialogs);
     GetGlobalContent(app_.Header, services_.dialogs, *progress_);
     lblStatuszeile->setText("");
     fillWindowFromRecord();
