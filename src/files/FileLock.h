@@ -12,6 +12,8 @@
 class FileLock {
 public:
     explicit FileLock(const std::string& path);
+    // The locked file, open for reading; -1 when none is locked.
+    int fd() const { return fd_.get(); }
 
 private:
     FileDescriptor fd_;

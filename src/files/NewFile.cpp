@@ -28,6 +28,8 @@ std::string UniqueNameIn(const std::string& folder, std::string_view prefix)
            std::to_string(random() % 1000000007);
 }
 
+std::string TemporaryNameIn(const std::string& folder) { return UniqueNameIn(folder, TemporaryPrefix); }
+
 bool ProcessIsGone(long pid)
 {
     if (pid <= 0 || pid > INT_MAX)
@@ -115,7 +117,7 @@ bool NewFile::linkAs(const std::string& path)
 void NewFile::nameAndClose()
 {
     if (temporaryName_.empty()) {
-        const auto name = UniqueNameIn(folder_, TemporaryPrefix);
+        const auto name = TemporaryNameIn(folder_);
         if (linkUnnamed(name) != 0)
             throw OsError(errno, reportedPath_);
         temporaryName_ = name;
@@ -138,7 +140,7 @@ int NewFile::openInFolder()
     if (errno != EOPNOTSUPP && errno != EISDIR && errno != EINVAL)
         throw OsError(errno, reportedPath_);
     for (;;) {
-        temporaryName_ = UniqueNameIn(folder_, TemporaryPrefix);
+        temporaryName_ = TemporaryNameIn(folder_);
         const int named = ::open(temporaryName_.c_str(), O_CREAT | O_EXCL | O_WRONLY | O_CLOEXEC, 0600);
         if (named >= 0)
             return named;

@@ -56,6 +56,9 @@ private:
 // A hidden name in folder that no other process uses: prefix, this process's id, a random number.
 std::string UniqueNameIn(const std::string& folder, std::string_view prefix);
 
+// A name for a temporary file in folder, that the next run removes once this process is gone.
+std::string TemporaryNameIn(const std::string& folder);
+
 // True when no process with that id runs any more.
 bool ProcessIsGone(long pid);
 

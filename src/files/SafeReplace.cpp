@@ -112,11 +112,34 @@ std::string makeBackup(const std::string& target, const std::string& backupPath,
     return writeCopy(backupPath, old.view(), original);
 }
 
+struct stat statOf(const std::string& path)
+{
+    struct stat info {};
+    ::stat(path.c_str(), &info);
+    return info;
+}
+
 // The last look before the new text takes the file's name.
 void ensureUnchanged(const std::string& target, const FileStamp& expected)
 {
     if (StampOfPath(target) != expected)
         throw FileChangedError(target);
+}
+
+// The old file keeps a name until the new one is in place and checked: its backup, or else a
+// temporary second name. Empty where the file system has no second names.
+std::string keepAName(const std::string& target, const std::string& backupPath)
+{
+    if (!backupPath.empty() && statOf(backupPath).st_ino == statOf(target).st_ino)
+        return backupPath;
+    auto name = TemporaryNameIn(FolderOf(target));
+    return ::link(target.c_str(), name.c_str()) == 0 ? name : std::string();
+}
+
+bool stillAsRead(int fd, const FileStamp& expected)
+{
+    struct stat now {};
+    return ::fstat(fd, &now) == 0 && StampOf(now) == expected;
 }
 
 // What every road needs to know about the replace it does.
@@ -127,6 +150,7 @@ struct Replace {
     std::initializer_list<std::string_view> pieces;
     const ReplaceOptions& options;
     FileStamp expected;
+    int lockedFd; // the old file, -1 when it could not be locked
 };
 
 // For a file that must keep its inode (several hard links, an owner or attributes a new file
@@ -178,11 +202,19 @@ std::optional<ReplaceResult> replaceByRename(const Replace& r)
     if (r.options.backupPath)
         result.backupPath = makeBackup(r.target, *r.options.backupPath, r.original);
     Undo backup(result.backupPath);
+    const auto oldName = r.exists ? keepAName(r.target, result.backupPath) : std::string();
+    Undo temporaryOldName(oldName == result.backupPath ? std::string() : oldName);
     reach(r.options.afterStep, ReplaceStep::BackupMade);
     file.replace(r.target, [&] {
         ensureUnchanged(r.target, r.expected);
         reach(r.options.afterStep, ReplaceStep::NewTextNamed);
     });
+    // Another program that opened the old file before the rename may have written to it since the
+    // last look: then the old file, with that write, takes its name back.
+    if (!oldName.empty() && r.lockedFd >= 0 && !stillAsRead(r.lockedFd, r.expected)) {
+        ::rename(oldName.c_str(), r.target.c_str());
+        throw FileChangedError(r.target);
+    }
     backup.keep();
     reach(r.options.afterStep, ReplaceStep::Placed);
     return result;
@@ -254,17 +286,17 @@ ReplaceResult ReplaceFileSafely(const std::string& path, std::initializer_list<s
                                 const ReplaceOptions& options)
 {
     const auto target = ResolveLinks(path);
+    const auto folder = FolderOf(target);
+    sweep(folder, options.sweeps);
     const FileLock lock(target);
     RestoreInterruptedRewrite(target);
     struct stat original {};
     const bool exists = ::stat(target.c_str(), &original) == 0;
-    const Replace replace{target, original, exists,
-                          pieces, options,  options.expected.value_or(exists ? StampOf(original) : FileStamp{})};
-    ensureUnchanged(target, replace.expected);
+    const auto expected = options.expected.value_or(exists ? StampOf(original) : FileStamp{});
+    const Replace replace{target, original, exists, pieces, options, expected, lock.fd()};
+    ensureUnchanged(target, expected);
     if (exists)
         checkWritable(target, original);
-    const auto folder = FolderOf(target);
-    sweep(folder, options.sweeps);
     // A file this user may write in a folder where he may not create files can only be rewritten
     // in place, with the copy of its old bytes in the temporary folder.
     const bool folderWritable = ::faccessat(AT_FDCWD, folder.c_str(), W_OK | X_OK, AT_EACCESS) == 0;

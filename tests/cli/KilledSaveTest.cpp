@@ -4,6 +4,8 @@
 // leftover of the save.
 #include <gtest/gtest.h>
 
+#include <chrono>
+#include <csignal>
 #include <fcntl.h>
 #include <filesystem>
 #include <fstream>
@@ -11,6 +13,7 @@
 #include <sstream>
 #include <sys/stat.h>
 #include <sys/wait.h>
+#include <thread>
 #include <unistd.h>
 
 #include "CliFiles.h"
@@ -212,6 +215,43 @@ TEST(CutOffCliSave, EndsBetweenFilesWithEpipe)
         saved += bytes != OldPart;
     }
     EXPECT_LT(saved, 400u) << "the run went on after its output was gone";
+}
+
+// Ctrl+C ends a run between files: the files begun are finished, the rest are left alone, and the
+// run says so with exit status 3.
+TEST(InterruptedCliSave, EndsBetweenFiles)
+{
+    TempDir dir;
+    std::vector<std::string> args{QUILLMARK_CLI, "save", "-j", "2"};
+    for (int i = 0; i < 400; ++i)
+        args.push_back(dir.write(std::to_string(i) + ".dat", OldPart));
+    const pid_t child = ::fork();
+    if (child == 0) {
+        const int err = ::open(dir.file("err.txt").c_str(), O_WRONLY | O_CREAT, 0600);
+        ::dup2(err, STDERR_FILENO);
+        ::dup2(::open("/dev/null", O_WRONLY), STDOUT_FILENO);
+        std::vector<char*> argv;
+        for (const auto& arg : args)
+            argv.push_back(const_cast<char*>(arg.c_str()));
+        argv.push_back(nullptr);
+        ::execv(argv[0], argv.data());
+        ::_exit(127);
+    }
+    while (ReadBytes(dir.file("0.dat")) == OldPart) // the run has begun
+        std::this_thread::sleep_for(std::chrono::milliseconds(1));
+    ::kill(child, SIGINT);
+    int status = 0;
+    ::waitpid(child, &status, 0);
+    ASSERT_TRUE(WIFEXITED(status)) << "ended by signal " << WTERMSIG(status);
+    EXPECT_EQ(WEXITSTATUS(status), 3);
+    EXPECT_NE(ReadBytes(dir.file("err.txt")).find("interrupted; the run ends here"), std::string::npos);
+    std::size_t saved = 0;
+    for (int i = 0; i < 400; ++i) {
+        const auto bytes = ReadBytes(dir.file(std::to_string(i) + ".dat"));
+        EXPECT_TRUE(bytes == OldPart || bytes.size() < OldPart.size()) << i;
+        saved += bytes != OldPart;
+    }
+    EXPECT_LT(saved, 400u) << "the run went on after Ctrl+C";
 }
 
 } // namespace

@@ -160,19 +160,27 @@ TEST(TornRewrite, IsUndoneByTheNextOpen)
 }
 
 // Another program appends to the part, or removes it, after the new text is on disk and before
-// it takes the name: the save ends as changed and leaves the other program's work alone.
+// it takes the name, or writes to the old file it opened before in the instant between the last
+// look and the rename: the save ends as changed and leaves the other program's work alone.
 TEST(ChangedWhileSaving, EndsTheSaveAndKeepsTheOtherWrite)
 {
-    for (const bool hardLinked : {false, true}) {
-        for (const bool removed : {false, true}) {
+    struct Case {
+        bool hardLinked, removed;
+        ReplaceStep when;
+    };
+    for (const auto [hardLinked, removed, when] :
+         {Case{false, false, ReplaceStep::BackupMade}, Case{false, true, ReplaceStep::BackupMade},
+          Case{true, false, ReplaceStep::BackupMade}, Case{true, true, ReplaceStep::BackupMade},
+          Case{false, false, ReplaceStep::NewTextNamed}}) {
+        for (const bool backup : {false, true}) {
             TempDir dir;
             const auto path = dir.write("3001.dat", OldContent);
             if (hardLinked)
                 fs::create_hard_link(path, dir.file("second.dat"));
-            auto options = withBackup(dir.file(BackupName));
+            auto options = backup ? withBackup(dir.file(BackupName)) : ReplaceOptions{};
             options.expected = StampOfPath(path);
-            options.afterStep = [&](ReplaceStep reached) {
-                if (reached != ReplaceStep::BackupMade)
+            options.afterStep = [&, removed = removed, when = when](ReplaceStep reached) {
+                if (reached != when)
                     return;
                 if (removed)
                     fs::remove(path);
