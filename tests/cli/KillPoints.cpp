@@ -23,70 +23,26 @@ bool onFile(int fd)
 void count(const char* name, bool onAFile)
 {
     const char* call = std::getenv("QUILLMARK_KILL_CALL");
-    const char* at = std::getenv("QUILLMARK_KILL_AT");
-    if (!onAFile || call == nullptr || at == nullptr || std::strcmp(call, name) != 0)
-        return;
-    if (++calls == std::atol(at))
+    if (onAFile && call != nullptr && std::strcmp(call, name) == 0 &&
+        ++calls == std::atol(std::getenv("QUILLMARK_KILL_AT")))
         ::raise(SIGKILL);
-}
-
-template <typename Function>
-Function* real(const char* name)
-{
-    return reinterpret_cast<Function*>(::dlsym(RTLD_NEXT, name));
 }
 
 } // namespace
 
-extern "C" {
-ssize_t write(int fd, const void* bytes, size_t size)
-{
-    count("write", onFile(fd));
-    return real<ssize_t(int, const void*, size_t)>("write")(fd, bytes, size);
-}
-int fsync(int fd)
-{
-    count("fsync", onFile(fd));
-    return real<int(int)>("fsync")(fd);
-}
-int ftruncate(int fd, off_t size) noexcept
-{
-    count("ftruncate", true);
-    return real<int(int, off_t)>("ftruncate")(fd, size);
-}
-int fchmod(int fd, mode_t mode) noexcept
-{
-    count("fchmod", true);
-    return real<int(int, mode_t)>("fchmod")(fd, mode);
-}
-int fchown(int fd, uid_t owner, gid_t group) noexcept
-{
-    count("fchown", true);
-    return real<int(int, uid_t, gid_t)>("fchown")(fd, owner, group);
-}
-int fsetxattr(int fd, const char* name, const void* value, size_t size, int flags) noexcept
-{
-    count("fsetxattr", true);
-    return real<int(int, const char*, const void*, size_t, int)>("fsetxattr")(fd, name, value, size, flags);
-}
-int link(const char* from, const char* to) noexcept
-{
-    count("link", true);
-    return real<int(const char*, const char*)>("link")(from, to);
-}
-int linkat(int fromFolder, const char* from, int toFolder, const char* to, int flags) noexcept
-{
-    count("linkat", true);
-    return real<int(int, const char*, int, const char*, int)>("linkat")(fromFolder, from, toFolder, to, flags);
-}
-int rename(const char* from, const char* to) noexcept
-{
-    count("rename", true);
-    return real<int(const char*, const char*)>("rename")(from, to);
-}
-int unlink(const char* path) noexcept
-{
-    count("unlink", true);
-    return real<int(const char*)>("unlink")(path);
-}
-}
+// Each function counts its call, then does what the system's own does.
+#define KILL_POINT(Result, name, parameters, arguments, onAFile)                                                       \
+    extern "C" Result name parameters                                                                                  \
+    {                                                                                                                  \
+        count(#name, onAFile);                                                                                         \
+        return reinterpret_cast<Result(*) parameters>(::dlsym(RTLD_NEXT, #name)) arguments;                            \
+    }
+
+KILL_POINT(ssize_t, write, (int fd, const void* bytes, size_t size), (fd, bytes, size), onFile(fd))
+KILL_POINT(int, fsync, (int fd), (fd), onFile(fd))
+KILL_POINT(int, ftruncate, (int fd, off_t size), (fd, size), true)
+KILL_POINT(int, link, (const char* from, const char* to), (from, to), true)
+KILL_POINT(int, linkat, (int fromFolder, const char* from, int toFolder, const char* to, int flags),
+           (fromFolder, from, toFolder, to, flags), true)
+KILL_POINT(int, rename, (const char* from, const char* to), (from, to), true)
+KILL_POINT(int, unlink, (const char* path), (path), true)

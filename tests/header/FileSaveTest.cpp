@@ -23,13 +23,6 @@ const std::string NewHeader = "0 new\r\n\r\n";
 const std::string NewContent = "0 new\r\n\r\n1 16 a.dat\r\n";
 const std::string BackupName = "3001_Backup_2008-08-10_14-05-09.dat";
 
-struct stat statOf(const std::string& path)
-{
-    struct stat info {};
-    ::lstat(path.c_str(), &info);
-    return info;
-}
-
 TEST(MakeBackupName, StampBetweenBaseAndExtension)
 {
     const LocalDateTime stamp{2008, 8, 10, 14, 5, 9};
@@ -75,7 +68,7 @@ TEST_F(FileSaving, WritesTheNewTextKeepingPermissionsAndTheOldInTheBackup)
     EXPECT_TRUE(save(false).saved);
     EXPECT_FALSE(h.FileChanged);
     EXPECT_EQ(NamesIn(dir.path()), std::set<std::string>{"3001.dat"});
-    EXPECT_EQ(statOf(h.FilePath).st_mode & 0777, 0640u);
+    EXPECT_EQ(StatOf(h.FilePath).st_mode & 0777, 0640u);
     TempDir::writeTo(h.FilePath, OldContent);
     h.ReadStamp.reset();
     h.ByteOrderMark = true; // read before the first line, and written back there
@@ -135,7 +128,7 @@ TEST_F(FileSaving, ThroughASymbolicLinkTheTargetIsWrittenAndTheLinkStays)
     EXPECT_TRUE(fs::is_symlink(h.FilePath));
     EXPECT_EQ(ReadBytes(dir.file("3001.dat")), NewContent);
     EXPECT_EQ(result.backupPath, dir.file(BackupName));
-    EXPECT_TRUE(S_ISREG(statOf(result.backupPath).st_mode));
+    EXPECT_TRUE(S_ISREG(StatOf(result.backupPath).st_mode));
     EXPECT_EQ(ReadBytes(result.backupPath), OldContent);
     EXPECT_EQ(NamesIn(dir.path() / "models"), std::set<std::string>{"link.dat"});
 }
@@ -143,11 +136,11 @@ TEST_F(FileSaving, ThroughASymbolicLinkTheTargetIsWrittenAndTheLinkStays)
 TEST_F(FileSaving, EveryHardLinkShowsTheNewContent)
 {
     fs::create_hard_link(h.FilePath, dir.file("other.dat"));
-    const auto inode = statOf(h.FilePath).st_ino;
+    const auto inode = StatOf(h.FilePath).st_ino;
     for (const bool backup : {false, true})
         ASSERT_TRUE(save(backup).saved);
     EXPECT_EQ(ReadBytes(dir.file("other.dat")), NewContent);
-    EXPECT_EQ(statOf(h.FilePath).st_ino, inode);
+    EXPECT_EQ(StatOf(h.FilePath).st_ino, inode);
     EXPECT_EQ(ReadBytes(dir.file(BackupName)), NewContent); // a copy, not a third name
     EXPECT_EQ(NamesIn(dir.path()), (std::set<std::string>{"3001.dat", "other.dat", BackupName}));
 }
