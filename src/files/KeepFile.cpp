@@ -92,6 +92,19 @@ std::string WriteKeepFile(const std::string& folder, const struct stat& part, st
     return path;
 }
 
+bool HasKeepFile(const std::string& path)
+{
+    struct stat part {
+    }, keep{};
+    if (::stat(path.c_str(), &part) != 0)
+        return false;
+    const auto folder = FolderOf(path);
+    for (const auto& keepFolder : {folder, KeepFolderFor(folder)})
+        if (::lstat(keepPathIn(keepFolder, part).c_str(), &keep) == 0)
+            return true;
+    return false;
+}
+
 bool RestoreInterruptedRewrite(const std::string& path)
 {
     struct stat part {};

@@ -29,6 +29,9 @@ std::string WriteKeepFile(const std::string& folder, const struct stat& part, st
 // temporary folder for a folder where this user may not create files.
 std::string KeepFolderFor(const std::string& folder);
 
+// True when a keep file for the file at path exists: a look at its name, nothing read.
+bool HasKeepFile(const std::string& path);
+
 // Looks for the keep file of the file at path left by a process that no longer runs. When the
 // file does not hold that rewrite's complete new text, writes the kept old bytes back over it.
 // Removes the keep file. True when old bytes were written back. The caller holds the file's lock.

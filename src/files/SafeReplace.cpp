@@ -315,6 +315,8 @@ bool RestoreInterruptedSave(const std::string& path, FolderSweeps* sweeps)
 {
     const auto target = ResolveLinks(path);
     sweep(FolderOf(target), sweeps);
+    if (!HasKeepFile(target))
+        return false; // the usual case, found without taking the lock
     const FileLock lock(target);
     return RestoreInterruptedRewrite(target);
 }
