@@ -1,14 +1,11 @@
-// Preloaded into quillmark-cli by the killed-save tests: kills the process on entry to the
-// count-th call of one file-changing function, counting only calls on files and folders
-// (QUILLMARK_KILL_CALL=write QUILLMARK_KILL_AT=3), as a crash or kill -9 at that moment would.
+// Preloaded into quillmark-cli by the killed-save tests: kills it on entry to the count-th call on a
+// file or folder of one function (QUILLMARK_KILL_CALL=write QUILLMARK_KILL_AT=3), as kill -9 would.
 #include <atomic>
 #include <csignal>
 #include <cstdlib>
 #include <cstring>
 #include <dlfcn.h>
 #include <sys/stat.h>
-#include <sys/types.h>
-#include <unistd.h>
 
 namespace {
 

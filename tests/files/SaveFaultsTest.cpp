@@ -7,7 +7,6 @@
 #include <dlfcn.h>
 #include <fcntl.h>
 #include <filesystem>
-#include <sys/stat.h>
 #include <unistd.h>
 
 #include "ErrorNumber.h"
