@@ -87,14 +87,15 @@ void noteFindings(FileReport& report, const SaveFindings& findings)
     report.fixups = findings.fixups;
 }
 
-// Opens the file at path and lets handle fill the report; an unreadable file is reported as such.
-FileReport reportOn(const std::string& path, ConsoleDialogs::Answerer answerer, FolderSweeps& sweeps,
+// Opens the file at path (see OpenForCli for restoreWith) and lets handle fill the report; an
+// unreadable file is reported as such.
+FileReport reportOn(const std::string& path, ConsoleDialogs::Answerer answerer, FolderSweeps* restoreWith,
                     const std::function<void(HeaderData&, ConsoleDialogs&, FileReport&)>& handle)
 {
     FileReport report;
     std::ostringstream err;
     ConsoleDialogs dialogs(err, std::move(answerer));
-    auto header = OpenForCli(path, dialogs, err, &sweeps);
+    auto header = OpenForCli(path, dialogs, err, restoreWith);
     if (!header) {
         report.unreadable = true;
         report.status = ExitStatus::Unreadable;
@@ -198,9 +199,9 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
     StringList categories;
     if (options.tracker && !readCategories(categories, err))
         return ExitStatus::Unreadable;
-    FolderSweeps sweeps;
+    // A check never writes, not even to undo what a killed save left: the next save does that.
     return runBatch(arguments, batch, out, err, [&](const std::string& path) {
-        return reportOn(path, {}, sweeps, [&](HeaderData& header, ConsoleDialogs&, FileReport& report) {
+        return reportOn(path, {}, nullptr, [&](HeaderData& header, ConsoleDialogs&, FileReport& report) {
             const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
             TrackerFindings tracker; // empty unless asked for
             if (options.tracker)
@@ -235,7 +236,7 @@ int RunSave(const std::vector<std::string>& arguments, const SaveOptions& option
     FolderSweeps sweeps;
     return runBatch(arguments, batch, out, err, [&](const std::string& path) {
         const std::lock_guard lock(locks.of(path));
-        return reportOn(path, answer, sweeps, [&](HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
+        return reportOn(path, answer, &sweeps, [&](HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
             const SaveContext context{dialogs,        clock,
                                       options.backup, [&header] { return ComposeHeader(header); },
                                       [] {},          batch.limitDescription,

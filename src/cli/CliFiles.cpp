@@ -31,11 +31,12 @@ int handleCatching(const std::string& path, HeaderData& header, std::ostream& er
 } // namespace
 
 std::optional<HeaderData> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err,
-                                     FolderSweeps* sweeps)
+                                     FolderSweeps* restoreWith)
 {
     dialogs.setCurrentFile(path);
     try {
-        RestoreInterruptedSaveOf(path, dialogs, sweeps);
+        if (restoreWith != nullptr)
+            RestoreInterruptedSaveOf(path, dialogs, restoreWith);
         const FileBytes content(path);
         HeaderData header;
         ParseProgress silent;

@@ -22,10 +22,11 @@ inline constexpr int SaveFailed = 3;
 // The one line that names a file that could not be read or worked on.
 void ReportUnreadable(const std::string& path, const std::exception& failure, std::ostream& err);
 
-// Opens path as the Open command does, after undoing what a killed save left there. When the file
-// cannot be read, says so in one line on err and returns nullopt. sweeps: see ReplaceOptions.
+// Opens path as the Open command does; with restoreWith (see ReplaceOptions::sweeps), after undoing
+// what a killed save left there, as a command that writes does first. When the file cannot be read,
+// says so in one line on err and returns nullopt.
 std::optional<HeaderData> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err,
-                                     FolderSweeps* sweeps = nullptr);
+                                     FolderSweeps* restoreWith = nullptr);
 
 // Runs handle on every file that opens and returns the worst status: Unreadable for a file that
 // did not open, otherwise the largest that handle returned.

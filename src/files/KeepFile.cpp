@@ -99,10 +99,10 @@ bool HasKeepFile(const std::string& path)
     if (::stat(path.c_str(), &part) != 0)
         return false;
     const auto folder = FolderOf(path);
-    for (const auto& keepFolder : {folder, KeepFolderFor(folder)})
-        if (::lstat(keepPathIn(keepFolder, part).c_str(), &keep) == 0)
-            return true;
-    return false;
+    if (::lstat(keepPathIn(folder, part).c_str(), &keep) == 0)
+        return true;
+    const auto keepFolder = KeepFolderFor(folder);
+    return keepFolder != folder && ::lstat(keepPathIn(keepFolder, part).c_str(), &keep) == 0;
 }
 
 bool RestoreInterruptedRewrite(const std::string& path)

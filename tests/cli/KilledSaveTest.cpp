@@ -13,6 +13,7 @@
 
 #include "CliFiles.h"
 #include "ConsoleDialogs.h"
+#include "NewFile.h"
 #include "Processes.h"
 #include "TempDir.h"
 
@@ -75,7 +76,8 @@ std::string killAt(const Road& road, const std::string& call, int count, const s
     const int opened = WaitFor(StartChild(road.asNobody(), [&] {
         std::ostringstream err;
         ConsoleDialogs dialogs(err);
-        OpenForCli(path, dialogs, err);
+        FolderSweeps sweeps;
+        OpenForCli(path, dialogs, err, &sweeps);
         ::_exit(err.str().find("restored " + path + " from an interrupted save") == std::string::npos ? 0 : 1);
     }));
     const auto bytes = ReadBytes(path);
