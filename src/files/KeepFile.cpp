@@ -1,5 +1,6 @@
 #include "KeepFile.h"
 
+#include <array>
 #include <cerrno>
 #include <cinttypes>
 #include <cstdio>
@@ -51,12 +52,23 @@ bool parseRecord(std::string_view keep, KeepRecord& record)
     return true;
 }
 
-// A keep file this user made: a regular file of his, never one that another user put in a
-// shared temporary folder to have its bytes written into the part.
-bool isOwnKeepFile(const std::string& path)
+// A keep file made by someone who may write the part anyway: this user, the part's owner, its
+// group when the group may write it, anyone when everyone may. Never one that another user put
+// in a shared temporary folder to have its bytes written into a part he may not write.
+bool mayStandFor(const std::string& keepPath, const struct stat& part)
 {
-    struct stat info {};
-    return ::lstat(path.c_str(), &info) == 0 && S_ISREG(info.st_mode) && info.st_uid == ::geteuid();
+    struct stat keep {};
+    if (::lstat(keepPath.c_str(), &keep) != 0 || !S_ISREG(keep.st_mode))
+        return false;
+    return keep.st_uid == ::geteuid() || keep.st_uid == part.st_uid ||
+           (keep.st_gid == part.st_gid && (part.st_mode & S_IWGRP) != 0) || (part.st_mode & S_IWOTH) != 0;
+}
+
+// Where the keep file of the file at path may be: which of the two it is depends on the rights of
+// the user who saved, not of the one who looks.
+std::array<std::string, 2> keepFoldersFor(const std::string& path)
+{
+    return {FolderOf(path), std::filesystem::temp_directory_path().string()};
 }
 
 } // namespace
@@ -98,11 +110,10 @@ bool HasKeepFile(const std::string& path)
     }, keep{};
     if (::stat(path.c_str(), &part) != 0)
         return false;
-    const auto folder = FolderOf(path);
-    if (::lstat(keepPathIn(folder, part).c_str(), &keep) == 0)
-        return true;
-    const auto keepFolder = KeepFolderFor(folder);
-    return keepFolder != folder && ::lstat(keepPathIn(keepFolder, part).c_str(), &keep) == 0;
+    for (const auto& keepFolder : keepFoldersFor(path))
+        if (::lstat(keepPathIn(keepFolder, part).c_str(), &keep) == 0)
+            return true;
+    return false;
 }
 
 bool RestoreInterruptedRewrite(const std::string& path)
@@ -110,11 +121,10 @@ bool RestoreInterruptedRewrite(const std::string& path)
     struct stat part {};
     if (::stat(path.c_str(), &part) != 0)
         return false;
-    const auto folder = FolderOf(path);
-    for (const auto& keepFolder : {folder, KeepFolderFor(folder)}) {
+    for (const auto& keepFolder : keepFoldersFor(path)) {
         const auto keepPath = keepPathIn(keepFolder, part);
         KeepRecord record;
-        if (!isOwnKeepFile(keepPath))
+        if (!mayStandFor(keepPath, part))
             continue;
         const FileBytes keep(keepPath);
         if (!parseRecord(keep.view(), record) || !ProcessIsGone(record.pid))

@@ -25,8 +25,8 @@ TextFingerprint FingerprintOf(std::initializer_list<std::string_view> pieces);
 std::string WriteKeepFile(const std::string& folder, const struct stat& part, std::string_view oldBytes,
                           const TextFingerprint& newText);
 
-// The folders a keep file for a file in folder can stand in: the folder itself, and the
-// temporary folder for a folder where this user may not create files.
+// The folder where this user keeps the keep files of the files in folder: the folder itself, or
+// the temporary folder when he may not create files there.
 std::string KeepFolderFor(const std::string& folder);
 
 // True when a keep file for the file at path exists: a look at its name, nothing read.

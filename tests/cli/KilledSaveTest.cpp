@@ -51,8 +51,8 @@ void execCli(std::vector<std::string> args, const std::string& errPath = "/dev/n
     ::_exit(127);
 }
 
-// Saves a fresh copy of the part on road, killed at the count-th call of call, opens it again as
-// the same user, and says what it holds then: "old", "new", or what went wrong. Empty when the
+// Saves a fresh copy of the part on road, killed at the count-th call of call, opens it again, and
+// says what it holds then: "old", "new", or what went wrong. Empty when the
 // save ran to its end as it should.
 std::string killAt(const Road& road, const std::string& call, int count, const std::string& newBytes)
 {
@@ -73,7 +73,7 @@ std::string killAt(const Road& road, const std::string& call, int count, const s
         execCli(road.noWriteFolder ? std::vector<std::string>{"save", "-j", "1", "--no-backup", path}
                                    : std::vector<std::string>{"save", "-j", "1", path});
     }));
-    const int opened = WaitFor(StartChild(road.asNobody(), [&] {
+    const int opened = WaitFor(StartChild(false, [&] { // as root: another user than the saving one
         std::ostringstream err;
         ConsoleDialogs dialogs(err);
         FolderSweeps sweeps;
