@@ -1,9 +1,11 @@
 #include "FileLock.h"
 
 #include <cerrno>
+#include <csignal>
 #include <fcntl.h>
 #include <sys/file.h>
 #include <sys/stat.h>
+#include <thread>
 
 namespace {
 
@@ -32,4 +34,19 @@ FileLock::FileLock(const std::string& path)
             return;
         }
     }
+}
+
+void FileLock::waitUntilOthersClosed(std::chrono::milliseconds patience) const
+{
+    // Someone opening the file while the lease is held is announced with SIGURG, which is ignored,
+    // instead of SIGIO, which would end the program.
+    if (!fd_.valid() || ::fcntl(fd_.get(), F_SETSIG, SIGURG) != 0)
+        return;
+    const auto giveUp = std::chrono::steady_clock::now() + patience;
+    while (::fcntl(fd_.get(), F_SETLEASE, F_WRLCK) != 0) {
+        if (errno != EAGAIN || std::chrono::steady_clock::now() >= giveUp)
+            return;
+        std::this_thread::sleep_for(std::chrono::milliseconds(1));
+    }
+    ::fcntl(fd_.get(), F_SETLEASE, F_UNLCK);
 }

@@ -1,5 +1,6 @@
 #pragma once
 
+#include <chrono>
 #include <string>
 
 #include "FileDescriptor.h"
@@ -14,6 +15,10 @@ public:
     explicit FileLock(const std::string& path);
     // The locked file, open for reading; -1 when none is locked.
     int fd() const { return fd_.get(); }
+    // Waits, up to patience, until no other process has the locked file open, as far as the system
+    // tells (a write lease can be taken on it): not on file systems without leases, nor for a file
+    // of another user.
+    void waitUntilOthersClosed(std::chrono::milliseconds patience) const;
 
 private:
     FileDescriptor fd_;

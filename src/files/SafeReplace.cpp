@@ -20,6 +20,8 @@ namespace {
 
 // A backup name is tried with these numbers before the save gives up.
 constexpr int MostBackupNumbers = 1000;
+// How long a save waits for another program that has the old file open to close it.
+constexpr std::chrono::milliseconds PatienceWithWriters{100};
 
 void reach(const ReplaceStepHook& afterStep, ReplaceStep step)
 {
@@ -150,7 +152,7 @@ struct Replace {
     std::initializer_list<std::string_view> pieces;
     const ReplaceOptions& options;
     FileStamp expected;
-    int lockedFd; // the old file, -1 when it could not be locked
+    const FileLock& lock; // on the old file
 };
 
 // For a file that must keep its inode (several hard links, an owner or attributes a new file
@@ -209,11 +211,17 @@ std::optional<ReplaceResult> replaceByRename(const Replace& r)
         ensureUnchanged(r.target, r.expected);
         reach(r.options.afterStep, ReplaceStep::NewTextNamed);
     });
+    SyncFolder(FolderOf(r.target));
     // Another program that opened the old file before the rename may have written to it since the
-    // last look: then the old file, with that write, takes its name back.
-    if (!oldName.empty() && r.lockedFd >= 0 && !stillAsRead(r.lockedFd, r.expected)) {
-        ::rename(oldName.c_str(), r.target.c_str());
-        throw FileChangedError(r.target);
+    // last look: once it has closed the file (or after a short wait), the old file, with that write,
+    // takes its name back.
+    if (!oldName.empty() && r.lock.fd() >= 0) {
+        r.lock.waitUntilOthersClosed(PatienceWithWriters);
+        if (!stillAsRead(r.lock.fd(), r.expected)) {
+            ::rename(oldName.c_str(), r.target.c_str());
+            SyncFolder(FolderOf(r.target));
+            throw FileChangedError(r.target);
+        }
     }
     backup.keep();
     reach(r.options.afterStep, ReplaceStep::Placed);
@@ -293,7 +301,7 @@ ReplaceResult ReplaceFileSafely(const std::string& path, std::initializer_list<s
     struct stat original {};
     const bool exists = ::stat(target.c_str(), &original) == 0;
     const auto expected = options.expected.value_or(exists ? StampOf(original) : FileStamp{});
-    const Replace replace{target, original, exists, pieces, options, expected, lock.fd()};
+    const Replace replace{target, original, exists, pieces, options, expected, lock};
     ensureUnchanged(target, expected);
     if (exists)
         checkWritable(target, original);
@@ -305,9 +313,10 @@ ReplaceResult ReplaceFileSafely(const std::string& path, std::initializer_list<s
     std::optional<ReplaceResult> result;
     if (!keepInode)
         result = replaceByRename(replace);
-    if (!result)
+    if (!result) {
         result = rewriteInPlace(replace);
-    SyncFolder(folder);
+        SyncFolder(folder);
+    }
     return *result;
 }
 

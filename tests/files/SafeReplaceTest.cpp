@@ -4,6 +4,7 @@
 
 #include <cstring>
 #include <fstream>
+#include <memory>
 #include <sys/wait.h>
 #include <sys/xattr.h>
 #include <thread>
@@ -91,6 +92,25 @@ TEST(ChangedWhileSaving, EndsTheSaveAndKeepsTheOtherWrite)
             EXPECT_EQ(names, removed ? std::set<std::string>{} : std::set<std::string>{"3001.dat"});
         }
     }
+}
+
+// A program that opened the old file before the rename writes to it a moment after: the save waits
+// for it to close the file, sees the write and gives the old file its name back.
+TEST(ChangedWhileSaving, ALateWriteToTheOldFileIsKept)
+{
+    TempDir dir;
+    const auto path = dir.write("3001.dat", OldContent);
+    ReplaceOptions options;
+    std::jthread writer;
+    options.afterStep = [&](ReplaceStep reached) {
+        if (reached == ReplaceStep::NewTextNamed)
+            writer = std::jthread([out = std::make_shared<std::ofstream>(path, std::ios::app)] {
+                std::this_thread::sleep_for(std::chrono::milliseconds(20));
+                *out << "1 4 theirs.dat\r\n";
+            });
+    };
+    EXPECT_THROW(ReplaceFileSafely(path, {NewContent}, options), FileChangedError);
+    EXPECT_EQ(ReadBytes(path), OldContent + "1 4 theirs.dat\r\n");
 }
 
 // Two saves of one file at once take turns: the second one checks after the first one has put its
