@@ -4,6 +4,7 @@
 #include <atomic>
 #include <chrono>
 #include <condition_variable>
+#include <csignal>
 #include <cstdio>
 #include <mutex>
 #include <optional>
@@ -45,46 +46,79 @@ private:
     std::chrono::steady_clock::time_point lastDrawn_{};
 };
 
-FileReport takeWhenDone(std::optional<FileReport>& slot, std::mutex& mutex, std::condition_variable& finished)
+// The next report in order once a worker has it; none when the workers stopped before it.
+std::optional<FileReport> takeWhenDone(std::optional<FileReport>& slot, std::mutex& mutex,
+                                       std::condition_variable& finished, const std::size_t& working)
 {
     std::unique_lock lock(mutex);
-    finished.wait(lock, [&slot] { return slot.has_value(); });
-    auto report = std::move(*slot);
+    finished.wait(lock, [&] { return slot.has_value() || working == 0; });
+    auto report = std::move(slot);
     slot.reset();
     return report;
 }
 
 } // namespace
 
-void RunInOrder(std::size_t count, unsigned threads, const std::function<FileReport(std::size_t)>& work,
-                const std::function<void(FileReport&)>& emit, std::ostream* progress)
+bool RunInOrder(std::size_t count, unsigned threads, const std::function<FileReport(std::size_t)>& work,
+                const std::function<bool(FileReport&)>& emit, std::ostream* progress)
 {
     std::vector<std::optional<FileReport>> reports(count);
     std::mutex mutex;
     std::condition_variable finished;
     std::atomic<std::size_t> next{0};
+    std::atomic<bool> stopped{false};
+    const auto planned = std::min<std::size_t>(threads, count);
+    std::size_t working = planned;
+    const auto mayBegin = [&] { return !stopped && !InterruptPending(); };
     const auto worker = [&] {
-        for (auto index = next++; index < count; index = next++) {
+        for (auto index = next++; index < count && mayBegin(); index = next++) {
             auto report = work(index);
             const std::lock_guard lock(mutex);
             reports[index] = std::move(report);
             finished.notify_one();
         }
+        const std::lock_guard lock(mutex);
+        --working;
+        finished.notify_one();
     };
     std::vector<std::jthread> pool;
     try {
-        for (std::size_t i = 0; i < std::min<std::size_t>(threads, count); ++i)
+        for (std::size_t i = 0; i < planned; ++i)
             pool.emplace_back(worker);
     } catch (const std::system_error&) {
         // A process or thread limit: the run goes on with the threads it has.
+        const std::lock_guard lock(mutex);
+        working -= planned - pool.size();
     }
     ProgressLine line(progress, count);
     for (std::size_t index = 0; index < count; ++index) {
         // Without a single thread of its own, the calling thread does the work, one file at a time.
-        auto report = pool.empty() ? work(next++) : takeWhenDone(reports[index], mutex, finished);
-        emit(report);
+        auto report = !pool.empty() ? takeWhenDone(reports[index], mutex, finished, working)
+                      : mayBegin()  ? std::optional(work(next++))
+                                    : std::nullopt;
+        if (!report)
+            return false; // the run stopped before this file
+        if (!emit(*report))
+            stopped = true;
         line.show(index + 1);
     }
+    return !stopped;
+}
+
+void HoldInterrupts()
+{
+    sigset_t interrupts;
+    ::sigemptyset(&interrupts);
+    ::sigaddset(&interrupts, SIGINT);
+    ::sigaddset(&interrupts, SIGTERM);
+    ::pthread_sigmask(SIG_BLOCK, &interrupts, nullptr);
+}
+
+bool InterruptPending()
+{
+    sigset_t pending;
+    return ::sigpending(&pending) == 0 &&
+           (::sigismember(&pending, SIGINT) == 1 || ::sigismember(&pending, SIGTERM) == 1);
 }
 
 unsigned ThreadsFor(unsigned asked) { return asked > 0 ? asked : std::max(1u, std::thread::hardware_concurrency()); }

@@ -1,5 +1,7 @@
 #include "CheckCommands.h"
 
+#include <cerrno>
+#include <cstring>
 #include <filesystem>
 #include <map>
 #include <mutex>
@@ -17,6 +19,7 @@
 #include "FileSave.h"
 #include "HeaderEdits.h"
 #include "ListFolder.h"
+#include "NewFile.h"
 #include "PartFileList.h"
 #include "QmError.h"
 #include "Summary.h"
@@ -98,15 +101,16 @@ void noteFindings(FileReport& report, const SaveFindings& findings)
     report.fixups = findings.fixups;
 }
 
-// Opens the file at path and lets handle fill the report; an unreadable file is reported as such.
-// Quiet, the messages of the file's dialogs are not shown.
+// Opens the file at path (see OpenForCli for keep and restoreWith) and lets handle fill the
+// report; an unreadable file is reported as such. Quiet, the messages of the file's dialogs are
+// not shown.
 FileReport reportOn(const std::string& path, bool quiet, ConsoleDialogs::Answerer answerer, KeepBytes keep,
-                    const std::function<void(OpenedPart&, ConsoleDialogs&, FileReport&)>& handle)
+                    FolderSweeps* restoreWith, const std::function<void(OpenedPart&, ConsoleDialogs&, FileReport&)>& handle)
 {
     FileReport report;
     std::ostringstream err, discarded;
     ConsoleDialogs dialogs(quiet ? discarded : err, std::move(answerer));
-    auto opened = OpenForCli(path, dialogs, err, keep);
+    auto opened = OpenForCli(path, dialogs, err, keep, restoreWith);
     if (!opened) {
         report.unreadable = true;
         report.status = ExitStatus::Unreadable;
@@ -124,6 +128,12 @@ FileReport reportOn(const std::string& path, bool quiet, ConsoleDialogs::Answere
     return report;
 }
 
+std::string outputClosedText(int error)
+{
+    const char* name = ::strerrorname_np(error);
+    return std::string("standard output closed (") + (name != nullptr ? name : "error") + ")";
+}
+
 int runBatch(const std::vector<std::string>& arguments, const BatchOptions& batch, std::ostream& out, std::ostream& err,
              const std::function<FileReport(const std::string&)>& work)
 {
@@ -134,15 +144,26 @@ int runBatch(const std::vector<std::string>& arguments, const BatchOptions& batc
     Summary summary;
     summary.addWalks(found);
     int status = found.problems.empty() ? ExitStatus::Ok : ExitStatus::Unreadable;
-    RunInOrder(
+    int outputError = 0;
+    const bool whole = RunInOrder(
         files.size(), ThreadsFor(batch.threads), [&](std::size_t index) { return work(files[index]); },
         [&](FileReport& report) {
             out << report.out;
             err << report.err;
             summary.add(report);
             status = std::max(status, report.status);
+            if (out || outputError != 0)
+                return true;
+            outputError = errno;
+            return false;
         },
         batch.errIsTerminal && !batch.quiet ? &err : nullptr);
+    if (!whole) {
+        // A reader that went away (quillmark-cli save ... | head) or Ctrl+C ends the run between files.
+        err << "quillmark-cli: " << (outputError != 0 ? outputClosedText(outputError) : "interrupted")
+            << "; the run ends here\n";
+        status = std::max(status, ExitStatus::SaveFailed);
+    }
     if (!batch.quiet)
         summary.print(err);
     return status;
@@ -204,8 +225,10 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
     if (options.tracker && (!ReadStandardList(ListKind::Category, categories, err) ||
                             !(colours = colourSource(options.ldconfig, err))))
         return ExitStatus::Unreadable;
+    // A check never writes, not even to undo what a killed save left: the next save does that.
     return runBatch(arguments, batch, out, err, [&](const std::string& path) {
-        return reportOn(path, batch.quiet, {}, KeepBytes::No,
+        // A check never writes, not even to undo what a killed save left: the next save does that.
+        return reportOn(path, batch.quiet, {}, KeepBytes::No, nullptr,
                         [&](OpenedPart& opened, ConsoleDialogs& dialogs, FileReport& report) {
             const auto& header = opened.header;
             const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
@@ -250,10 +273,11 @@ int RunEdit(const std::vector<std::string>& arguments, const SaveOptions& option
     };
     const SystemClock clock;
     FileLocks locks;
+    FolderSweeps sweeps;
     return runBatch(arguments, batch, out, err, [&](const std::string& path) {
         const std::lock_guard lock(locks.of(path));
         return reportOn(
-            path, batch.quiet, answer, KeepBytes::Yes,
+            path, batch.quiet, answer, KeepBytes::Yes, edit.dryRun ? nullptr : &sweeps, // a dry run writes nothing
             [&](OpenedPart& opened, ConsoleDialogs& dialogs, FileReport& report) {
                 auto& header = opened.header;
                 if (const auto refusal = ApplyHeaderEdits(header, edit.edits, clock.now())) {
@@ -279,7 +303,8 @@ int RunEdit(const std::vector<std::string>& arguments, const SaveOptions& option
                                           [] {},
                                           batch.limitDescription,
                                           opened.content->view(),
-                                          edit.dryRun};
+                                          edit.dryRun,
+                                          &sweeps};
                 const auto result = CheckHeaderAndSave(header, context);
                 report.out = savedLine(header.FilePath, options, result, dialogs, report);
                 if (edit.dryRun &&

@@ -4,6 +4,7 @@
 #include <filesystem>
 
 #include "ConsoleDialogs.h"
+#include "FileSave.h"
 #include "ListFolder.h"
 #include "OpenDocument.h"
 #include "ParseProgress.h"
@@ -36,10 +37,13 @@ int handleCatching(const std::string& path, HeaderData& header, std::ostream& er
 
 } // namespace
 
-std::optional<OpenedPart> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err, KeepBytes keep)
+std::optional<OpenedPart> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err, KeepBytes keep,
+                                     FolderSweeps* restoreWith)
 {
     dialogs.setCurrentFile(path);
     try {
+        if (restoreWith != nullptr)
+            RestoreInterruptedSaveOf(path, dialogs, restoreWith);
         OpenedPart opened{std::make_unique<FileBytes>(path), {}};
         opened.header.ReadStamp = opened.content->stamp();
         ParseProgress silent;

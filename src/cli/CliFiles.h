@@ -12,6 +12,7 @@
 #include "PartFile.h"
 
 class ConsoleDialogs;
+class FolderSweeps;
 
 // Exit statuses shared by the commands; a larger one wins when several apply.
 namespace ExitStatus {
@@ -35,10 +36,11 @@ struct OpenedPart {
 // them: a copy, where otherwise the bytes themselves become the body.
 enum class KeepBytes { No, Yes };
 
-// Opens path as the Open command does. When the file cannot be read, says so in one line on
-// err and returns nullopt.
+// Opens path as the Open command does; with restoreWith (see ReplaceOptions::sweeps), after undoing
+// what a killed save left there, as a command that writes does first. When the file cannot be read,
+// says so in one line on err and returns nullopt.
 std::optional<OpenedPart> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err,
-                                     KeepBytes keep = KeepBytes::No);
+                                     KeepBytes keep = KeepBytes::No, FolderSweeps* restoreWith = nullptr);
 
 // The folder of the running program, where a build keeps its list and data files.
 std::string ProgramFolder();

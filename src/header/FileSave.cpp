@@ -53,32 +53,52 @@ MessageBox changedOnDiskBox(const std::string& path)
             ChangedOnDiskTitle, Buttons::YesNo, Icon::Exclamation, Answer::No};
 }
 
-// True when the file at FilePath is still as it was read, or when the user, asked, wants to
-// overwrite the other program's changes anyway.
-bool mayOverwrite(const HeaderData& header, Dialogs& dialogs)
+struct NameParts {
+    std::string folderWithSlash, base, extension;
+};
+
+// The base is the file name up to its first "." and the extension all after it.
+NameParts namePartsOf(const std::string& path)
 {
-    if (!header.ReadStamp || StampOfPath(header.FilePath) == *header.ReadStamp)
-        return true;
-    return dialogs.message(changedOnDiskBox(header.FilePath)) == Answer::Yes;
+    // Only a blank path is trimmed: the blanks of a real one belong to its file's name.
+    if (TrimBlanks(path).empty())
+        return {"", "unbenannt", "txt"};
+    const auto slash = path.rfind('/');
+    const auto folderWithSlash = slash == std::string::npos ? std::string() : path.substr(0, slash + 1);
+    const auto fileName = path.substr(folderWithSlash.size());
+    const auto dot = fileName.find('.');
+    if (dot == std::string::npos)
+        throw InvalidCallError();
+    return {folderWithSlash, fileName.substr(0, dot), fileName.substr(dot + 1)};
+}
+
+std::string backupMark(const NameParts& name) { return name.base + "_Backup_"; }
+
+// The file names this program gives the backups of the file at path.
+ReplaceOptions backupOptions(const std::string& path, bool makeBackup, const Clock& clock)
+{
+    ReplaceOptions options;
+    if (makeBackup)
+        options.backupPath = MakeBackupName(path, clock.now());
+    options.isBackupName = [name = namePartsOf(path)](std::string_view fileName) {
+        return fileName.starts_with(backupMark(name)) && fileName.ends_with("." + name.extension);
+    };
+    return options;
 }
 
 } // namespace
 
 std::string MakeBackupName(const std::string& path, const LocalDateTime& stamp)
 {
-    std::string folderWithSlash, base = "unbenannt", extension = "txt";
-    // Only a blank path is trimmed: the blanks of a real one belong to its file's name.
-    if (!TrimBlanks(path).empty()) {
-        const auto slash = path.rfind('/');
-        folderWithSlash = slash == std::string::npos ? std::string() : path.substr(0, slash + 1);
-        const auto fileName = path.substr(folderWithSlash.size());
-        const auto dot = fileName.find('.');
-        if (dot == std::string::npos)
-            throw InvalidCallError();
-        base = fileName.substr(0, dot);
-        extension = fileName.substr(dot + 1);
-    }
-    return folderWithSlash + base + "_Backup_" + stampText(stamp) + "." + extension;
+    const auto name = namePartsOf(path);
+    return name.folderWithSlash + backupMark(name) + stampText(stamp) + "." + name.extension;
+}
+
+void RestoreInterruptedSaveOf(const std::string& path, Dialogs& dialogs, FolderSweeps* sweeps)
+{
+    if (RestoreInterruptedSave(path, sweeps))
+        dialogs.message({"restored " + path + " from an interrupted save", "Quillmark", Buttons::Ok, Icon::Information,
+                         Answer::Ok});
 }
 
 bool IsBackupName(std::string_view fileName)
@@ -118,24 +138,39 @@ bool SaveWouldWrite(const HeaderData& header, const std::string& newHeader, std:
 }
 
 FileSaveResult FileSave(HeaderData& header, const std::string& newHeader, bool makeBackup, const Clock& clock,
-                        Dialogs& dialogs)
+                        Dialogs& dialogs, FolderSweeps* sweeps)
 {
     FileSaveResult result;
-    if (!mayOverwrite(header, dialogs))
-        return result;
     try {
         // The backup stands beside the file that is written, which is not the link's folder.
         const auto target = ResolveLinks(header.FilePath);
-        std::optional<std::string> backupPath;
-        if (makeBackup)
-            backupPath = MakeBackupName(target, clock.now());
+        RestoreInterruptedSaveOf(target, dialogs, sweeps);
+        auto options = backupOptions(target, makeBackup, clock);
+        options.expected = header.ReadStamp;
+        options.sweeps = sweeps;
+        // Another program's changes since the file was read are only overwritten when the user says
+        // so, whether they came before the save began or while it wrote.
         const auto pieces = SavedPieces(header, newHeader);
-        ReplaceFileSafely(target, {pieces[0], pieces[1], pieces[2], pieces[3]}, backupPath);
+        bool changed = header.ReadStamp && StampOfPath(target) != *header.ReadStamp;
+        for (;;) {
+            if (changed) {
+                if (dialogs.message(changedOnDiskBox(header.FilePath)) != Answer::Yes)
+                    return result;
+                options.expected = StampOfPath(target);
+            }
+            try {
+                result.backupPath =
+                    ReplaceFileSafely(target, {pieces[0], pieces[1], pieces[2], pieces[3]}, options)
+                        .backupPath;
+                break;
+            } catch (const FileChangedError&) {
+                changed = true;
+            }
+        }
         header.ReadStamp = StampOfPath(target);
         header.HeaderAtOpenOrSave = newHeader;
         header.FileChanged = false;
         result.saved = true;
-        result.backupPath = backupPath.value_or(std::string());
     } catch (const QmError& error) {
         ReportError(dialogs, error, FileSaveProcedure);
     }

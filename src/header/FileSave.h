@@ -8,6 +8,7 @@
 #include "HeaderData.h"
 
 class Dialogs;
+class FolderSweeps;
 
 // "folder/base_Backup_YYYY-MM-DD_hh-mm-ss.extension", the base being the file name up to its first
 // "." and the extension all after it. A path without a folder gives a name without one; a blank
@@ -37,8 +38,13 @@ struct FileSaveResult {
 };
 
 // Writes newHeader, the body and one CR LF to FilePath (to the file it links to), after a dated
-// backup beside that file when makeBackup is on, and clears FileChanged. A file that changed on
-// disk since it was read is only overwritten when the user says so. A failure is reported
-// through dialogs, and FileChanged stays.
+// backup beside that file when makeBackup is on (numbered when that name is taken), and clears
+// FileChanged. A file that changed on disk since it was read, up to the moment the new text
+// takes its name, is only overwritten when the user says so. A failure is reported through
+// dialogs, and FileChanged stays. sweeps: see ReplaceOptions.
 FileSaveResult FileSave(HeaderData& header, const std::string& newHeader, bool makeBackup, const Clock& clock,
-                        Dialogs& dialogs);
+                        Dialogs& dialogs, FolderSweeps* sweeps = nullptr);
+
+// Undoes what a save killed in the middle of rewriting the file at path in place left there, and
+// says so: "restored <path> from an interrupted save".
+void RestoreInterruptedSaveOf(const std::string& path, Dialogs& dialogs, FolderSweeps* sweeps = nullptr);

@@ -98,6 +98,6 @@ SaveResult CheckHeaderAndSave(HeaderData& h, const SaveContext& context)
         return {SaveOutcome::Unchanged, {}};
     if (context.dryRun)
         return {SaveOutcome::NotWritten, {}};
-    const auto saved = FileSave(h, newHeader, context.makeBackup, context.clock, dialogs);
+    const auto saved = FileSave(h, newHeader, context.makeBackup, context.clock, dialogs, context.sweeps);
     return {saved.saved ? SaveOutcome::Saved : SaveOutcome::Failed, saved.backupPath};
 }

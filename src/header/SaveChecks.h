@@ -10,6 +10,7 @@
 
 class Clock;
 class Dialogs;
+class FolderSweeps;
 
 inline constexpr std::size_t DescriptionLimit = 64;
 
@@ -53,7 +54,8 @@ struct SaveContext {
     bool limitDescription = true; // off: the description may be of any length
     // The file's bytes as read, when a save that would write them again is to write nothing.
     std::optional<std::string_view> heldBytes = std::nullopt;
-    bool dryRun = false; // everything but the writing
+    bool dryRun = false;            // everything but the writing
+    FolderSweeps* sweeps = nullptr; // see ReplaceOptions
 };
 
 struct SaveResult {

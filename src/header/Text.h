@@ -19,9 +19,6 @@ inline std::string_view TextBeforeHeader(const HeaderData& header)
 
 std::string_view TrimBlanks(std::string_view text);
 
-// The folder a path's file stands in, as the file system takes it: "." for a bare name, "/" for a
-// file in the root.
-std::string FolderOf(const std::string& path);
 std::string ToLowerAscii(std::string_view text);
 std::string ToUpperAscii(std::string_view text);
 

@@ -41,7 +41,7 @@ void WriteListFile(const std::string& path, const StringList& entries)
     std::string text;
     for (const auto& entry : entries)
         text.append(entry).append("\r\n");
-    ReplaceFileSafely(path, {text}, std::nullopt);
+    ReplaceFileSafely(path, {text});
 }
 
 std::string ListFilePath(const std::string& programFolder, ListKind kind)

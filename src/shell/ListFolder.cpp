@@ -59,7 +59,7 @@ Digests readDigests(const fs::path& file)
 bool replaceQuietly(const fs::path& path, std::string_view bytes)
 {
     try {
-        ReplaceFileSafely(path.string(), {bytes}, std::nullopt);
+        ReplaceFileSafely(path.string(), {bytes});
         return true;
     } catch (const QmError&) {
         return false;

@@ -1,5 +1,6 @@
 #include "OpenRoad.h"
 
+#include "FileSave.h"
 #include "OpenDocument.h"
 #include "Parser.h"
 #include "SettingsStore.h"
@@ -23,6 +24,7 @@ bool LadeDATDateiCommandLine(AppState& app, const std::string& path, OpenRoad ro
 {
     HeaderData opened;
     TakeFileToOpen(opened, path, services.dialogs);
+    RestoreInterruptedSaveOf(path, services.dialogs); // a save killed while it rewrote the file
     if (!GetGlobalContent(opened, services.dialogs, progress))
         return false;
     opened.Loading = true;

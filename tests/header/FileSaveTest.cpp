@@ -3,10 +3,6 @@
 // user's file, and the file itself when the save is killed.
 #include <gtest/gtest.h>
 
-#include <csignal>
-#include <grp.h>
-#include <sys/stat.h>
-#include <sys/wait.h>
 #include <unistd.h>
 
 #include "Dialogs.h"
@@ -14,7 +10,6 @@
 #include "FileSave.h"
 #include "FixedClock.h"
 #include "QmError.h"
-#include "SafeReplace.h"
 #include "ScriptedDialogs.h"
 #include "TempDir.h"
 
@@ -26,13 +21,6 @@ const std::string OldContent = "0 old\r\n1 16 a.dat\r\n";
 const std::string NewHeader = "0 new\r\n\r\n";
 const std::string NewContent = "0 new\r\n\r\n1 16 a.dat\r\n";
 const std::string BackupName = "3001_Backup_2008-08-10_14-05-09.dat";
-
-struct stat statOf(const std::string& path)
-{
-    struct stat info {};
-    ::lstat(path.c_str(), &info);
-    return info;
-}
 
 TEST(MakeBackupName, StampBetweenBaseAndExtensionAndIsBackupNameKnowsItsNames)
 {
@@ -85,7 +73,7 @@ TEST_F(FileSaving, WritesTheNewTextKeepingPermissionsAndTheOldInTheBackup)
     EXPECT_TRUE(save(false).saved);
     EXPECT_FALSE(h.FileChanged);
     EXPECT_EQ(NamesIn(dir.path()), std::set<std::string>{"3001.dat"});
-    EXPECT_EQ(statOf(h.FilePath).st_mode & 0777, 0640u);
+    EXPECT_EQ(StatOf(h.FilePath).st_mode & 0777, 0640u);
     TempDir::writeTo(h.FilePath, OldContent);
     h.ReadStamp.reset();
     h.ByteOrderMark = true; // read before the first line, and written back there
@@ -95,18 +83,14 @@ TEST_F(FileSaving, WritesTheNewTextKeepingPermissionsAndTheOldInTheBackup)
     EXPECT_EQ(ReadBytes(h.FilePath), "\xEF\xBB\xBF" + NewContent);
 }
 
-TEST_F(FileSaving, ABackupNameIsNeverOverwritten)
+TEST_F(FileSaving, ABackupNameIsNeverOverwrittenButNumbered)
 {
     ASSERT_TRUE(save(true).saved);
     h.Body = "2 24 b";
-    dialogs.expectMessage(Answer::Ok);
-    EXPECT_FALSE(save(true).saved); // the same second: the name is taken
-    EXPECT_EQ(dialogs.messages.back().text.rfind("Error 58 (", 0), 0u);
-    EXPECT_EQ(ReadBytes(h.FilePath), NewContent);
-    clock.set({2008, 8, 10, 14, 5, 10});
-    ASSERT_TRUE(save(true).saved);
-    EXPECT_EQ(NamesIn(dir.path()),
-              (std::set<std::string>{"3001.dat", BackupName, "3001_Backup_2008-08-10_14-05-10.dat"}));
+    const auto second = save(true); // the same second: the name is taken
+    ASSERT_TRUE(second.saved);
+    EXPECT_EQ(second.backupPath, dir.file("3001_Backup_2008-08-10_14-05-09 (2).dat"));
+    EXPECT_EQ(ReadBytes(second.backupPath), NewContent);
     EXPECT_EQ(ReadBytes(dir.file(BackupName)), OldContent);
 }
 
@@ -148,7 +132,7 @@ TEST_F(FileSaving, ThroughASymbolicLinkTheTargetIsWrittenAndTheLinkStays)
     EXPECT_TRUE(fs::is_symlink(h.FilePath));
     EXPECT_EQ(ReadBytes(dir.file("3001.dat")), NewContent);
     EXPECT_EQ(result.backupPath, dir.file(BackupName));
-    EXPECT_TRUE(S_ISREG(statOf(result.backupPath).st_mode));
+    EXPECT_TRUE(S_ISREG(StatOf(result.backupPath).st_mode));
     EXPECT_EQ(ReadBytes(result.backupPath), OldContent);
     EXPECT_EQ(NamesIn(dir.path() / "models"), std::set<std::string>{"link.dat"});
 }
@@ -156,11 +140,11 @@ TEST_F(FileSaving, ThroughASymbolicLinkTheTargetIsWrittenAndTheLinkStays)
 TEST_F(FileSaving, EveryHardLinkShowsTheNewContent)
 {
     fs::create_hard_link(h.FilePath, dir.file("other.dat"));
-    const auto inode = statOf(h.FilePath).st_ino;
+    const auto inode = StatOf(h.FilePath).st_ino;
     for (const bool backup : {false, true})
         ASSERT_TRUE(save(backup).saved);
     EXPECT_EQ(ReadBytes(dir.file("other.dat")), NewContent);
-    EXPECT_EQ(statOf(h.FilePath).st_ino, inode);
+    EXPECT_EQ(StatOf(h.FilePath).st_ino, inode);
     EXPECT_EQ(ReadBytes(dir.file(BackupName)), NewContent); // a copy, not a third name
     EXPECT_EQ(NamesIn(dir.path()), (std::set<std::string>{"3001.dat", "other.dat", BackupName}));
 }
@@ -188,86 +172,5 @@ TEST_F(FileSaving, AFileChangedOnDiskIsOverwrittenOnlyAfterAsking)
     dialogs.expectMessage(Answer::No);
     EXPECT_FALSE(save(false).saved);
 }
-
-// Runs act in a child process as the user nobody; its exit status is what act returns.
-int asNobody(const std::function<int()>& act)
-{
-    const pid_t child = ::fork();
-    if (child == 0) {
-        if (::setgroups(0, nullptr) != 0 || ::setresgid(65534, 65534, 65534) != 0 ||
-            ::setresuid(65534, 65534, 65534) != 0)
-            ::_exit(99);
-        ::_exit(act());
-    }
-    int status = 0;
-    ::waitpid(child, &status, 0);
-    return WIFEXITED(status) ? WEXITSTATUS(status) : -1;
-}
-
-TEST(AnotherUsersFile, IsRefusedOrKeepsItsOwner)
-{
-    if (::geteuid() != 0)
-        GTEST_SKIP() << "needs root to act as another user";
-    TempDir dir;
-    fs::permissions(dir.path(), fs::perms::all);
-    const auto saveStatus = [](const std::string& path) {
-        return ErrorNumberOf([&path] { ReplaceFileSafely(path, {NewHeader}, std::nullopt); });
-    };
-    const auto rootsOwn = dir.write("roots.dat", OldContent);
-    ::chmod(rootsOwn.c_str(), 0644); // writable for root alone, in a folder everyone may write
-    EXPECT_EQ(asNobody([&] { return saveStatus(rootsOwn); }), 70);
-    EXPECT_EQ(ReadBytes(rootsOwn), OldContent);
-    const auto shared = dir.write("shared.dat", OldContent);
-    ::chmod(shared.c_str(), 0666); // writable for nobody too: rewritten, and still root's
-    EXPECT_EQ(asNobody([&] { return saveStatus(shared); }), 0);
-    EXPECT_EQ(ReadBytes(shared), NewHeader);
-    EXPECT_EQ(statOf(shared).st_uid, 0u);
-    EXPECT_EQ(NamesIn(dir.path()), (std::set<std::string>{"roots.dat", "shared.dat"}));
-    fs::permissions(dir.path(), fs::perms::owner_all | fs::perms::others_exec); // no new files for nobody
-    TempDir::writeTo(shared, OldContent);
-    EXPECT_EQ(asNobody([&] { return saveStatus(shared); }), 0);
-    EXPECT_EQ(ReadBytes(shared), NewHeader);
-}
-
-// A save killed right after each of its steps leaves the old or the new bytes under the part's
-// name, the backup only with the old bytes, and nothing that the next save does not clear (but
-// the copy of a file it was rewriting in place, the one whole copy of the old bytes).
-class KilledSave : public ::testing::TestWithParam<std::tuple<ReplaceStep, bool, bool>> {};
-
-TEST_P(KilledSave, LeavesTheFileWholeAndNoLeftovers)
-{
-    const auto [step, withBackup, hardLinked] = GetParam();
-    TempDir dir;
-    const auto path = dir.write("3001.dat", OldContent);
-    std::set<std::string> names{"3001.dat"};
-    if (hardLinked) {
-        fs::create_hard_link(path, dir.file("second.dat"));
-        names.insert("second.dat");
-    }
-    const auto backup = withBackup ? std::optional(dir.file(BackupName)) : std::nullopt;
-    if (::fork() == 0) {
-        ReplaceFileSafely(path, {NewContent}, backup, [step = step](ReplaceStep reached) {
-            if (reached == step)
-                ::raise(SIGKILL);
-        });
-        ::_exit(0);
-    }
-    ::wait(nullptr);
-    const auto bytes = ReadBytes(path);
-    EXPECT_TRUE(bytes == OldContent || bytes == NewContent) << bytes;
-    if (withBackup && fs::exists(*backup)) {
-        EXPECT_EQ(ReadBytes(*backup), OldContent);
-        names.insert(BackupName);
-    }
-    ReplaceFileSafely(path, {NewContent}, std::nullopt);
-    auto left = NamesIn(dir.path());
-    std::erase_if(left, [](const std::string& name) { return name.rfind(".quillmark-keep-", 0) == 0; });
-    EXPECT_EQ(left, names);
-}
-
-INSTANTIATE_TEST_SUITE_P(EveryStep, KilledSave,
-                         ::testing::Combine(::testing::Values(ReplaceStep::NewTextWritten, ReplaceStep::BackupMade,
-                                                              ReplaceStep::NewTextNamed, ReplaceStep::Placed),
-                                            ::testing::Bool(), ::testing::Bool()));
 
 } // namespace

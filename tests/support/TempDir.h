@@ -3,6 +3,7 @@
 #include <filesystem>
 #include <set>
 #include <string>
+#include <sys/stat.h>
 
 // A fresh folder under the system's temporary folder, removed with everything in it.
 class TempDir {
@@ -23,6 +24,9 @@ private:
 };
 
 std::string ReadBytes(const std::string& path);
+
+// What lstat says of path (zeros when it fails).
+struct stat StatOf(const std::string& path);
 
 // The names of the entries in folder.
 std::set<std::string> NamesIn(const std::filesystem::path& folder);

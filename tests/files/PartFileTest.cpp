@@ -55,14 +55,4 @@ TEST(ReadingFiles, FilesLongerOrShorterThanTheyClaimYieldWhatIsThere)
     EXPECT_NE(shrunk.view().find("never"), std::string_view::npos);
 }
 
-TEST(ReadingFiles, AFileTooLargeToHoldIsRefusedAsOutOfMemory)
-{
-    TempDir dir;
-    const auto path = dir.write("huge.dat", "");
-    const auto memory = static_cast<off_t>(::sysconf(_SC_PHYS_PAGES)) * ::sysconf(_SC_PAGESIZE);
-    if (::truncate(path.c_str(), memory) != 0) // sparse: takes no room on disk
-        GTEST_SKIP() << "cannot make a sparse file of the memory's size here";
-    EXPECT_EQ(readError(path), 7);
-}
-
 } // namespace

@@ -3,12 +3,14 @@
 #include <gtest/gtest.h>
 
 #include <cerrno>
+#include <cstdarg>
 #include <dlfcn.h>
+#include <fcntl.h>
 #include <filesystem>
-#include <sys/stat.h>
 #include <unistd.h>
 
 #include "ErrorNumber.h"
+#include "PartFile.h"
 #include "SafeReplace.h"
 #include "TempDir.h"
 
@@ -17,6 +19,7 @@ namespace {
 std::vector<std::string> calls;
 std::string failNext;
 int failErrno = EIO;
+long physicalPages = 0; // what the system is said to have, when not 0
 
 template <typename Real, typename... Args>
 auto intercept(const char* name, Real* real, Args... args) -> decltype(real(args...))
@@ -61,6 +64,29 @@ int link(const char* from, const char* to) noexcept
 {
     return intercept("link", realFunction<int(const char*, const char*)>("link"), from, to);
 }
+int fchown(int fd, uid_t owner, gid_t group) noexcept
+{
+    return intercept("fchown", realFunction<int(int, uid_t, gid_t)>("fchown"), fd, owner, group);
+}
+// The flags name the call: "open O_TMPFILE" for an unnamed temporary file.
+int open(const char* path, int flags, ...)
+{
+    va_list rest;
+    va_start(rest, flags);
+    const auto mode = (flags & O_CREAT) != 0 || (flags & O_TMPFILE) == O_TMPFILE ? va_arg(rest, mode_t) : 0;
+    va_end(rest);
+    const auto real = realFunction<int(const char*, int, ...)>("open");
+    if ((flags & O_TMPFILE) == O_TMPFILE)
+        return intercept("open O_TMPFILE", real, path, flags, mode);
+    return real(path, flags, mode);
+}
+long sysconf(int name) noexcept
+{
+    const auto real = realFunction<long(int)>("sysconf");
+    if (name == _SC_PHYS_PAGES && physicalPages > 0)
+        return physicalPages;
+    return real(name);
+}
 int linkat(int fromFolder, const char* from, int toFolder, const char* to, int flags) noexcept
 {
     return intercept("linkat", realFunction<int(int, const char*, int, const char*, int)>("linkat"), fromFolder, from,
@@ -82,7 +108,10 @@ protected:
         failNext = step;
         failErrno = error;
         return ErrorNumberOf([this, withBackup] {
-            ReplaceFileSafely(path, {NewBytes}, withBackup ? std::optional(backup) : std::nullopt);
+            ReplaceOptions options;
+            if (withBackup)
+                options.backupPath = backup;
+            ReplaceFileSafely(path, {NewBytes}, options);
         });
     }
     TempDir dir;
@@ -93,7 +122,7 @@ protected:
 TEST_F(SaveFaults, TheNewTextIsOnDiskBeforeItTakesTheNameAndTheFolderAfter)
 {
     calls.clear();
-    ReplaceFileSafely(path, {NewBytes}, std::nullopt);
+    ReplaceFileSafely(path, {NewBytes});
     std::vector<std::string> order;
     for (const auto& call : calls)
         if (call == "fsync" || call == "rename")
@@ -128,12 +157,52 @@ TEST_F(SaveFaults, ABackupThatCannotBeASecondNameIsACopy)
 {
     failNext = "link";
     failErrno = EPERM; // as on file systems without hard links
-    ReplaceFileSafely(path, {NewBytes}, backup);
+    ReplaceOptions options;
+    options.backupPath = backup;
+    ReplaceFileSafely(path, {NewBytes}, options);
     EXPECT_EQ(ReadBytes(backup), OldBytes);
     EXPECT_EQ(ReadBytes(path), NewBytes);
-    struct stat info {};
-    ::stat(backup.c_str(), &info);
-    EXPECT_EQ(info.st_nlink, 1u);
+    EXPECT_EQ(StatOf(backup).st_nlink, 1u);
+}
+
+// File systems without unnamed temporary files (NFS, SMB, vfat) refuse them with EOPNOTSUPP: the
+// save goes on with a named temporary file, which it removes.
+TEST_F(SaveFaults, WithoutUnnamedFilesANamedTemporaryFileIsUsed)
+{
+    failNext = "open O_TMPFILE";
+    failErrno = EOPNOTSUPP;
+    ReplaceFileSafely(path, {NewBytes});
+    EXPECT_EQ(ReadBytes(path), NewBytes);
+    EXPECT_EQ(NamesIn(dir.path()), std::set<std::string>{"3001.dat"});
+}
+
+// Root gives the new file any owner; when the system refuses that, a colleague's file in a shared
+// group is rewritten in place and stays the colleague's, whatever the group.
+TEST_F(SaveFaults, AFileWhoseOwnerTheNewFileCannotHaveKeepsIt)
+{
+    if (::geteuid() != 0)
+        GTEST_SKIP() << "needs root to give the file another owner";
+    ASSERT_EQ(::chown(path.c_str(), 12345, ::getegid()), 0);
+    const auto inode = StatOf(path).st_ino;
+    failNext = "fchown";
+    failErrno = EPERM;
+    ReplaceFileSafely(path, {NewBytes});
+    EXPECT_EQ(ReadBytes(path), NewBytes);
+    EXPECT_EQ(StatOf(path).st_uid, 12345u);
+    EXPECT_EQ(StatOf(path).st_ino, inode);
+}
+
+// Reading a file needs about three times its size: a file larger than a third of memory is
+// refused before it is read.
+TEST_F(SaveFaults, AFileLargerThanAThirdOfMemoryIsRefused)
+{
+    const auto page = ::sysconf(_SC_PAGESIZE);
+    physicalPages = 30;
+    const auto large = dir.write("large.dat", std::string(static_cast<std::size_t>(page) * 12, 'x'));
+    const auto small = dir.write("small.dat", std::string(static_cast<std::size_t>(page) * 8, 'x'));
+    EXPECT_EQ(ErrorNumberOf([&] { FileBytes bytes(large); }), 7);
+    EXPECT_EQ(ErrorNumberOf([&] { FileBytes bytes(small); }), 0);
+    physicalPages = 0;
 }
 
 } // namespace

@@ -4,7 +4,7 @@
 #include <new>
 #include <sys/stat.h>
 
-#include "Text.h"
+#include "Folders.h"
 
 namespace {
 
