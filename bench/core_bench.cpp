@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // The line reader, the parser and the composer alone, on the generated part file.
 #include <benchmark/benchmark.h>
 

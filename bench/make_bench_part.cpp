@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // Writes the generated part files of the benchmarks:
 //   make_bench_part LINES FILE          one part file
 //   make_bench_part LINES FOLDER COUNT  COUNT part files in FOLDER, as a library folder holds them

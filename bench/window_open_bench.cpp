@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // Times the window's Open command on a part file, from the command to the end of the open,
 // offscreen: window_open_bench FILE. Prints the median seconds of nine opens.
 #include <QApplication>

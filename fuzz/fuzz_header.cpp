@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // libFuzzer target: any bytes are a part file. Reading, parsing and composing must never crash,
 // and composing the parsed record must never throw.
 #include <cstddef>

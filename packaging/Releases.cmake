@@ -1,3 +1,4 @@
+# SPDX-License-Identifier: MIT
 # quillmark_releases(FILE VERSION): reads the release list FILE and sets, in the caller,
 # releases_xml (AppStream <release> elements) and releases_changelog (a Debian changelog), both
 # signed by QUILLMARK_MAINTAINER. Stops when the newest release is not VERSION.

@@ -1,4 +1,5 @@
 #!/usr/bin/env bash
+# SPDX-License-Identifier: MIT
 # Writes the SUBCOMMANDS section of quillmark-cli's man page, as help2man includes it, from the
 # --help of the program and of each of its subcommands, so that the page lists every option.
 set -euo pipefail

@@ -1,3 +1,4 @@
+# SPDX-License-Identifier: MIT
 # Shared by the scripts: install what is missing from Debian's packages, then configure and build.
 # Sourced, not run.
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // Quillmark: the window program.
 #include <QApplication>
 #include <QIcon>

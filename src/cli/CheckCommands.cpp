@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "CheckCommands.h"
 
 #include <cerrno>
@@ -105,7 +106,8 @@ void noteFindings(FileReport& report, const SaveFindings& findings)
 // report; an unreadable file is reported as such. Quiet, the messages of the file's dialogs are
 // not shown.
 FileReport reportOn(const std::string& path, bool quiet, ConsoleDialogs::Answerer answerer, KeepBytes keep,
-                    FolderSweeps* restoreWith, const std::function<void(OpenedPart&, ConsoleDialogs&, FileReport&)>& handle)
+                    FolderSweeps* restoreWith,
+                    const std::function<void(OpenedPart&, ConsoleDialogs&, FileReport&)>& handle)
 {
     FileReport report;
     std::ostringstream err, discarded;
@@ -222,34 +224,35 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
 {
     StringList categories;
     std::unique_ptr<ColourSource> colours;
-    if (options.tracker && (!ReadStandardList(ListKind::Category, categories, err) ||
-                            !(colours = colourSource(options.ldconfig, err))))
+    if (options.tracker &&
+        (!ReadStandardList(ListKind::Category, categories, err) || !(colours = colourSource(options.ldconfig, err))))
         return ExitStatus::Unreadable;
     // A check never writes, not even to undo what a killed save left: the next save does that.
     return runBatch(arguments, batch, out, err, [&](const std::string& path) {
         // A check never writes, not even to undo what a killed save left: the next save does that.
         return reportOn(path, batch.quiet, {}, KeepBytes::No, nullptr,
                         [&](OpenedPart& opened, ConsoleDialogs& dialogs, FileReport& report) {
-            const auto& header = opened.header;
-            const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
-            TrackerFindings tracker; // empty unless asked for
-            if (options.tracker) {
-                const auto& codes =
-                    colours->forPart(path, [&dialogs](const std::string& text) { dialogs.message({text}); });
-                tracker = CheckRecordForTracker(header, ComposeHeader(header), categories, codes);
-            }
-            const auto* trackerFindings = options.tracker ? &tracker : nullptr;
-            report.out = options.json ? checkJson(header, findings, trackerFindings).dump() + '\n'
-                                      : findingLines(header.FilePath, findings, trackerFindings);
-            noteFindings(report, findings);
-            bool trackerRefuses = false;
-            for (const auto& finding : tracker) {
-                report.trackerIds.push_back(finding.id);
-                trackerRefuses = trackerRefuses || finding.level == FindingLevel::Error;
-            }
-            report.refused = trackerRefuses;
-            report.status = findings.refusals.empty() && !trackerRefuses ? ExitStatus::Ok : ExitStatus::Refused;
-        });
+                            const auto& header = opened.header;
+                            const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
+                            TrackerFindings tracker; // empty unless asked for
+                            if (options.tracker) {
+                                const auto& codes = colours->forPart(
+                                    path, [&dialogs](const std::string& text) { dialogs.message({text}); });
+                                tracker = CheckRecordForTracker(header, ComposeHeader(header), categories, codes);
+                            }
+                            const auto* trackerFindings = options.tracker ? &tracker : nullptr;
+                            report.out = options.json ? checkJson(header, findings, trackerFindings).dump() + '\n'
+                                                      : findingLines(header.FilePath, findings, trackerFindings);
+                            noteFindings(report, findings);
+                            bool trackerRefuses = false;
+                            for (const auto& finding : tracker) {
+                                report.trackerIds.push_back(finding.id);
+                                trackerRefuses = trackerRefuses || finding.level == FindingLevel::Error;
+                            }
+                            report.refused = trackerRefuses;
+                            report.status =
+                                findings.refusals.empty() && !trackerRefuses ? ExitStatus::Ok : ExitStatus::Refused;
+                        });
     });
 }
 

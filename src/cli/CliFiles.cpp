@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "CliFiles.h"
 
 #include <algorithm>
@@ -37,8 +38,8 @@ int handleCatching(const std::string& path, HeaderData& header, std::ostream& er
 
 } // namespace
 
-std::optional<OpenedPart> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err, KeepBytes keep,
-                                     FolderSweeps* restoreWith)
+std::optional<OpenedPart> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err,
+                                     KeepBytes keep, FolderSweeps* restoreWith)
 {
     dialogs.setCurrentFile(path);
     try {

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "ConsoleDialogs.h"
 
 #include "LineEnds.h"

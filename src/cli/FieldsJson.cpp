@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "FieldsJson.h"
 
 #include <nlohmann/json.hpp>

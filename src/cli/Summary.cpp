@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "Summary.h"
 
 void Summary::addWalks(const PartFileList& found)

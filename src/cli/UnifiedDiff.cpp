@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "UnifiedDiff.h"
 
 #include <algorithm>

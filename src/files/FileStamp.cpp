@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "FileStamp.h"
 
 #include <sys/stat.h>

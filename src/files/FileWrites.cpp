@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "FileWrites.h"
 
 #include <cerrno>

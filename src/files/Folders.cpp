@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "Folders.h"
 
 std::string FolderOf(const std::string& path)

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "NewFile.h"
 
 #include <cerrno>

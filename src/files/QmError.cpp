@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "QmError.h"
 
 #include <cerrno>

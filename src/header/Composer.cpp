@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "Composer.h"
 
 #include "Text.h"

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "Dialogs.h"
 
 MessageBox StopBox(std::string text) { return {std::move(text), ProgramTitle, Buttons::Ok, Icon::None, Answer::Ok}; }

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "FileSave.h"
 
 #include <cstdio>
@@ -160,8 +161,7 @@ FileSaveResult FileSave(HeaderData& header, const std::string& newHeader, bool m
             }
             try {
                 result.backupPath =
-                    ReplaceFileSafely(target, {pieces[0], pieces[1], pieces[2], pieces[3]}, options)
-                        .backupPath;
+                    ReplaceFileSafely(target, {pieces[0], pieces[1], pieces[2], pieces[3]}, options).backupPath;
                 break;
             } catch (const FileChangedError&) {
                 changed = true;

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "FixUps.h"
 
 #include "LineEnds.h"

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "HeaderData.h"
 
 void ResetHeaderRecord(HeaderData& header)

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "Parser.h"
 
 #include <array>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "SaveChecks.h"
 
 #include "Dialogs.h"

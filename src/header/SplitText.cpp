@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "SplitText.h"
 
 std::vector<std::string> SplitText(std::string_view text, std::string_view separator)

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "TextFile.h"
 
 NotTextFileError::NotTextFileError(const std::string& path) : std::runtime_error(path + " is not an LDraw text file.")

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "Categories.h"
 
 clsCategory& colCategory::Add(const std::string& Key, const std::string& Description)

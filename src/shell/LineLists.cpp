@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "LineLists.h"
 
 #include "Dates.h"

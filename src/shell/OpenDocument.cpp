@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "OpenDocument.h"
 
 #include "DescriptionTabs.h"

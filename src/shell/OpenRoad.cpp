@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "OpenRoad.h"
 
 #include "FileSave.h"

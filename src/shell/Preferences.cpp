@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "Preferences.h"
 
 #include "SettingsStore.h"

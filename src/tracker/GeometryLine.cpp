@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "GeometryLine.h"
 
 #include <charconv>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #pragma once
 
 // Chooses Qt's own event loop over GLib's, unless the user chose otherwise (QT_NO_GLIB). The parser

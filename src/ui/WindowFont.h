@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #pragma once
 
 // The windows were drawn for a small 8 pt dialog font, which they use unless the desktop's font is

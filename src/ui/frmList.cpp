@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "frmList.h"
 
 #include <QGroupBox>

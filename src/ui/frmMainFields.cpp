@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // The single-value header fields: every edit goes into the record at once and recomposes.
 #include <QComboBox>
 #include <QKeyEvent>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // The keyword, comment and history lists with their Add, Edit and Delete buttons.
 #include <QListWidget>
 

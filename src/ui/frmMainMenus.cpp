@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // The Edit menu's list dialogs, the preferences, and applying them to the open file.
 #include <QComboBox>
 #include <QLineEdit>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // The two roads of opening a file, saving, closing, and files dropped on the window.
 #include <QCloseEvent>
 #include <QComboBox>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "frmOption.h"
 
 #include <QCheckBox>

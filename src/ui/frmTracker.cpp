@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "frmTracker.h"
 
 #include <QClipboard>

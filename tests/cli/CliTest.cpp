@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // quillmark-cli's commands: what each prints, writes and exits with.
 #include <gtest/gtest.h>
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // Preloaded into quillmark-cli by the killed-save tests: kills it on entry to the count-th call on a
 // file or folder of one function (QUILLMARK_KILL_CALL=write QUILLMARK_KILL_AT=3), as kill -9 would.
 #include <atomic>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // quillmark-cli save killed at each file-changing call in turn (by the preloaded KillPoints) on
 // each road a save can take, cut off from its reader, or sent Ctrl+C.
 #include <gtest/gtest.h>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // Reading files that are not what a part file should be: the program must answer at once and
 // never hang, crash or run out of memory.
 #include <gtest/gtest.h>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // The safe replace under attack: another user's file, a backup sharing the part's inode, other
 // programs and other saves writing meanwhile, and the attributes that must travel with the text.
 #include <gtest/gtest.h>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // Saving when the system fails one of its calls. The calls are intercepted in this test program
 // alone: a call named in failNext fails once with failErrno, and every call is recorded.
 #include <gtest/gtest.h>

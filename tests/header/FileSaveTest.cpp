@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // Saving a part file: what ends on disk, and what a save must never lose: the old bytes when it
 // fails, files behind links, other names of the same file, another program's changes, another
 // user's file, and the file itself when the save is killed.

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // The header edits that quillmark-cli edit makes on many files at once.
 #include <gtest/gtest.h>
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // The body is built inside the buffer the file was read into: every kind of line must come out
 // exactly as a separate copy would have made it, and the buffer itself must become the body.
 #include <gtest/gtest.h>

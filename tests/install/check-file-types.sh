@@ -1,4 +1,5 @@
 #!/usr/bin/env bash
+# SPDX-License-Identifier: MIT
 # check-file-types.sh MIME_XML [CORPUS]: with only MIME_XML added to the MIME database, in a
 # temporary XDG_DATA_HOME, LDraw part files are application/x-ldraw, whatever their name's case
 # and line ends, and other ".dat" files are not: plain text, random bytes, an empty file.

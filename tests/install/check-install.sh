@@ -1,4 +1,5 @@
 #!/usr/bin/env bash
+# SPDX-License-Identifier: MIT
 # Installs a build into a temporary folder as a package would, checks the layout, the Debian
 # documentation, the file types claimed and the desktop identity, runs the installed
 # quillmark-cli as a user with an empty home, and validates the desktop files with the

@@ -1,4 +1,5 @@
 #!/usr/bin/env bash
+# SPDX-License-Identifier: MIT
 # check-window-identity.sh PROGRAM DESKTOP_FILE: the window tells the desktop which entry is
 # its own, so that docks show the entry's icon and can pin it: on Wayland its app id is the
 # entry's id, on X11 its WM_CLASS is the entry's StartupWMClass. Runs PROGRAM under a headless

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // The real part files of the shared corpus, checked against what needs no program to know: the
 // reviewed headers of chosen files, every body line kept, and a header that reads back as it was.
 #include <gtest/gtest.h>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // The questions before closing, opening and editing lists, each answer and what follows.
 #include <gtest/gtest.h>
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "Corpus.h"
 
 #include <algorithm>

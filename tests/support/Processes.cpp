@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 #include "Processes.h"
 
 #include <grp.h>

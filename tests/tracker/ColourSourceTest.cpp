@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // Where the colour codes come from, and the corpus read with the built-in ones.
 #include <gtest/gtest.h>
 

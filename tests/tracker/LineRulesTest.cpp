@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // The Parts Tracker's rules on a part's lines: for each family, lines that pass and lines that fail.
 #include <gtest/gtest.h>
 

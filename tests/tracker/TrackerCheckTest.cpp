@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // The Parts Tracker's header rules: for each family a header that passes and one that breaks it.
 #include <gtest/gtest.h>
 

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // What happens to the open file when another one is opened, dropped or fails to open, and the
 // signs of its state: the caption's mark, the status line after a save, the shortcuts.
 #include <QAction>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // The Qt side of the dialogs seam: each box shows the buttons, icon and default it was asked for,
 // and the button the user presses comes back as the matching answer.
 #include <QInputDialog>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // The Parts Tracker dialog: its table's order, sorting, growing, and copying.
 #include <QApplication>
 #include <QClipboard>

@@ -1,3 +1,4 @@
+// SPDX-License-Identifier: MIT
 // The window tests need a QApplication; they run offscreen unless told otherwise.
 #include <QApplication>
 #include <gtest/gtest.h>
