@@ -101,8 +101,12 @@ std::vector<Op> editScript(const Lines& a, const Lines& b)
 std::string range(std::size_t start, std::size_t count)
 {
     // An empty range names the line before it; a range of one line has no count.
-    const auto first = count == 0 ? start : start + 1;
-    return std::to_string(first) + (count == 1 ? "" : "," + std::to_string(count));
+    auto text = std::to_string(count == 0 ? start : start + 1);
+    if (count != 1) {
+        text += ',';
+        text += std::to_string(count);
+    }
+    return text;
 }
 
 void addLine(std::string& out, char sign, std::string_view line)
