@@ -82,7 +82,8 @@ ReplaceOptions backupOptions(const std::string& path, bool makeBackup, const Clo
     if (makeBackup)
         options.backupPath = MakeBackupName(path, clock.now());
     options.isBackupName = [name = namePartsOf(path)](std::string_view fileName) {
-        return fileName.starts_with(backupMark(name)) && fileName.ends_with("." + name.extension);
+        return IsBackupName(fileName) && fileName.starts_with(backupMark(name)) &&
+               fileName.ends_with("." + name.extension);
     };
     return options;
 }

@@ -56,16 +56,14 @@ frmMain::frmMain(AppState& app, Services& services, QWidget* parent)
     setWindowIcon(QIcon(":/quillmark.png"));
     setAcceptDrops(true);
     // The client area scrolls only where the screen is too small for the window grown with its font.
-    auto* scroller = new QScrollArea(this);
-    scroller->setObjectName("scroller");
-    scroller->setFrameShape(QFrame::NoFrame);
-    scroller->setFocusPolicy(Qt::NoFocus); // the focus starts in the description, not on the frame around it
-    auto* client = new QWidget;
-    client->setObjectName("client");
-    const double scale = LayoutScale(font());
-    client->setFixedSize(Pixels(ClientWidth, scale), Pixels(ClientHeight, scale));
-    scroller->setWidget(client);
-    setCentralWidget(scroller);
+    scroller_ = new QScrollArea(this);
+    scroller_->setObjectName("scroller");
+    scroller_->setFrameShape(QFrame::NoFrame);
+    scroller_->setFocusPolicy(Qt::NoFocus); // the focus starts in the description, not on the frame around it
+    client_ = new QWidget;
+    client_->setObjectName("client");
+    scroller_->setWidget(client_);
+    setCentralWidget(scroller_);
     createControls();
     createMenus();
     setTabOrder();
@@ -125,7 +123,7 @@ void frmMain::createControls()
         {&frmMain::Line1, "Line1", nullptr, 0, 0, 9240, 15},
         {&frmMain::Line2, "Line2", nullptr, 0, 10, 9240, 15},
     };
-    BuildControls(*this, findChild<QWidget*>("client"), rows);
+    BuildControls(*this, client_, rows);
     layOutControls_ = [this](double scale) { LayOutControls(*this, rows, scale); };
     lblLength->setAutoFillBackground(true);
     for (QPlainTextEdit* box : {txNewHeader, txOldHeader}) {
@@ -219,39 +217,40 @@ void frmMain::setTabOrder()
 void frmMain::layOut()
 {
     const double scale = LayoutScale(font());
-    auto* client = findChild<QWidget*>("client");
-    client->setFixedSize(Pixels(ClientWidth, scale), Pixels(ClientHeight, scale)); // first: captions grow inside it
+    client_->setFixedSize(Pixels(ClientWidth, scale), Pixels(ClientHeight, scale)); // first: captions grow inside it
     layOutControls_(scale);
-    const int width = client->width();
+    const int width = client_->width();
     Line1->setGeometry(0, 0, width, 1);
     Line2->setGeometry(0, 1, width, 1);
-    lblStatuszeile->setGeometry(0, client->height() - lblStatuszeile->height(), width, lblStatuszeile->height());
-    fitOnScreen(client->size());
+    lblStatuszeile->setGeometry(0, client_->height() - lblStatuszeile->height(), width, lblStatuszeile->height());
+    fitOnScreen();
 }
 
 // A window larger than the screen opens at the screen's size, its client area scrolling. The
 // window manager's frame counts once it is known: see moveEvent.
-void frmMain::fitOnScreen(QSize clientSize)
+void frmMain::fitOnScreen()
 {
-    QSize room = clientSize;
+    QSize room = client_->size();
     if (const QScreen* shownOn = screen()) {
-        const QSize frame = frameGeometry().size() - geometry().size();
-        const QSize decoration(frame.width(), frame.height() + menuBar()->sizeHint().height());
+        const QSize decoration(fitFrame_.width(), fitFrame_.height() + menuBar()->sizeHint().height());
         room = room.boundedTo(shownOn->availableGeometry().size() - decoration);
     }
-    auto* scroller = findChild<QScrollArea*>("scroller");
-    scroller->setFixedSize(room);
-    const auto bars = room == clientSize ? Qt::ScrollBarAlwaysOff : Qt::ScrollBarAsNeeded;
-    scroller->setHorizontalScrollBarPolicy(bars);
-    scroller->setVerticalScrollBarPolicy(bars);
+    scroller_->setFixedSize(room);
+    const auto bars = room == client_->size() ? Qt::ScrollBarAlwaysOff : Qt::ScrollBarAsNeeded;
+    scroller_->setHorizontalScrollBarPolicy(bars);
+    scroller_->setVerticalScrollBarPolicy(bars);
 }
 
-// The window manager frames the window only after it shows, and moves it then.
+// The window manager frames the window only after it shows, and moves it then; a move that leaves
+// the frame as it was changes nothing.
 void frmMain::moveEvent(QMoveEvent* event)
 {
     QMainWindow::moveEvent(event);
-    if (layOutControls_)
-        fitOnScreen(findChild<QWidget*>("client")->size());
+    const QSize frame = frameGeometry().size() - geometry().size();
+    if (frame == fitFrame_ || !layOutControls_)
+        return;
+    fitFrame_ = frame;
+    fitOnScreen();
 }
 
 void frmMain::changeEvent(QEvent* event)

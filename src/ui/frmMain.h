@@ -22,6 +22,7 @@ class QListWidget;
 class QMenu;
 class QPlainTextEdit;
 class QPushButton;
+class QScrollArea;
 class WindowProgress;
 
 // The main window: every field of the header in its own control, the new header beside the old
@@ -76,7 +77,7 @@ private:
     void setTabOrder();
     void connectHandlers();
     void layOut();
-    void fitOnScreen(QSize clientSize);
+    void fitOnScreen();
 
     // Opening.
     // The question before another file replaces this one; true when the open may go on.
@@ -125,6 +126,7 @@ private:
     AppState& app_;
     Services& services_;
     std::function<void(double scale)> layOutControls_; // places the controls for a font
+    QSize fitFrame_{0, 0};                             // the window manager's frame as fitOnScreen knew it
     std::string baseTitle_;
     std::string newHeaderText_;
     bool closeRequestedDuringOpen_ = false;
@@ -172,6 +174,8 @@ private:
     QLabel* lblStatuszeile;
     QFrame* Line1;
     QFrame* Line2;
+    QWidget* client_;       // every control above lies on it
+    QScrollArea* scroller_; // around the client, scrolling only on a screen too small for it
 
     QAction* MDateiOeffnen;
     QAction* MDateiSpeichern;
