@@ -25,6 +25,17 @@ void InPlaceBody::startPiece(std::string_view line)
     }
 }
 
+std::size_t InPlaceBody::keepPlainLines()
+{
+    if (runEnd_ == NoRun || !continuesRun(reader_.position()) || runEnd_ - runStart_ >= CachedRun)
+        return 0;
+    const auto passed = reader_.skipPlainLines(checkedUpTo_, CachedRun - (runEnd_ - runStart_));
+    if (passed.count != 0)
+        runEnd_ = reader_.position() - 2;
+    checkedUpTo_ = std::max(checkedUpTo_, passed.checkedUpTo);
+    return passed.count;
+}
+
 std::string InPlaceBody::take()
 {
     flush();

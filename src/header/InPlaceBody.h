@@ -49,6 +49,10 @@ public:
             startPiece(line);
     }
 
+    // Adds the lines from the reader's position on that need no trimming to the run that the line
+    // kept last began, many at a time; returns how many. Most of a body goes this way.
+    std::size_t keepPlainLines();
+
     // The string cut to the body; the text is gone. A body much shorter than the text is moved
     // into a buffer of its own size, so that the text's memory is given back.
     std::string take();
@@ -75,7 +79,8 @@ private:
     static constexpr std::size_t NoRun = static_cast<std::size_t>(-1);
     static constexpr std::size_t NotUtf8 = static_cast<std::size_t>(-1);
     static constexpr std::size_t CheckedAll = NotUtf8 - 1;
-    static constexpr std::size_t CheckedPiece = std::size_t{256} * 1024;
+    // Lines read one by one are checked a page ahead; keepPlainLines checks as it goes.
+    static constexpr std::size_t CheckedPiece = 4096;
     // A header of many megabytes is copied out line by line: the pages read meanwhile that the
     // body does not reach are given back every few megabytes.
     static constexpr std::size_t ReleaseStep = std::size_t{8} * 1024 * 1024;

@@ -31,6 +31,18 @@ public:
     // Where the next line starts.
     std::size_t position() const { return position_; }
 
+    // What skipPlainLines passed: how many lines, and up to where the text is known to hold no
+    // byte above 127 that was not known to be checked before.
+    struct PlainLines {
+        std::size_t count = 0;
+        std::size_t checkedUpTo = 0;
+    };
+    // Passes over the lines from here on that are kept as they stand: lines ended by CR LF that
+    // neither begin nor end with a blank. Stops before the first other line, before 64 bytes that
+    // hold a byte above 127 not before checkedUpTo (which must not lie before the position), and
+    // once at least enough bytes are passed. The last bytes of the text are left to nextLine.
+    PlainLines skipPlainLines(std::size_t checkedUpTo, std::size_t enough);
+
 private:
     // Part-file lines are short, so the search for their end is set up once per 64 bytes rather
     // than once per line.

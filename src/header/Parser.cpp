@@ -284,10 +284,12 @@ void ParseHeaderText(HeaderData& header, std::string text, ParseProgress& progre
     BusyPointer busy(progress);
     InPlaceBody lines(text);
     std::size_t linesRead = 0;
+    std::size_t nextReport = 0;
     const auto nextLine = [&]() {
-        if (linesRead % 10 == 0) {
+        if (linesRead >= nextReport) {
             progress.lineProgress(linesRead);
             progress.processEvents();
+            nextReport = linesRead + 10;
         }
         ++linesRead;
         return lines.nextLine();
@@ -302,8 +304,10 @@ void ParseHeaderText(HeaderData& header, std::string text, ParseProgress& progre
             const auto line = nextLine();
             parser.classify(line, linesRead);
         }
-        while (!lines.atEnd())
+        while (!lines.atEnd()) {
             lines.keep(nextLine());
+            linesRead += lines.keepPlainLines();
+        }
     } catch (...) {
         finish(); // what the lines before the failure gave
         throw;

@@ -3,6 +3,10 @@
 // exactly as a separate copy would have made it, and the buffer itself must become the body.
 #include <gtest/gtest.h>
 
+#include <string>
+#include <utility>
+#include <vector>
+
 #include "LineEnds.h"
 #include "ParseProgress.h"
 #include "Parser.h"
@@ -103,6 +107,24 @@ TEST(InPlaceBody, AHeaderOfManyMegabytesKeepsEveryBodyByte)
     EXPECT_EQ(h.OldHeader.size(), text.size() - 2);
 }
 
+// Most of a body is passed over many lines at a time: the lines among them that need trimming or
+// end with a CR alone must come out as if every line had been taken one by one.
+TEST(InPlaceBody, IrregularLinesAmongManyPlainOnesComeOutTrimmed)
+{
+    const std::vector<std::pair<std::string, std::string>> irregular = {
+        {" 2 x", "2 x"}, {"3 y  ", "3 y"}, {"   ", ""}, {"", ""}, {"4 z\r10 w", "4 z\r\n10 w"}};
+    std::string text = "0 h\r\n";
+    std::string body;
+    for (std::size_t line = 0; line < 5000; ++line) {
+        const bool odd = line % 37 == 5;
+        const auto& [read, kept] = irregular[line % irregular.size()];
+        text += odd ? read : "1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat";
+        text += "\r\n";
+        body += (line == 0 ? "" : "\r\n") + (odd ? kept : std::string("1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat"));
+    }
+    EXPECT_EQ(parsed(text).Body, body);
+}
+
 // The encoding is decided while the text is read, before its bytes are moved: every byte counts,
 // the last ones too, and characters of several bytes may cross any boundary.
 TEST(InPlaceBody, TheWholeTextDecidesTheEncoding)
@@ -112,6 +134,10 @@ TEST(InPlaceBody, TheWholeTextDecidesTheEncoding)
         utf8 += line % 7 == 0 ? "1 \xE2\x82\xAC \r\n" : "2 \xC3\xA9\r\n";
     EXPECT_EQ(parsed(utf8).Encoding, TextEncoding::Utf8);
     EXPECT_EQ(parsed(utf8 + "3 \xE9").Encoding, TextEncoding::Latin1);
+    std::string plain;
+    for (int line = 0; line < 40000; ++line)
+        plain += line == 30000 ? "1 \xE9 a.dat\r\n" : "1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat\r\n";
+    EXPECT_EQ(parsed(plain).Encoding, TextEncoding::Latin1) << "deep inside lines kept as they stand";
     std::string longLine = "1 ";
     for (int character = 0; character < 200000; ++character)
         longLine += "\xC3\xA9";
