@@ -32,8 +32,13 @@ std::optional<std::string> IniSettingsStore::read(const std::string& group, cons
     return value.toString().toStdString();
 }
 
+// A value stored already is not written again: opening one file after another in the same folder
+// would otherwise rewrite the settings file, and wait for the disk, at every open.
 void IniSettingsStore::write(const std::string& group, const std::string& name, const std::string& value)
 {
+    settings_->sync(); // takes in what another instance of the program wrote meanwhile
+    if (read(group, name) == value)
+        return;
     settings_->setValue(key(group, name), text(value));
     settings_->sync();
 }

@@ -1,6 +1,11 @@
 // SPDX-License-Identifier: MIT
 #include <gtest/gtest.h>
 
+#include <fstream>
+#include <iterator>
+#include <string>
+#include <sys/stat.h>
+
 #include "IniSettingsStore.h"
 #include "Preferences.h"
 #include "TempDir.h"
@@ -54,6 +59,28 @@ TEST_F(PreferencesStore, LastPathOrTheProgramFolder)
     EXPECT_EQ(StartFolder(store, "/opt/quillmark"), "/home/ann/parts");
     IniSettingsStore reopened(dir.file("Quillmark.ini"));
     EXPECT_EQ(StartFolder(reopened, "/x"), "/home/ann/parts");
+}
+
+// Opening file after file in one folder stores the same folder each time: the settings file is
+// rewritten only for a new value, and a value another instance of the program stored meanwhile
+// still gives way to this one.
+TEST_F(PreferencesStore, OnlyANewValueRewritesTheSettingsFile)
+{
+    const auto inode = [this]() {
+        struct stat info {};
+        EXPECT_EQ(::stat(dir.file("Quillmark.ini").c_str(), &info), 0);
+        return info.st_ino;
+    };
+    StoreLastPath(store, "/parts");
+    const auto written = inode();
+    StoreLastPath(store, "/parts");
+    EXPECT_EQ(inode(), written);
+    std::ifstream stored(dir.file("Quillmark.ini"));
+    std::string text((std::istreambuf_iterator<char>(stored)), std::istreambuf_iterator<char>());
+    text.replace(text.find("/parts"), 6, "/p"); // as another instance would write it
+    std::ofstream(dir.file("Quillmark.ini"), std::ios::trunc) << text;
+    StoreLastPath(store, "/parts");
+    EXPECT_EQ(IniSettingsStore{dir.file("Quillmark.ini")}.read(DefaultGroup, "LastPath"), "/parts");
 }
 
 } // namespace
