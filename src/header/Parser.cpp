@@ -58,10 +58,10 @@ void makeRoom(std::string& text, std::size_t adding, std::size_t restOfText)
         text.reserve(text.size() + adding + restOfText);
 }
 
-void makeRoom(StringList& list, std::size_t restOfText)
+void makeRoom(EntryList& list, std::size_t adding, std::size_t restOfText)
 {
-    if (list.size() == list.capacity() && list.size() >= LargeList)
-        list.reserve(list.size() + 1 + restOfText / ShortestListLine);
+    if (list.size() >= LargeList && !list.fits(adding))
+        list.reserve(list.size() + 1 + restOfText / ShortestListLine, list.textSize() + adding + restOfText);
 }
 
 void appendLine(std::string& text, std::string_view line)
@@ -88,10 +88,10 @@ private:
     std::string_view word(std::size_t position) const { return words_.word(position); }
     std::size_t wordCount() const { return words_.count(); }
     std::string joinedFrom(std::size_t k) const { return words_.joinedFrom(k); }
-    void addEntry(StringList& list, std::string entry)
+    void addEntry(EntryList& list, std::string_view entry)
     {
-        makeRoom(list, body_.remainingBytes());
-        list.push_back(std::move(entry));
+        makeRoom(list, entry.size(), body_.remainingBytes());
+        list.push_back(entry);
     }
 
     void takeDescription(std::string_view line);
@@ -148,7 +148,7 @@ void HeaderParser::takeKeywordLine(std::string_view line)
     else if (keyword == "BFC")
         takeBfc(line);
     else if (keyword == "COLOR")
-        addEntry(h_.ColorLines, std::string(line));
+        addEntry(h_.ColorLines, line);
     else if (isOneOf(keyword, {"Unofficial", "unofficial", "UNOFFICIAL"})) {
         if (isOneOf(word(3), {"Part", "Model", "part", "model", "element", "Element", "ELEMENT"}))
             h_.PartType = "Unofficial_Part";
