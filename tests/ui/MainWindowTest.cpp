@@ -255,6 +255,11 @@ TEST_F(WindowTest, SaveWritesTheComposedHeaderAndBackup)
     EXPECT_NE(ReadBytes(path).find("\r\n0 BFC CERTIFY CW\r\n"), std::string::npos);
     EXPECT_EQ(ReadBytes(path), window->newHeaderText() + app.Header.Body + "\r\n");
     EXPECT_EQ(ReadBytes(work.file("3001_Backup_2008-08-10_14-05-09.dat")), GoodPart);
+    // From now on the header saved, not the one opened, is what the file holds.
+    bfc->setCurrentIndex(bfc->findText("CERTIFY CCW"));
+    EXPECT_TRUE(app.Header.FileChanged);
+    bfc->setCurrentIndex(bfc->findText("CERTIFY CW"));
+    EXPECT_FALSE(app.Header.FileChanged);
 }
 
 TEST_F(WindowTest, EveryRoadThatSavesAsksBeforeOverwritingAnotherProgramsChanges)
