@@ -7,9 +7,10 @@ EntryList::EntryList(std::initializer_list<std::string_view> entries)
         push_back(entry);
 }
 
-void EntryList::push_back(std::string_view entry)
+void EntryList::pushPieces(std::initializer_list<std::string_view> pieces)
 {
-    text_ += entry;
+    for (const auto piece : pieces)
+        text_ += piece;
     ends_.push_back(text_.size());
 }
 

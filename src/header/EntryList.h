@@ -61,7 +61,9 @@ public:
     // The bytes of all entries together.
     std::size_t textSize() const { return text_.size(); }
 
-    void push_back(std::string_view entry);
+    void push_back(std::string_view entry) { pushPieces({entry}); }
+    // Adds the entry made of the pieces one after another, written where it is kept.
+    void pushPieces(std::initializer_list<std::string_view> pieces);
     void replace(std::size_t row, std::string_view entry);
     void erase(std::size_t row);
     void clear();
