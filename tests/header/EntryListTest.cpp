@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 #include <gtest/gtest.h>
 
+#include <cstdint>
 #include <string>
 #include <vector>
 
@@ -8,7 +9,8 @@
 
 namespace {
 
-std::vector<std::string> entriesOf(const EntryList& list)
+template <typename List>
+std::vector<std::string> entriesOf(const List& list)
 {
     std::vector<std::string> entries;
     for (const auto entry : list)
@@ -64,6 +66,34 @@ TEST(EntryList, RoomMadeAheadKeepsTheEntries)
     list.push_back("w");
     EXPECT_EQ(entriesOf(list), (Entries{"x", "yz", "w"}));
     EXPECT_EQ(list.textSize(), 4u);
+}
+
+// With offsets of one byte, an end passes what an offset holds every 256 bytes: the entries read
+// back the same however far past that the text runs, an entry passing it twice included, and
+// through edits that move the ends back and forth across it.
+TEST(EntryList, EntriesPastWhatAnOffsetHoldsReadBackTheSame)
+{
+    BasicEntryList<std::uint8_t> list;
+    Entries model;
+    for (std::size_t i = 0; i < 40; ++i) {
+        model.emplace_back(i * 7 % 30, static_cast<char>('a' + i % 26));
+        list.push_back(model.back());
+    }
+    model.emplace_back(600, 'L');
+    list.push_back(model.back());
+    list.push_back("after");
+    model.emplace_back("after");
+    EXPECT_EQ(entriesOf(list), model);
+    model[3] = std::string(300, 'R');
+    list.replace(3, model[3]);
+    EXPECT_EQ(entriesOf(list), model);
+    model.erase(model.begin() + 40);
+    list.erase(40);
+    model.erase(model.begin());
+    list.erase(0);
+    model[2] = "";
+    list.replace(2, "");
+    EXPECT_EQ(entriesOf(list), model);
 }
 
 } // namespace
