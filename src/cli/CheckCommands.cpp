@@ -21,6 +21,7 @@
 #include "HeaderEdits.h"
 #include "ListFolder.h"
 #include "NewFile.h"
+#include "PartFile.h"
 #include "PartFileList.h"
 #include "QmError.h"
 #include "Summary.h"
@@ -102,17 +103,15 @@ void noteFindings(FileReport& report, const SaveFindings& findings)
     report.fixups = findings.fixups;
 }
 
-// Opens the file at path (see OpenForCli for keep and restoreWith) and lets handle fill the
-// report; an unreadable file is reported as such. Quiet, the messages of the file's dialogs are
-// not shown.
-FileReport reportOn(const std::string& path, bool quiet, ConsoleDialogs::Answerer answerer, KeepBytes keep,
-                    FolderSweeps* restoreWith,
-                    const std::function<void(OpenedPart&, ConsoleDialogs&, FileReport&)>& handle)
+// Opens the file at path (see OpenForCli for restoreWith) and lets handle fill the report; an
+// unreadable file is reported as such. Quiet, the messages of the file's dialogs are not shown.
+FileReport reportOn(const std::string& path, bool quiet, ConsoleDialogs::Answerer answerer, FolderSweeps* restoreWith,
+                    const std::function<void(HeaderData&, ConsoleDialogs&, FileReport&)>& handle)
 {
     FileReport report;
     std::ostringstream err, discarded;
     ConsoleDialogs dialogs(quiet ? discarded : err, std::move(answerer));
-    auto opened = OpenForCli(path, dialogs, err, keep, restoreWith);
+    auto opened = OpenForCli(path, dialogs, err, restoreWith);
     if (!opened) {
         report.unreadable = true;
         report.status = ExitStatus::Unreadable;
@@ -230,29 +229,27 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
     // A check never writes, not even to undo what a killed save left: the next save does that.
     return runBatch(arguments, batch, out, err, [&](const std::string& path) {
         // A check never writes, not even to undo what a killed save left: the next save does that.
-        return reportOn(path, batch.quiet, {}, KeepBytes::No, nullptr,
-                        [&](OpenedPart& opened, ConsoleDialogs& dialogs, FileReport& report) {
-                            const auto& header = opened.header;
-                            const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
-                            TrackerFindings tracker; // empty unless asked for
-                            if (options.tracker) {
-                                const auto& codes = colours->forPart(
-                                    path, [&dialogs](const std::string& text) { dialogs.message({text}); });
-                                tracker = CheckRecordForTracker(header, ComposeHeader(header), categories, codes);
-                            }
-                            const auto* trackerFindings = options.tracker ? &tracker : nullptr;
-                            report.out = options.json ? checkJson(header, findings, trackerFindings).dump() + '\n'
-                                                      : findingLines(header.FilePath, findings, trackerFindings);
-                            noteFindings(report, findings);
-                            bool trackerRefuses = false;
-                            for (const auto& finding : tracker) {
-                                report.trackerIds.push_back(finding.id);
-                                trackerRefuses = trackerRefuses || finding.level == FindingLevel::Error;
-                            }
-                            report.refused = trackerRefuses;
-                            report.status =
-                                findings.refusals.empty() && !trackerRefuses ? ExitStatus::Ok : ExitStatus::Refused;
-                        });
+        return reportOn(
+            path, batch.quiet, {}, nullptr, [&](const HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
+                const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
+                TrackerFindings tracker; // empty unless asked for
+                if (options.tracker) {
+                    const auto& codes =
+                        colours->forPart(path, [&dialogs](const std::string& text) { dialogs.message({text}); });
+                    tracker = CheckRecordForTracker(header, ComposeHeader(header), categories, codes);
+                }
+                const auto* trackerFindings = options.tracker ? &tracker : nullptr;
+                report.out = options.json ? checkJson(header, findings, trackerFindings).dump() + '\n'
+                                          : findingLines(header.FilePath, findings, trackerFindings);
+                noteFindings(report, findings);
+                bool trackerRefuses = false;
+                for (const auto& finding : tracker) {
+                    report.trackerIds.push_back(finding.id);
+                    trackerRefuses = trackerRefuses || finding.level == FindingLevel::Error;
+                }
+                report.refused = trackerRefuses;
+                report.status = findings.refusals.empty() && !trackerRefuses ? ExitStatus::Ok : ExitStatus::Refused;
+            });
     });
 }
 
@@ -279,40 +276,43 @@ int RunEdit(const std::vector<std::string>& arguments, const SaveOptions& option
     FolderSweeps sweeps;
     return runBatch(arguments, batch, out, err, [&](const std::string& path) {
         const std::lock_guard lock(locks.of(path));
-        return reportOn(
-            path, batch.quiet, answer, KeepBytes::Yes, edit.dryRun ? nullptr : &sweeps, // a dry run writes nothing
-            [&](OpenedPart& opened, ConsoleDialogs& dialogs, FileReport& report) {
-                auto& header = opened.header;
-                if (const auto refusal = ApplyHeaderEdits(header, edit.edits, clock.now())) {
-                    report.saving = FileReport::Saving::Skipped;
-                    report.status = ExitStatus::Refused;
-                    report.out = "skipped " + ShownText(path) + ": " + *refusal + '\n';
-                    return;
-                }
-                if (edit.json) {
-                    const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
-                    auto json = checkJson(header, findings, nullptr);
-                    json["old_header"] = TextForJson(header.OldHeader);
-                    json["new_header"] = TextForJson(ComposeHeader(header));
-                    report.out = json.dump() + '\n';
-                    noteFindings(report, findings);
-                    report.status = findings.refusals.empty() ? ExitStatus::Ok : ExitStatus::Refused;
-                    return;
-                }
-                const SaveContext context{dialogs,
-                                          clock,
-                                          options.backup,
-                                          [&header] { return ComposeHeader(header); },
-                                          [] {},
-                                          batch.limitDescription,
-                                          opened.content->view(),
-                                          edit.dryRun,
-                                          &sweeps};
-                const auto result = CheckHeaderAndSave(header, context);
-                report.out = savedLine(header.FilePath, options, result, dialogs, report);
-                if (edit.dryRun &&
-                    (result.outcome == SaveOutcome::NotWritten || result.outcome == SaveOutcome::Unchanged))
-                    report.out = UnifiedDiff(opened.content->view(), SavedText(header, ComposeHeader(header)), path);
-            });
+        return reportOn(path, batch.quiet, answer, edit.dryRun ? nullptr : &sweeps, // a dry run writes nothing
+                        [&](HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
+                            if (const auto refusal = ApplyHeaderEdits(header, edit.edits, clock.now())) {
+                                report.saving = FileReport::Saving::Skipped;
+                                report.status = ExitStatus::Refused;
+                                report.out = "skipped " + ShownText(path) + ": " + *refusal + '\n';
+                                return;
+                            }
+                            if (edit.json) {
+                                const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
+                                auto json = checkJson(header, findings, nullptr);
+                                json["old_header"] = TextForJson(header.OldHeader);
+                                json["new_header"] = TextForJson(ComposeHeader(header));
+                                report.out = json.dump() + '\n';
+                                noteFindings(report, findings);
+                                report.status = findings.refusals.empty() ? ExitStatus::Ok : ExitStatus::Refused;
+                                return;
+                            }
+                            // Nothing a save writes or says comes from the old header: its memory goes back before
+                            // the new header is composed, so that a header of millions of lines is not held thrice.
+                            header.OldHeader.clear();
+                            header.OldHeader.shrink_to_fit();
+                            const SaveContext context{.dialogs = dialogs,
+                                                      .clock = clock,
+                                                      .makeBackup = options.backup,
+                                                      .newHeader = [&header] { return ComposeHeader(header); },
+                                                      .recompose = [] {},
+                                                      .limitDescription = batch.limitDescription,
+                                                      .skipUnchanged = true,
+                                                      .dryRun = edit.dryRun,
+                                                      .sweeps = &sweeps};
+                            const auto result = CheckHeaderAndSave(header, context);
+                            report.out = savedLine(header.FilePath, options, result, dialogs, report);
+                            if (edit.dryRun &&
+                                (result.outcome == SaveOutcome::NotWritten || result.outcome == SaveOutcome::Unchanged))
+                                report.out =
+                                    UnifiedDiff(FileBytes(path).view(), SavedText(header, ComposeHeader(header)), path);
+                        });
     });
 }

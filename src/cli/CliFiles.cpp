@@ -9,6 +9,7 @@
 #include "ListFolder.h"
 #include "OpenDocument.h"
 #include "ParseProgress.h"
+#include "PartFile.h"
 #include "QmError.h"
 #include "StandardLists.h"
 #include "TextFile.h"
@@ -38,22 +39,19 @@ int handleCatching(const std::string& path, HeaderData& header, std::ostream& er
 
 } // namespace
 
-std::optional<OpenedPart> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err,
-                                     KeepBytes keep, FolderSweeps* restoreWith)
+std::optional<HeaderData> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err,
+                                     FolderSweeps* restoreWith)
 {
     dialogs.setCurrentFile(path);
     try {
         if (restoreWith != nullptr)
             RestoreInterruptedSaveOf(path, dialogs, restoreWith);
-        OpenedPart opened{std::make_unique<FileBytes>(path), {}};
-        opened.header.ReadStamp = opened.content->stamp();
+        FileBytes content(path);
+        HeaderData header;
+        header.ReadStamp = content.stamp();
         ParseProgress silent;
-        // Without the bytes to keep, they become the body: the file is in memory once.
-        auto bytes = keep == KeepBytes::Yes ? std::string(opened.content->view()) : opened.content->takeBytes();
-        if (keep == KeepBytes::No)
-            opened.content.reset();
-        OpenPartFileContent(opened.header, path, std::move(bytes), dialogs, silent);
-        return opened;
+        OpenPartFileContent(header, path, content.takeBytes(), dialogs, silent);
+        return header;
     } catch (const std::exception& failure) {
         ReportUnreadable(path, failure, err);
         return std::nullopt;
@@ -66,7 +64,7 @@ int ForEachOpenedFile(const std::vector<std::string>& paths, ConsoleDialogs& dia
     int status = ExitStatus::Ok;
     for (const auto& path : paths) {
         auto opened = OpenForCli(path, dialogs, err);
-        status = std::max(status, opened ? handleCatching(path, opened->header, err, handle) : ExitStatus::Unreadable);
+        status = std::max(status, opened ? handleCatching(path, *opened, err, handle) : ExitStatus::Unreadable);
     }
     return status;
 }

@@ -2,7 +2,6 @@
 #pragma once
 
 #include <functional>
-#include <memory>
 #include <optional>
 #include <ostream>
 #include <string>
@@ -10,7 +9,6 @@
 
 #include "HeaderData.h"
 #include "ListKinds.h"
-#include "PartFile.h"
 
 class ConsoleDialogs;
 class FolderSweeps;
@@ -27,21 +25,12 @@ inline constexpr int SaveFailed = 3;
 // The one line that names a file that could not be read or worked on.
 void ReportUnreadable(const std::string& path, const std::exception& failure, std::ostream& err);
 
-// A part file as opened, with the bytes it was read from when they were kept.
-struct OpenedPart {
-    std::unique_ptr<FileBytes> content; // null unless kept
-    HeaderData header;
-};
-
-// Whether an open keeps the file's bytes beside the record, for a save that compares its text with
-// them: a copy, where otherwise the bytes themselves become the body.
-enum class KeepBytes { No, Yes };
-
 // Opens path as the Open command does; with restoreWith (see ReplaceOptions::sweeps), after undoing
-// what a killed save left there, as a command that writes does first. When the file cannot be read,
-// says so in one line on err and returns nullopt.
-std::optional<OpenedPart> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err,
-                                     KeepBytes keep = KeepBytes::No, FolderSweeps* restoreWith = nullptr);
+// what a killed save left there, as a command that writes does first. The file's bytes become the
+// record's body: the file is in memory once. When the file cannot be read, says so in one line on
+// err and returns nullopt.
+std::optional<HeaderData> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err,
+                                     FolderSweeps* restoreWith = nullptr);
 
 // The folder of the running program, where a build keeps its list and data files.
 std::string ProgramFolder();

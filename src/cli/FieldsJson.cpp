@@ -7,10 +7,10 @@
 
 namespace {
 
-nlohmann::json textList(const StringList& list)
+nlohmann::json textList(const EntryList& list)
 {
     auto array = nlohmann::json::array();
-    for (const auto& entry : list)
+    for (const auto entry : list)
         array.push_back(Latin1ToUtf8(entry));
     return array;
 }

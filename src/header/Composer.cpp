@@ -15,9 +15,9 @@ void addLine(std::string& text, std::initializer_list<std::string_view> pieces)
 }
 
 // One "prefix + entry" line per entry; true when anything was written.
-bool addPrefixedLines(std::string& text, std::string_view prefix, const StringList& entries)
+bool addPrefixedLines(std::string& text, std::string_view prefix, const EntryList& entries)
 {
-    for (const auto& entry : entries)
+    for (const auto entry : entries)
         addLine(text, {prefix, entry});
     return !entries.empty();
 }
@@ -30,9 +30,8 @@ std::size_t sizeBound(const HeaderData& h)
     for (const std::string* field : {&h.PartDescription, &h.PartName, &h.AuthorRealName, &h.AuthorUserName, &h.PartType,
                                      &h.UpdateTag, &h.License, &h.Bfc, &h.Category})
         size += field->size() + perLine;
-    for (const StringList* list : {&h.HelpLines, &h.Keywords, &h.CmdLines, &h.History, &h.Comments, &h.ColorLines})
-        for (const auto& entry : *list)
-            size += entry.size() + perLine;
+    for (const EntryList* list : {&h.HelpLines, &h.Keywords, &h.CmdLines, &h.History, &h.Comments, &h.ColorLines})
+        size += list->textSize() + list->size() * perLine;
     return size;
 }
 
@@ -76,8 +75,8 @@ bool addCategoryAndKeywords(std::string& text, const HeaderData& h)
 // Comments read from the file keep their "//"; typed ones get it here.
 bool addComments(std::string& text, const HeaderData& h)
 {
-    for (const auto& entry : h.Comments)
-        addLine(text, {entry.compare(0, 2, "//") == 0 ? "0 " : "0 // ", entry});
+    for (const auto entry : h.Comments)
+        addLine(text, {entry.starts_with("//") ? "0 " : "0 // ", entry});
     return !h.Comments.empty();
 }
 
@@ -97,7 +96,7 @@ std::string ComposeHeader(const HeaderData& h)
     endGroup(text, addPrefixedLines(text, "0 !CMDLINE ", h.CmdLines));
     endGroup(text, addPrefixedLines(text, "0 !HISTORY ", h.History));
     endGroup(text, addComments(text, h));
-    for (const auto& colorLine : h.ColorLines)
+    for (const auto colorLine : h.ColorLines)
         if (!colorLine.empty())
             addLine(text, {colorLine});
     return text;

@@ -6,6 +6,7 @@
 #include "Dialogs.h"
 #include "ErrorReport.h"
 #include "SafeReplace.h"
+#include "SameBytes.h"
 #include "Text.h"
 
 namespace {
@@ -129,17 +130,12 @@ std::string SavedText(const HeaderData& header, const std::string& newHeader)
     return text;
 }
 
-bool SaveWouldWrite(const HeaderData& header, const std::string& newHeader, std::string_view bytes)
+bool FileHoldsSavedText(const HeaderData& header, const std::string& newHeader)
 {
-    for (const auto piece : SavedPieces(header, newHeader)) {
-        if (!bytes.starts_with(piece))
-            return false;
-        bytes.remove_prefix(piece.size());
-    }
-    return bytes.empty();
+    return FileHoldsExactly(header.FilePath, SavedPieces(header, newHeader));
 }
 
-FileSaveResult FileSave(HeaderData& header, const std::string& newHeader, bool makeBackup, const Clock& clock,
+FileSaveResult FileSave(HeaderData& header, std::string newHeader, bool makeBackup, const Clock& clock,
                         Dialogs& dialogs, FolderSweeps* sweeps)
 {
     FileSaveResult result;
@@ -169,7 +165,7 @@ FileSaveResult FileSave(HeaderData& header, const std::string& newHeader, bool m
             }
         }
         header.ReadStamp = StampOfPath(target);
-        header.HeaderAtOpenOrSave = newHeader;
+        header.HeaderAtOpenOrSave = std::move(newHeader);
         header.FileChanged = false;
         result.saved = true;
     } catch (const QmError& error) {

@@ -30,8 +30,8 @@ std::array<std::string_view, 4> SavedPieces(const HeaderData& header, const std:
 // The text a save writes, in one piece.
 std::string SavedText(const HeaderData& header, const std::string& newHeader);
 
-// True when a save would write exactly bytes.
-bool SaveWouldWrite(const HeaderData& header, const std::string& newHeader, std::string_view bytes);
+// True when the file at FilePath holds exactly what a save would write.
+bool FileHoldsSavedText(const HeaderData& header, const std::string& newHeader);
 
 struct FileSaveResult {
     bool saved = false;
@@ -42,8 +42,9 @@ struct FileSaveResult {
 // backup beside that file when makeBackup is on (numbered when that name is taken), and clears
 // FileChanged. A file that changed on disk since it was read, up to the moment the new text
 // takes its name, is only overwritten when the user says so. A failure is reported through
-// dialogs, and FileChanged stays. sweeps: see ReplaceOptions.
-FileSaveResult FileSave(HeaderData& header, const std::string& newHeader, bool makeBackup, const Clock& clock,
+// dialogs, and FileChanged stays. sweeps: see ReplaceOptions. The header written is kept as
+// HeaderAtOpenOrSave.
+FileSaveResult FileSave(HeaderData& header, std::string newHeader, bool makeBackup, const Clock& clock,
                         Dialogs& dialogs, FolderSweeps* sweeps = nullptr);
 
 // Undoes what a save killed in the middle of rewriting the file at path in place left there, and

@@ -5,9 +5,11 @@
 #include <string>
 #include <vector>
 
+#include "EntryList.h"
 #include "FileStamp.h"
 
-// A list of header lines. The texts talk about entry 1 to count; the code indexes from 0.
+// A list of texts, such as a list file's entries. The texts talk about entry 1 to count; the code
+// indexes from 0.
 using StringList = std::vector<std::string>;
 
 // How the window shows the file's bytes: a file whose bytes are valid UTF-8 is edited as
@@ -29,12 +31,12 @@ struct HeaderData {
     std::string License;
     std::string Bfc;
     std::string Category;
-    StringList Keywords;
-    StringList History;
-    StringList Comments;
-    StringList HelpLines;
-    StringList CmdLines;
-    StringList ColorLines;
+    EntryList Keywords;
+    EntryList History;
+    EntryList Comments;
+    EntryList HelpLines;
+    EntryList CmdLines;
+    EntryList ColorLines;
     std::string OldHeader;
     std::string Body;
     TextEncoding Encoding = TextEncoding::Utf8;

@@ -39,9 +39,9 @@ void setAuthor(HeaderData& h, std::string_view author)
 }
 
 // A history entry begins with its date, "YYYY-MM-DD".
-bool datedSince(const std::string& entry, std::string_view day)
+bool datedSince(std::string_view entry, std::string_view day)
 {
-    const auto date = DateOfWord(std::string_view(entry).substr(0, entry.find(' ')));
+    const auto date = DateOfWord(entry.substr(0, entry.find(' ')));
     return date && *date >= day;
 }
 
@@ -57,8 +57,10 @@ std::string currentLicense(const HeaderData& h, const HeaderEdits& edits, const 
 
 void addKeywords(HeaderData& h, const StringList& keywords)
 {
+    if (keywords.empty())
+        return;
     StringList present;
-    for (const auto& entry : h.Keywords)
+    for (const auto entry : h.Keywords)
         for (auto& keyword : SplitKeywords(entry))
             present.push_back(std::move(keyword));
     StringList added;
@@ -72,8 +74,10 @@ void addKeywords(HeaderData& h, const StringList& keywords)
 // An entry keeps its own spelling unless one of its keywords goes; an entry left empty goes too.
 void removeKeywords(HeaderData& h, const StringList& keywords)
 {
-    StringList kept;
-    for (const auto& entry : h.Keywords) {
+    if (keywords.empty())
+        return;
+    EntryList kept;
+    for (const auto entry : h.Keywords) {
         auto words = SplitKeywords(entry);
         const auto end = std::remove_if(words.begin(), words.end(),
                                         [&keywords](const auto& word) { return containsIgnoreCase(keywords, word); });

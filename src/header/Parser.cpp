@@ -58,10 +58,10 @@ void makeRoom(std::string& text, std::size_t adding, std::size_t restOfText)
         text.reserve(text.size() + adding + restOfText);
 }
 
-void makeRoom(StringList& list, std::size_t restOfText)
+void makeRoom(EntryList& list, std::size_t adding, std::size_t restOfText)
 {
-    if (list.size() == list.capacity() && list.size() >= LargeList)
-        list.reserve(list.size() + 1 + restOfText / ShortestListLine);
+    if (list.size() >= LargeList && !list.fits(adding))
+        list.reserve(list.size() + 1 + restOfText / ShortestListLine, list.textSize() + adding + restOfText);
 }
 
 void appendLine(std::string& text, std::string_view line)
@@ -87,11 +87,16 @@ private:
     }
     std::string_view word(std::size_t position) const { return words_.word(position); }
     std::size_t wordCount() const { return words_.count(); }
-    std::string joinedFrom(std::size_t k) const { return words_.joinedFrom(k); }
-    void addEntry(StringList& list, std::string entry)
+    std::string_view joinedFrom(std::size_t k) const { return words_.joinedFrom(k); }
+    // The entry's pieces go straight into the list: a line of many megabytes is never copied
+    // into an entry of its own first.
+    void addEntry(EntryList& list, std::initializer_list<std::string_view> pieces)
     {
-        makeRoom(list, body_.remainingBytes());
-        list.push_back(std::move(entry));
+        std::size_t size = 0;
+        for (const auto piece : pieces)
+            size += piece.size();
+        makeRoom(list, size, body_.remainingBytes());
+        list.pushPieces(pieces);
     }
 
     void takeDescription(std::string_view line);
@@ -148,7 +153,7 @@ void HeaderParser::takeKeywordLine(std::string_view line)
     else if (keyword == "BFC")
         takeBfc(line);
     else if (keyword == "COLOR")
-        addEntry(h_.ColorLines, std::string(line));
+        addEntry(h_.ColorLines, {line});
     else if (isOneOf(keyword, {"Unofficial", "unofficial", "UNOFFICIAL"})) {
         if (isOneOf(word(3), {"Part", "Model", "part", "model", "element", "Element", "ELEMENT"}))
             h_.PartType = "Unofficial_Part";
@@ -160,15 +165,15 @@ void HeaderParser::takeKeywordLine(std::string_view line)
     } else if (isOneOf(keyword, {"!LDRAW_ORG", "LDRAW_ORG", "!LDRAW"}))
         takePartType();
     else if (isOneOf(keyword, {"!CMDLINE", "CMDLINE"}))
-        addEntry(h_.CmdLines, joinedFrom(3));
+        addEntry(h_.CmdLines, {joinedFrom(3)});
     else if (isOneOf(keyword, {"!KEYWORDS", "KEYWORDS"}))
-        addEntry(h_.Keywords, joinedFrom(3));
+        addEntry(h_.Keywords, {joinedFrom(3)});
     else if (keyword == "!HELP")
-        addEntry(h_.HelpLines, joinedFrom(3));
+        addEntry(h_.HelpLines, {joinedFrom(3)});
     else if (keyword == "!LICENSE")
         h_.License = joinedFrom(3);
     else if (isOneOf(keyword, {"HISTORY", "!HISTORY"}))
-        addEntry(h_.History, joinedFrom(3));
+        addEntry(h_.History, {joinedFrom(3)});
     else if (keyword == "//")
         takeComment();
     else
@@ -233,9 +238,9 @@ void HeaderParser::takePartType()
 void HeaderParser::takeComment()
 {
     if (const auto date = DateOfWord(word(3)))
-        addEntry(h_.History, *date + " " + joinedFrom(4));
+        addEntry(h_.History, {*date, " ", joinedFrom(4)});
     else
-        addEntry(h_.Comments, joinedFrom(2));
+        addEntry(h_.Comments, {joinedFrom(2)});
 }
 
 // An old history line without keyword ("0 2004-03-12 [jdoe] fixed"), or a meta line the header
@@ -243,7 +248,7 @@ void HeaderParser::takeComment()
 void HeaderParser::takeDatedOrBody(std::string_view line)
 {
     if (const auto date = DateOfWord(word(2)))
-        addEntry(h_.History, *date + " " + joinedFrom(3));
+        addEntry(h_.History, {*date, " ", joinedFrom(3)});
     else
         toBody(line);
 }

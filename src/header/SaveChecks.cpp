@@ -94,11 +94,11 @@ SaveResult CheckHeaderAndSave(HeaderData& h, const SaveContext& context)
             return {SaveOutcome::Declined, {}};
     }
     offerFixUps(h, context);
-    const auto newHeader = context.newHeader();
-    if (context.heldBytes && SaveWouldWrite(h, newHeader, *context.heldBytes))
+    auto newHeader = context.newHeader();
+    if (context.skipUnchanged && FileHoldsSavedText(h, newHeader))
         return {SaveOutcome::Unchanged, {}};
     if (context.dryRun)
         return {SaveOutcome::NotWritten, {}};
-    const auto saved = FileSave(h, newHeader, context.makeBackup, context.clock, dialogs, context.sweeps);
+    const auto saved = FileSave(h, std::move(newHeader), context.makeBackup, context.clock, dialogs, context.sweeps);
     return {saved.saved ? SaveOutcome::Saved : SaveOutcome::Failed, saved.backupPath};
 }

@@ -53,8 +53,8 @@ struct SaveContext {
     std::function<std::string()> newHeader;
     std::function<void()> recompose;
     bool limitDescription = true; // off: the description may be of any length
-    // The file's bytes as read, when a save that would write them again is to write nothing.
-    std::optional<std::string_view> heldBytes = std::nullopt;
+    // On: a save that would write what the file holds already writes nothing.
+    bool skipUnchanged = false;
     bool dryRun = false;            // everything but the writing
     FolderSweeps* sweeps = nullptr; // see ReplaceOptions
 };

@@ -32,7 +32,7 @@ std::string_view Words::word(std::size_t position) const
     return text_.substr(start, end == std::string_view::npos ? std::string_view::npos : end - start);
 }
 
-std::string Words::joinedFrom(std::size_t k) const
+std::string_view Words::joinedFrom(std::size_t k) const
 {
     if (k > count_)
         return {};
@@ -43,5 +43,5 @@ std::string Words::joinedFrom(std::size_t k) const
     // Blanks at the end go too: the composer writes the text with a line end right after it, so
     // any blank left here would be read back as one fewer by the next open, and a file would
     // change with every save.
-    return std::string(rest.substr(firstText, rest.find_last_not_of(' ') + 1 - firstText));
+    return rest.substr(firstText, rest.find_last_not_of(' ') + 1 - firstText);
 }

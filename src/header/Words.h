@@ -18,8 +18,8 @@ public:
     // Word position (1 to count); the view points into the line.
     std::string_view word(std::size_t position) const;
     // The words from position k joined by single blanks; empty words before the first non-empty
-    // one are skipped, later empty words keep their blank.
-    std::string joinedFrom(std::size_t k) const;
+    // one are skipped, later empty words keep their blank. The view points into the line.
+    std::string_view joinedFrom(std::size_t k) const;
 
 private:
     std::size_t startOf(std::size_t position) const;

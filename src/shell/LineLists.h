@@ -11,10 +11,10 @@
 // and Edit and Delete act on the selected row's own entry.
 
 // Appends the trimmed text unless it is empty; true when something was added.
-bool AddLineEntry(StringList& list, const std::string& typed);
+bool AddLineEntry(EntryList& list, const std::string& typed);
 // Replaces entry row (from 0) by the trimmed text unless it is empty; true when it did.
-bool EditLineEntry(StringList& list, std::size_t row, const std::string& typed);
-void DeleteLineEntry(StringList& list, std::size_t row);
+bool EditLineEntry(EntryList& list, std::size_t row, const std::string& typed);
+void DeleteLineEntry(EntryList& list, std::size_t row);
 
 // Today's history line to start from: "YYYY-MM-DD [user] ".
 std::string HistoryStub(const LocalDateTime& today, const std::string& userName);

@@ -114,10 +114,10 @@ private:
     void FillKeywordList();
     void FillCommentList();
     void FillHistoryList();
-    void addLine(StringList& list, const char* prompt, const char* title, const std::string& defaultText);
-    void fillLineList(QListWidget& box, const StringList& list);
-    void editLine(StringList& list, QListWidget& box, const char* prompt, const char* title);
-    void deleteLine(StringList& list, QListWidget& box);
+    void addLine(EntryList& list, const char* prompt, const char* title, const std::string& defaultText);
+    void fillLineList(QListWidget& box, const EntryList& list);
+    void editLine(EntryList& list, QListWidget& box, const char* prompt, const char* title);
+    void deleteLine(EntryList& list, QListWidget& box);
     void refillLists();
 
     void editStandardList(ListKind kind, QComboBox& combo, const char* handler);

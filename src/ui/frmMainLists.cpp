@@ -7,11 +7,11 @@
 #include "LineLists.h"
 #include "frmMain.h"
 
-void frmMain::fillLineList(QListWidget& box, const StringList& list)
+void frmMain::fillLineList(QListWidget& box, const EntryList& list)
 {
     box.clear();
-    for (const auto& entry : list)
-        box.addItem(ToWidget(entry, app_.Header.Encoding));
+    for (const auto entry : list)
+        box.addItem(ToWidget(std::string(entry), app_.Header.Encoding));
 }
 
 void frmMain::FillKeywordList() { fillLineList(*lsKeyWords, app_.Header.Keywords); }
@@ -25,7 +25,7 @@ void frmMain::refillLists()
     FillHistoryList();
 }
 
-void frmMain::addLine(StringList& list, const char* prompt, const char* title, const std::string& defaultText)
+void frmMain::addLine(EntryList& list, const char* prompt, const char* title, const std::string& defaultText)
 {
     const auto typed = services_.dialogs.input(prompt, title, defaultText);
     if (const auto bytes = toFile(typed))
@@ -34,12 +34,12 @@ void frmMain::addLine(StringList& list, const char* prompt, const char* title, c
     MakeNewHeader();
 }
 
-void frmMain::editLine(StringList& list, QListWidget& box, const char* prompt, const char* title)
+void frmMain::editLine(EntryList& list, QListWidget& box, const char* prompt, const char* title)
 {
     const int row = box.currentRow();
     if (row < 0 || box.selectedItems().isEmpty())
         return;
-    const auto old = ToUtf8(list[static_cast<std::size_t>(row)], app_.Header.Encoding);
+    const auto old = ToUtf8(std::string(list[static_cast<std::size_t>(row)]), app_.Header.Encoding);
     const auto typed = services_.dialogs.input(prompt, title, old);
     if (const auto bytes = toFile(typed))
         EditLineEntry(list, static_cast<std::size_t>(row), *bytes);
@@ -48,7 +48,7 @@ void frmMain::editLine(StringList& list, QListWidget& box, const char* prompt, c
     MakeNewHeader();
 }
 
-void frmMain::deleteLine(StringList& list, QListWidget& box)
+void frmMain::deleteLine(EntryList& list, QListWidget& box)
 {
     const int row = box.currentRow();
     if (row < 0 || box.selectedItems().isEmpty())

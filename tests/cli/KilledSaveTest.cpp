@@ -78,7 +78,7 @@ std::string killAt(const Road& road, const std::string& call, int count, const s
         std::ostringstream err;
         ConsoleDialogs dialogs(err);
         FolderSweeps sweeps;
-        OpenForCli(path, dialogs, err, KeepBytes::No, &sweeps);
+        OpenForCli(path, dialogs, err, &sweeps);
         ::_exit(err.str().find("restored " + path + " from an interrupted save") == std::string::npos ? 0 : 1);
     }));
     const auto bytes = ReadBytes(path);

@@ -48,8 +48,8 @@ TEST(HeaderEdits, EachSetFieldChangesTheRecordAndNothingElse)
     EXPECT_EQ(h.License, partRecord().License);
     EXPECT_EQ(h.Bfc, "NOCERTIFY");
     EXPECT_EQ(h.Category, "");
-    EXPECT_EQ(h.Keywords, (StringList{"wall", "Stud"}));
-    EXPECT_EQ(h.History, (StringList{"2004-03-04 [ssample] made", "2024-05-06 [jtester] Header edits"}));
+    EXPECT_EQ(h.Keywords, (EntryList{"wall", "Stud"}));
+    EXPECT_EQ(h.History, (EntryList{"2004-03-04 [ssample] made", "2024-05-06 [jtester] Header edits"}));
     EXPECT_EQ(h.PartName, "3001s01.dat") << "the type set before the name";
     edits = {};
     edits.author = " Jo Tester  ";

@@ -41,7 +41,7 @@ TEST_F(PartFileParse, LfOnlyFileIsConvertedInMemoryOnly)
 TEST_F(PartFileParse, TheFirstLineEndDecidesHowTheFileIsRead)
 {
     const std::string line = "1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat";
-    EXPECT_EQ(open("0 Brick\r\n0 // Inner\n" + line + "\r\n").Comments, (StringList{"// Inner\n" + line}));
+    EXPECT_EQ(open("0 Brick\r\n0 // Inner\n" + line + "\r\n").Comments, (EntryList{"// Inner\n" + line}));
     EXPECT_EQ(open("0 Brick\n0 Name: a.dat\r\n" + line + "\r\n2 24 0 0 0 1 1 1\n").Body,
               line + "\r\n2 24 0 0 0 1 1 1\r\n");
     EXPECT_EQ(open("0 Brick\r0 Name: b.dat\r1 x").Body, "1 x");

@@ -113,13 +113,13 @@ TEST(ParserRows, ListLinesKeepTheirWordsJoined)
                                "0 !CATEGORY Minifig Accessory",
                                "0 !LICENSE Redistributable under CCAL version 2.0 : see CAreadme.txt",
                                "0 !HISTORY 12.3.2004 text", "0 COLOR 4  red"});
-    EXPECT_EQ(h.Keywords, (StringList{"a,  b", "c"}));
+    EXPECT_EQ(h.Keywords, (EntryList{"a,  b", "c"}));
     EXPECT_EQ(h.Category, "Minifig Accessory");
-    EXPECT_EQ(h.HelpLines, (StringList{"x"}));
-    EXPECT_EQ(h.CmdLines, (StringList{"-c4"}));
+    EXPECT_EQ(h.HelpLines, (EntryList{"x"}));
+    EXPECT_EQ(h.CmdLines, (EntryList{"-c4"}));
     EXPECT_EQ(h.License, "Redistributable under CCAL version 2.0 : see CAreadme.txt");
-    EXPECT_EQ(h.History, (StringList{"12.3.2004 text"}));
-    EXPECT_EQ(h.ColorLines, (StringList{"0 COLOR 4  red"}));
+    EXPECT_EQ(h.History, (EntryList{"12.3.2004 text"}));
+    EXPECT_EQ(h.ColorLines, (EntryList{"0 COLOR 4  red"}));
 }
 
 TEST(ParserRows, CommentsAndDatedLines)
@@ -127,8 +127,8 @@ TEST(ParserRows, CommentsAndDatedLines)
     const auto h = parseLines({"0 d", "0 // 2004-03-12 [jdoe] fixed   ", "0 // fixed it   ", "0 //fixed it",
                                "0 2004-3-2 [jdoe] old style", "0 // 2004-03-12"});
     // Blanks at the end are dropped, all of them: a save writes what the next open reads alike.
-    EXPECT_EQ(h.History, (StringList{"2004-03-12 [jdoe] fixed", "2004-03-02 [jdoe] old style", "2004-03-12 "}));
-    EXPECT_EQ(h.Comments, (StringList{"// fixed it"}));
+    EXPECT_EQ(h.History, (EntryList{"2004-03-12 [jdoe] fixed", "2004-03-02 [jdoe] old style", "2004-03-12 "}));
+    EXPECT_EQ(h.Comments, (EntryList{"// fixed it"}));
     EXPECT_EQ(h.Body, "0 //fixed it");
 }
 
@@ -143,10 +143,10 @@ TEST(ParserRows, FormsThatAreNotKeywordsStayInTheBody)
 TEST(ParserDates, OnlyRealDaysInYearMonthDayForm)
 {
     const auto history = [](const std::string& word) { return parseLines({"0 d", "0 " + word + " x"}).History; };
-    EXPECT_EQ(history("2004-02-29"), (StringList{"2004-02-29 x"}));
+    EXPECT_EQ(history("2004-02-29"), (EntryList{"2004-02-29 x"}));
     EXPECT_TRUE(history("2003-02-29").empty());
     EXPECT_TRUE(history("1900-02-29").empty());
-    EXPECT_EQ(history("2000-2-29"), (StringList{"2000-02-29 x"}));
+    EXPECT_EQ(history("2000-2-29"), (EntryList{"2000-02-29 x"}));
     EXPECT_TRUE(history("2004-13-01").empty());
     EXPECT_TRUE(history("04-03-12").empty());
     EXPECT_TRUE(history("2004-003-12").empty());
@@ -160,7 +160,7 @@ TEST(ParserTwoWordLines, UnknownWordGoesToTheBodyKnownKeywordIsDropped)
     const auto h = parseLines({"0 d", "0 STEP", "0 Torso", "0 //", "0 Name:", "0 !KEYWORDS ", "0 !HELP", "0",
                                "0 2004-03-12", "1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat", "0 STEP"});
     EXPECT_EQ(h.Body, "0 STEP\r\n0 Torso\r\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat\r\n0 STEP");
-    EXPECT_EQ(h.History, (StringList{"2004-03-12 "}));
+    EXPECT_EQ(h.History, (EntryList{"2004-03-12 "}));
     EXPECT_TRUE(h.Keywords.empty());
     EXPECT_EQ(h.PartName, "");
 }
@@ -225,7 +225,7 @@ TEST(ParserAnyInput, OddBytesAreJustTextButBinaryFilesAreRefused)
     const std::string lateNul = "0 d\r\n0 // " + std::string(64 * 1024, 'x') + std::string(1, '\0');
     EXPECT_EQ(parseText(lateNul).PartDescription, "d") << "only the first 64 KiB are looked at";
     const auto blanks = parseLines({"0 d", "0 !KEYWORDS" + std::string(100000, ' ') + "x"});
-    EXPECT_EQ(blanks.Keywords, (StringList{"x"})) << "empty words before the first word are skipped";
+    EXPECT_EQ(blanks.Keywords, (EntryList{"x"})) << "empty words before the first word are skipped";
     const auto longLine = parseLines({"0 d", "1" + std::string(10 * 1024 * 1024, 'x')});
     EXPECT_EQ(longLine.Body.size(), 10u * 1024 * 1024 + 1);
 }

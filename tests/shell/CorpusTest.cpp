@@ -4,6 +4,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <iterator>
 #include <tuple>
 
 #include "Composer.h"
@@ -104,10 +105,11 @@ TEST_F(Corpus, AComposedHeaderReadsBackAsTheSameRecord)
         // What reading settles once: a header without author is written with "Unknown" as the
         // author, the name read from "Name:" is lower case, and a line loses a blank at its end.
         const auto fields = [](const HeaderData& h) {
-            const auto settled = [](const std::string& text) { return std::string(TrimBlanks(text)); };
-            const auto settledAll = [&settled](StringList list) {
-                std::transform(list.begin(), list.end(), list.begin(), settled);
-                return list;
+            const auto settled = [](std::string_view text) { return std::string(TrimBlanks(text)); };
+            const auto settledAll = [&settled](const EntryList& list) {
+                StringList texts;
+                std::transform(list.begin(), list.end(), std::back_inserter(texts), settled);
+                return texts;
             };
             const auto author = h.AuthorRealName.empty() ? std::string("Unknown") : h.AuthorRealName;
             return std::tuple(settled(h.PartDescription), ToLowerAscii(h.PartName), settled(author),

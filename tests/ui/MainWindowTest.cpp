@@ -201,7 +201,7 @@ TEST_F(LineListTest, EditAndDeleteActOnTheSelectedRowOnly)
     dialogs.expectInput("  Z ");
     child<QPushButton>("cmdHistoryEdit")->click();
     EXPECT_EQ(dialogs.inputsShown[0].defaultText, "X");
-    EXPECT_EQ(app.Header.History, (StringList{"X", "Y", "Z"}));
+    EXPECT_EQ(app.Header.History, (EntryList{"X", "Y", "Z"}));
     EXPECT_EQ(RowsOf(*history), (QStringList{"X", "Y", "Z"}));
     history->setCurrentRow(0);
     child<QPushButton>("cmdHistoryDelete")->click();
@@ -216,12 +216,12 @@ TEST_F(LineListTest, AddTakesOneEntryAndHistoryOffersTodaysStub)
     dialogs.expectInput("2008-03-05 [jdoe] ");
     child<QPushButton>("cmdHistoryAdd")->click();
     EXPECT_EQ(dialogs.inputsShown[0].defaultText, "2008-03-05 [jdoe] ");
-    EXPECT_EQ(app.Header.History.back(), "2008-03-05 [jdoe]");
+    EXPECT_EQ(app.Header.History[app.Header.History.size() - 1], "2008-03-05 [jdoe]");
     dialogs.expectInput("a, b, c");
     child<QPushButton>("cmdAdd")->click();
     dialogs.expectInput("   ");
     child<QPushButton>("cmdCommentsAdd")->click();
-    EXPECT_EQ(app.Header.Keywords, (StringList{"a, b, c"}));
+    EXPECT_EQ(app.Header.Keywords, (EntryList{"a, b, c"}));
     EXPECT_TRUE(app.Header.Comments.empty());
 }
 
@@ -255,6 +255,11 @@ TEST_F(WindowTest, SaveWritesTheComposedHeaderAndBackup)
     EXPECT_NE(ReadBytes(path).find("\r\n0 BFC CERTIFY CW\r\n"), std::string::npos);
     EXPECT_EQ(ReadBytes(path), window->newHeaderText() + app.Header.Body + "\r\n");
     EXPECT_EQ(ReadBytes(work.file("3001_Backup_2008-08-10_14-05-09.dat")), GoodPart);
+    // From now on the header saved, not the one opened, is what the file holds.
+    bfc->setCurrentIndex(bfc->findText("CERTIFY CCW"));
+    EXPECT_TRUE(app.Header.FileChanged);
+    bfc->setCurrentIndex(bfc->findText("CERTIFY CW"));
+    EXPECT_FALSE(app.Header.FileChanged);
 }
 
 TEST_F(WindowTest, EveryRoadThatSavesAsksBeforeOverwritingAnotherProgramsChanges)

@@ -1,0 +1,67 @@
+// SPDX-License-Identifier: MIT
+#include "SameBytes.h"
+
+#include <fcntl.h>
+#include <sys/stat.h>
+
+#include <cerrno>
+#include <cstring>
+#include <numeric>
+#include <vector>
+
+#include "FileDescriptor.h"
+
+namespace {
+
+constexpr std::size_t ReadStep = std::size_t{256} * 1024;
+
+// Reads up to size bytes, fewer only at the end of the file; -1 when reading fails.
+ssize_t readFully(int fd, char* buffer, std::size_t size)
+{
+    std::size_t filled = 0;
+    while (filled < size) {
+        const auto got = ::read(fd, buffer + filled, size - filled);
+        if (got < 0 && errno == EINTR)
+            continue;
+        if (got < 0)
+            return -1;
+        if (got == 0)
+            break;
+        filled += static_cast<std::size_t>(got);
+    }
+    return static_cast<ssize_t>(filled);
+}
+
+// Whether the file's next bytes are those of piece.
+bool nextBytesAre(int fd, std::string_view piece, std::vector<char>& buffer)
+{
+    while (!piece.empty()) {
+        const auto step = std::min(piece.size(), buffer.size());
+        if (readFully(fd, buffer.data(), step) != static_cast<ssize_t>(step) ||
+            std::memcmp(buffer.data(), piece.data(), step) != 0)
+            return false;
+        piece.remove_prefix(step);
+    }
+    return true;
+}
+
+} // namespace
+
+bool FileHoldsExactly(const std::string& path, std::span<const std::string_view> pieces)
+{
+    // Not blocking on open: a FIFO put in the file's place must not make the program wait.
+    const FileDescriptor file(::open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK));
+    struct stat info {};
+    if (!file.valid() || ::fstat(file.get(), &info) != 0 || !S_ISREG(info.st_mode))
+        return false;
+    const auto size = std::accumulate(pieces.begin(), pieces.end(), std::size_t{0},
+                                      [](std::size_t sum, std::string_view piece) { return sum + piece.size(); });
+    if (static_cast<std::size_t>(info.st_size) != size)
+        return false;
+    std::vector<char> buffer(ReadStep);
+    for (const auto piece : pieces)
+        if (!nextBytesAre(file.get(), piece, buffer))
+            return false;
+    char extra = 0;
+    return readFully(file.get(), &extra, 1) == 0; // grown since fstat: not the same
+}
