@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 // libFuzzer target: any bytes are a part file. Reading, parsing and composing must never crash,
-// and composing the parsed record must never throw.
+// and composing the parsed record must never throw. Bytes that are no text (a NUL among the first
+// ones) are refused before they are parsed, as the program refuses such a file.
 #include <cstddef>
 #include <cstdint>
 #include <string>
@@ -10,13 +11,18 @@
 #include "Dialogs.h"
 #include "ParseProgress.h"
 #include "Parser.h"
+#include "TextFile.h"
 
 extern "C" int LLVMFuzzerTestOneInput(const std::uint8_t* data, std::size_t size)
 {
     HeaderData header;
     DefaultAnswers dialogs;
     ParseProgress progress;
-    ParsePartFileContent(header, std::string(reinterpret_cast<const char*>(data), size), dialogs, progress);
+    try {
+        ParsePartFileContent(header, std::string(reinterpret_cast<const char*>(data), size), dialogs, progress);
+    } catch (const NotTextFileError&) {
+        return 0;
+    }
     header.AuthorRealName = header.ParsedRealName;
     RemoveDescriptionTabs(header, dialogs);
     const auto text = ComposeHeader(header);
