@@ -99,6 +99,16 @@ private:
         list.pushPieces(pieces);
     }
 
+    // A date alone makes an entry without a blank after it, which would be written at the end of
+    // the history line and taken away again when the file is read back.
+    void addHistoryEntry(std::string_view date, std::string_view text)
+    {
+        if (text.empty())
+            addEntry(h_.History, {date});
+        else
+            addEntry(h_.History, {date, " ", text});
+    }
+
     void takeDescription(std::string_view line);
     void takeKeywordLine(std::string_view line);
     void takeAuthor();
@@ -238,7 +248,7 @@ void HeaderParser::takePartType()
 void HeaderParser::takeComment()
 {
     if (const auto date = DateOfWord(word(3)))
-        addEntry(h_.History, {*date, " ", joinedFrom(4)});
+        addHistoryEntry(*date, joinedFrom(4));
     else
         addEntry(h_.Comments, {joinedFrom(2)});
 }
@@ -248,7 +258,7 @@ void HeaderParser::takeComment()
 void HeaderParser::takeDatedOrBody(std::string_view line)
 {
     if (const auto date = DateOfWord(word(2)))
-        addEntry(h_.History, {*date, " ", joinedFrom(3)});
+        addHistoryEntry(*date, joinedFrom(3));
     else
         toBody(line);
 }

@@ -127,7 +127,7 @@ TEST(ParserRows, CommentsAndDatedLines)
     const auto h = parseLines({"0 d", "0 // 2004-03-12 [jdoe] fixed   ", "0 // fixed it   ", "0 //fixed it",
                                "0 2004-3-2 [jdoe] old style", "0 // 2004-03-12"});
     // Blanks at the end are dropped, all of them: a save writes what the next open reads alike.
-    EXPECT_EQ(h.History, (EntryList{"2004-03-12 [jdoe] fixed", "2004-03-02 [jdoe] old style", "2004-03-12 "}));
+    EXPECT_EQ(h.History, (EntryList{"2004-03-12 [jdoe] fixed", "2004-03-02 [jdoe] old style", "2004-03-12"}));
     EXPECT_EQ(h.Comments, (EntryList{"// fixed it"}));
     EXPECT_EQ(h.Body, "0 //fixed it");
 }
@@ -160,7 +160,7 @@ TEST(ParserTwoWordLines, UnknownWordGoesToTheBodyKnownKeywordIsDropped)
     const auto h = parseLines({"0 d", "0 STEP", "0 Torso", "0 //", "0 Name:", "0 !KEYWORDS ", "0 !HELP", "0",
                                "0 2004-03-12", "1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat", "0 STEP"});
     EXPECT_EQ(h.Body, "0 STEP\r\n0 Torso\r\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat\r\n0 STEP");
-    EXPECT_EQ(h.History, (EntryList{"2004-03-12 "}));
+    EXPECT_EQ(h.History, (EntryList{"2004-03-12"}));
     EXPECT_TRUE(h.Keywords.empty());
     EXPECT_EQ(h.PartName, "");
 }
