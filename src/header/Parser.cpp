@@ -154,9 +154,10 @@ void HeaderParser::takeDescription(std::string_view line)
 void HeaderParser::takeKeywordLine(std::string_view line)
 {
     const auto keyword = word(2);
-    if (keyword == "Name:")
-        h_.PartName = ToLowerAscii(word(3));
-    else if (keyword == "Author:")
+    if (keyword == "Name:") {
+        if (!word(3).empty()) // an empty name is written back as a bare "Name:", which says nothing
+            h_.PartName = ToLowerAscii(word(3));
+    } else if (keyword == "Author:")
         takeAuthor();
     else if (isOneOf(keyword, {"CATEGORY", "!CATEGORY"}))
         h_.Category = joinedFrom(3);
@@ -210,21 +211,18 @@ void HeaderParser::takeAuthor()
     }
 }
 
+// The statement is judged by its words as the composer writes them back (extra blanks between them
+// gone), so that the line means the same when the saved file is read again.
 void HeaderParser::takeBfc(std::string_view line)
 {
-    if (word(3) == "INVERTNEXT") {
+    const auto statement = joinedFrom(3);
+    const Words words(statement);
+    if (words.word(1) == "INVERTNEXT" || (words.word(1) == "CERTIFY" && words.word(2) == "INVERTNEXT")) {
         endHeader(line);
         return;
     }
-    if (word(3) == "CERTIFY") {
-        if (wordCount() == 3)
-            return;
-        if (word(4) == "INVERTNEXT") {
-            endHeader(line);
-            return;
-        }
-    }
-    h_.Bfc = joinedFrom(3);
+    if (statement != "CERTIFY")
+        h_.Bfc = statement;
 }
 
 // "0 !LDRAW_ORG Part UPDATE 2004-01": the words before "UPDATE" are the type, the next the tag.

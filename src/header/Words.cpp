@@ -7,8 +7,9 @@ Words::Words(std::string_view line) : text_(line)
 {
     if (line.empty())
         return;
-    if (text_.back() == ' ')
-        text_.remove_suffix(1);
+    // Blanks at the end make no words: a field or list entry ending in blanks would be written
+    // back with them and read back without them, so that a file changed with every save.
+    text_ = text_.substr(0, text_.find_last_not_of(' ') + 1);
     count_ = 1 + static_cast<std::size_t>(std::count(text_.begin(), text_.end(), ' '));
 }
 

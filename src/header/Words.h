@@ -5,8 +5,8 @@
 #include <string_view>
 
 // The words of a header line: split at every blank, so two blanks in a row give an empty word
-// between them, a leading blank gives an empty first word, and one blank at the very end gives
-// no empty last word. Words are counted from 1.
+// between them and a leading blank gives an empty first word; blanks at the very end give no
+// words. Words are counted from 1.
 //
 // Nothing is stored per word, so a line of a million blanks costs no more memory than a short
 // one; reading the words in order is as cheap as splitting them once.

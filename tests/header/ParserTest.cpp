@@ -1,6 +1,8 @@
 // SPDX-License-Identifier: MIT
 #include <gtest/gtest.h>
 
+#include "Composer.h"
+#include "FileSave.h"
 #include "ParseProgress.h"
 #include "Parser.h"
 #include "ScriptedDialogs.h"
@@ -228,6 +230,30 @@ TEST(ParserAnyInput, OddBytesAreJustTextButBinaryFilesAreRefused)
     EXPECT_EQ(blanks.Keywords, (EntryList{"x"})) << "empty words before the first word are skipped";
     const auto longLine = parseLines({"0 d", "1" + std::string(10 * 1024 * 1024, 'x')});
     EXPECT_EQ(longLine.Body.size(), 10u * 1024 * 1024 + 1);
+}
+
+// What a save writes must read back as written, or a file changes with every save (or the next
+// save is refused). Each line here once made a second save differ from the first.
+TEST(ParserSavedTwice, OddlySpacedLinesReadBackAsTheyWereSaved)
+{
+    const auto opened = [](const std::string& text) {
+        HeaderData header;
+        header.PartName = "n.dat"; // as opening the file sets it
+        ScriptedDialogs dialogs;
+        ParseProgress progress;
+        ParsePartFileContent(header, text, dialogs, progress);
+        header.AuthorRealName = header.ParsedRealName;
+        return header;
+    };
+    const auto saved = [](const HeaderData& header) { return SavedText(header, ComposeHeader(header)); };
+    for (const std::string odd :
+         {"0 Author: Jane Doe   ", "0 !LDRAW_ORG Part  ", "0 !CMDLINE  ", "0 //  ", "0 !KEYWORDS   ", "0 Name:  x",
+          "0 BFC  INVERTNEXT", "0 BFC  CERTIFY", "0 2004-1-1", "0 // 2004-02-02 "}) {
+        const auto first = opened("0 d\r\n0 BFC CERTIFY CCW\r\n" + odd + "\r\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 a.dat\r\n");
+        const auto second = opened(saved(first));
+        EXPECT_EQ(saved(second), saved(first)) << odd;
+        EXPECT_EQ(second.Bfc, first.Bfc) << odd;
+    }
 }
 
 } // namespace
