@@ -50,6 +50,10 @@ TEST(RemoveDescriptionTabs, RemovesTabsAfterTellingTheUser)
     ASSERT_EQ(dialogs.messages.size(), 1u);
     EXPECT_EQ(dialogs.messages[0].text, "A TAB character was found in the Part Description and will be deleted");
     EXPECT_FALSE(RemoveDescriptionTabs(h, dialogs));
+    h.PartDescription = "Brick \t";
+    dialogs.expectMessage(Answer::Ok);
+    RemoveDescriptionTabs(h, dialogs);
+    EXPECT_EQ(h.PartDescription, "Brick") << "no blank left at the end of the line";
 }
 
 } // namespace
