@@ -4,6 +4,7 @@
 #include <algorithm>
 
 #include "Dialogs.h"
+#include "Text.h"
 
 bool RemoveDescriptionTabs(HeaderData& header, Dialogs& dialogs)
 {
@@ -13,6 +14,6 @@ bool RemoveDescriptionTabs(HeaderData& header, Dialogs& dialogs)
     dialogs.message(InformationBox("A TAB character was found in the Part Description and will be deleted"));
     description.erase(std::remove(description.begin(), description.end(), '\t'), description.end());
     // Blanks the tabs stood behind would end the line written, and the next open would drop them.
-    description.erase(description.find_last_not_of(' ') + 1);
+    description.resize(TrimTrailingBlanks(description).size());
     return true;
 }

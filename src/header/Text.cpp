@@ -57,13 +57,14 @@ std::size_t utf8SequenceLength(std::string_view s, std::size_t i)
 
 } // namespace
 
+std::string_view TrimTrailingBlanks(std::string_view text) { return text.substr(0, text.find_last_not_of(' ') + 1); }
+
 std::string_view TrimBlanks(std::string_view text)
 {
     const auto first = text.find_first_not_of(' ');
     if (first == std::string_view::npos)
         return {};
-    const auto last = text.find_last_not_of(' ');
-    return text.substr(first, last - first + 1);
+    return TrimTrailingBlanks(text.substr(first));
 }
 
 std::string ToLowerAscii(std::string_view text)

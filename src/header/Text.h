@@ -19,6 +19,8 @@ inline std::string_view TextBeforeHeader(const HeaderData& header)
 }
 
 std::string_view TrimBlanks(std::string_view text);
+// The text without the blanks at its end.
+std::string_view TrimTrailingBlanks(std::string_view text);
 
 std::string ToLowerAscii(std::string_view text);
 std::string ToUpperAscii(std::string_view text);

@@ -3,13 +3,15 @@
 
 #include <algorithm>
 
+#include "Text.h"
+
 Words::Words(std::string_view line) : text_(line)
 {
     if (line.empty())
         return;
     // Blanks at the end make no words: a field or list entry ending in blanks would be written
     // back with them and read back without them, so that a file changed with every save.
-    text_ = text_.substr(0, text_.find_last_not_of(' ') + 1);
+    text_ = TrimTrailingBlanks(text_);
     count_ = 1 + static_cast<std::size_t>(std::count(text_.begin(), text_.end(), ' '));
 }
 
@@ -38,11 +40,6 @@ std::string_view Words::joinedFrom(std::size_t k) const
     if (k > count_)
         return {};
     const auto rest = text_.substr(startOf(k));
-    const auto firstText = rest.find_first_not_of(' ');
-    if (firstText == std::string_view::npos)
-        return {};
-    // Blanks at the end go too: the composer writes the text with a line end right after it, so
-    // any blank left here would be read back as one fewer by the next open, and a file would
-    // change with every save.
-    return rest.substr(firstText, rest.find_last_not_of(' ') + 1 - firstText);
+    const auto firstText = rest.find_first_not_of(' '); // the line's blanks at the end are gone already
+    return firstText == std::string_view::npos ? std::string_view() : rest.substr(firstText);
 }
