@@ -8,6 +8,7 @@
 #include <mutex>
 #include <nlohmann/json.hpp>
 #include <sstream>
+#include <unistd.h>
 
 #include "Batch.h"
 #include "CliFiles.h"
@@ -103,27 +104,57 @@ void noteFindings(FileReport& report, const SaveFindings& findings)
     report.fixups = findings.fixups;
 }
 
-// Opens the file at path (see OpenForCli for restoreWith) and lets handle fill the report; an
-// unreadable file is reported as such. Quiet, the messages of the file's dialogs are not shown.
-FileReport reportOn(const std::string& path, bool quiet, ConsoleDialogs::Answerer answerer, FolderSweeps* restoreWith,
+// Saves of one file never run at the same time, even when it is named twice or by two of its
+// hard links: the second opens after the first saved, or sees its save as a change.
+class FileLocks {
+public:
+    std::mutex& of(const OpenPart& part)
+    {
+        const auto status = part.status();
+        const std::lock_guard lock(mutex_);
+        return locks_[{status.st_dev, status.st_ino}];
+    }
+
+private:
+    std::mutex mutex_;
+    std::map<std::pair<dev_t, ino_t>, std::mutex> locks_;
+};
+
+// How a command works on its files: one that writes holds each file's lock from its open to its
+// save and undoes first what a killed save left (run); one that only reads writes nothing.
+struct Writing {
+    const ReplaceOptions& run;
+    FileLocks& locks;
+};
+
+// Opens the file an entry names and lets handle fill the report; an unreadable file is reported
+// as such. Quiet, the messages of the file's dialogs are not shown.
+FileReport reportOn(const PartFileEntry& entry, bool quiet, ConsoleDialogs::Answerer answerer, const Writing* writing,
                     const std::function<void(HeaderData&, ConsoleDialogs&, FileReport&)>& handle)
 {
     FileReport report;
     std::ostringstream err, discarded;
     ConsoleDialogs dialogs(quiet ? discarded : err, std::move(answerer));
-    auto opened = OpenForCli(path, dialogs, err, restoreWith);
-    if (!opened) {
+    const auto unreadable = [&](const std::exception& failure) {
+        ReportUnreadable(entry.path, failure, err);
+        report = FileReport{};
         report.unreadable = true;
         report.status = ExitStatus::Unreadable;
-    } else {
-        try {
+    };
+    try {
+        const auto part = OpenEntry(entry);
+        std::unique_lock<std::mutex> turn;
+        if (writing != nullptr)
+            turn = std::unique_lock(writing->locks.of(*part));
+        auto opened = ReadForCli(part, entry.path, dialogs, err, writing ? &writing->run : nullptr, report.status);
+        if (opened)
             handle(*opened, dialogs, report);
-        } catch (const std::exception& failure) {
-            ReportUnreadable(path, failure, err);
-            report = FileReport{};
+        else if (report.status == ExitStatus::Unreadable)
             report.unreadable = true;
-            report.status = ExitStatus::Unreadable;
-        }
+        else
+            report.saving = FileReport::Saving::Failed;
+    } catch (const std::exception& failure) {
+        unreadable(failure);
     }
     report.err = err.str();
     return report;
@@ -136,12 +167,15 @@ std::string outputClosedText(int error)
 }
 
 int runBatch(const std::vector<std::string>& arguments, const BatchOptions& batch, std::ostream& out, std::ostream& err,
-             const std::function<FileReport(const std::string&)>& work)
+             const std::function<FileReport(const PartFileEntry&)>& work)
 {
     const auto found = ExpandPartFiles(arguments);
     const auto& files = found.files;
     for (const auto& problem : found.problems)
         err << "quillmark-cli: cannot read folder " << ShownText(problem.path) << ": " << problem.reason << '\n';
+    for (const auto& keep : found.orphanKeepFiles)
+        err << "quillmark-cli: " << ShownText(keep)
+            << ": the copy an interrupted save kept of a file that is gone; it is left as it is\n";
     Summary summary;
     summary.addWalks(found);
     int status = found.problems.empty() ? ExitStatus::Ok : ExitStatus::Unreadable;
@@ -159,7 +193,8 @@ int runBatch(const std::vector<std::string>& arguments, const BatchOptions& batc
             return false;
         },
         batch.errIsTerminal && !batch.quiet ? &err : nullptr);
-    if (!whole) {
+    // A signal during the last file ends the run as one between two files does.
+    if (!whole || InterruptPending()) {
         // A reader that went away (quillmark-cli save ... | head) or Ctrl+C ends the run between files.
         err << "quillmark-cli: " << (outputError != 0 ? outputClosedText(outputError) : "interrupted")
             << "; the run ends here\n";
@@ -170,21 +205,20 @@ int runBatch(const std::vector<std::string>& arguments, const BatchOptions& batc
     return status;
 }
 
-// Saves of one file never run at the same time, even when it is named twice.
-class FileLocks {
-public:
-    std::mutex& of(const std::string& path)
-    {
-        std::error_code error;
-        auto key = std::filesystem::weakly_canonical(path, error).string();
-        const std::lock_guard lock(mutex_);
-        return locks_[error ? path : key];
-    }
-
-private:
-    std::mutex mutex_;
-    std::map<std::string, std::mutex> locks_;
-};
+// Why a save failed, in the words of the "failed" line.
+std::string failureText(const ConsoleDialogs& dialogs)
+{
+    const auto& title = dialogs.lastTitle();
+    if (title == ChangedOnDiskTitle)
+        return "changed while saving";
+    if (title == FileLockedTitle)
+        return "locked by another program";
+    if (title == InterruptedTitle)
+        return "interrupted";
+    if (title == KeptCopyTitle)
+        return "an interrupted save was not restored";
+    return OneLine(dialogs.lastMessage());
+}
 
 std::string savedLine(const std::string& filePath, const SaveOptions& options, const SaveResult& result,
                       ConsoleDialogs& dialogs, FileReport& report)
@@ -204,9 +238,7 @@ std::string savedLine(const std::string& filePath, const SaveOptions& options, c
     case SaveOutcome::Failed:
         report.saving = FileReport::Saving::Failed;
         report.status = ExitStatus::SaveFailed;
-        return "failed " + path + ": " +
-               (dialogs.lastTitle() == ChangedOnDiskTitle ? "changed while saving" : OneLine(dialogs.lastMessage())) +
-               '\n';
+        return "failed " + path + ": " + failureText(dialogs) + '\n';
     case SaveOutcome::Refused:
     case SaveOutcome::DescriptionTooLong: break;
     }
@@ -227,29 +259,30 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
         (!ReadStandardList(ListKind::Category, categories, err) || !(colours = colourSource(options.ldconfig, err))))
         return ExitStatus::Unreadable;
     // A check never writes, not even to undo what a killed save left: the next save does that.
-    return runBatch(arguments, batch, out, err, [&](const std::string& path) {
-        // A check never writes, not even to undo what a killed save left: the next save does that.
-        return reportOn(
-            path, batch.quiet, {}, nullptr, [&](const HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
-                const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
-                TrackerFindings tracker; // empty unless asked for
-                if (options.tracker) {
-                    const auto& codes =
-                        colours->forPart(path, [&dialogs](const std::string& text) { dialogs.message({text}); });
-                    tracker = CheckRecordForTracker(header, ComposeHeader(header), categories, codes);
-                }
-                const auto* trackerFindings = options.tracker ? &tracker : nullptr;
-                report.out = options.json ? checkJson(header, findings, trackerFindings).dump() + '\n'
-                                          : findingLines(header.FilePath, findings, trackerFindings);
-                noteFindings(report, findings);
-                bool trackerRefuses = false;
-                for (const auto& finding : tracker) {
-                    report.trackerIds.push_back(finding.id);
-                    trackerRefuses = trackerRefuses || finding.level == FindingLevel::Error;
-                }
-                report.refused = trackerRefuses;
-                report.status = findings.refusals.empty() && !trackerRefuses ? ExitStatus::Ok : ExitStatus::Refused;
-            });
+    return runBatch(arguments, batch, out, err, [&](const PartFileEntry& entry) {
+        const auto& path = entry.path;
+        return reportOn(entry, batch.quiet, {}, nullptr,
+                        [&](const HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
+                            const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
+                            TrackerFindings tracker; // empty unless asked for
+                            if (options.tracker) {
+                                const auto& codes = colours->forPart(
+                                    path, [&dialogs](const std::string& text) { dialogs.message({text}); });
+                                tracker = CheckRecordForTracker(header, ComposeHeader(header), categories, codes);
+                            }
+                            const auto* trackerFindings = options.tracker ? &tracker : nullptr;
+                            report.out = options.json ? checkJson(header, findings, trackerFindings).dump() + '\n'
+                                                      : findingLines(header.FilePath, findings, trackerFindings);
+                            noteFindings(report, findings);
+                            bool trackerRefuses = false;
+                            for (const auto& finding : tracker) {
+                                report.trackerIds.push_back(finding.id);
+                                trackerRefuses = trackerRefuses || finding.level == FindingLevel::Error;
+                            }
+                            report.refused = trackerRefuses;
+                            report.status =
+                                findings.refusals.empty() && !trackerRefuses ? ExitStatus::Ok : ExitStatus::Refused;
+                        });
     });
 }
 
@@ -274,9 +307,21 @@ int RunEdit(const std::vector<std::string>& arguments, const SaveOptions& option
     const SystemClock clock;
     FileLocks locks;
     FolderSweeps sweeps;
-    return runBatch(arguments, batch, out, err, [&](const std::string& path) {
-        const std::lock_guard lock(locks.of(path));
-        return reportOn(path, batch.quiet, answer, edit.dryRun ? nullptr : &sweeps, // a dry run writes nothing
+    ReplaceOptions run;
+    run.sweeps = &sweeps;
+    run.lockWait.interrupted = InterruptPending;
+    if (!batch.quiet)
+        run.lockWait.waiting = [](const std::string& path) {
+            // Said at once, not when the file's turn in the output comes: the run may wait long.
+            const auto line = "quillmark-cli: waiting for " + ShownText(path) + ": another program holds it\n";
+            [[maybe_unused]] const auto written = ::write(STDERR_FILENO, line.data(), line.size());
+        };
+    const Writing writing{run, locks};
+    // A dry run and a JSON listing write nothing.
+    const bool writes = !edit.dryRun && !edit.json;
+    return runBatch(arguments, batch, out, err, [&](const PartFileEntry& entry) {
+        const auto& path = entry.path;
+        return reportOn(entry, batch.quiet, answer, writes ? &writing : nullptr,
                         [&](HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
                             if (const auto refusal = ApplyHeaderEdits(header, edit.edits, clock.now())) {
                                 report.saving = FileReport::Saving::Skipped;
@@ -306,13 +351,13 @@ int RunEdit(const std::vector<std::string>& arguments, const SaveOptions& option
                                                       .limitDescription = batch.limitDescription,
                                                       .skipUnchanged = true,
                                                       .dryRun = edit.dryRun,
-                                                      .sweeps = &sweeps};
+                                                      .run = run};
                             const auto result = CheckHeaderAndSave(header, context);
                             report.out = savedLine(header.FilePath, options, result, dialogs, report);
                             if (edit.dryRun &&
                                 (result.outcome == SaveOutcome::NotWritten || result.outcome == SaveOutcome::Unchanged))
-                                report.out =
-                                    UnifiedDiff(FileBytes(path).view(), SavedText(header, ComposeHeader(header)), path);
+                                report.out = UnifiedDiff(FileBytes(*header.Part).view(),
+                                                         SavedText(header, ComposeHeader(header)), path);
                         });
     });
 }

@@ -6,6 +6,7 @@
 
 #include "ConsoleDialogs.h"
 #include "FileSave.h"
+#include "KeepFile.h"
 #include "ListFolder.h"
 #include "OpenDocument.h"
 #include "ParseProgress.h"
@@ -39,21 +40,59 @@ int handleCatching(const std::string& path, HeaderData& header, std::ostream& er
 
 } // namespace
 
-std::optional<HeaderData> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err,
-                                     FolderSweeps* restoreWith)
+namespace {
+
+// The bytes a read-only command reports a part from: those an interrupted save's restore would
+// give it, said on err; none when the part is as its last save left it.
+std::optional<std::string> bytesAfterRestore(const OpenPart& part, const std::string& path, std::ostream& err)
+{
+    const auto finding = ExamineKeepFile(part, HomeOfThisUser());
+    if (finding.state == KeepFinding::State::Restorable) {
+        err << ShownText(path) << ": an interrupted save will be restored by the next save\n";
+        return finding.oldBytes;
+    }
+    if (finding.state == KeepFinding::State::Changed)
+        err << OneLine(KeepNotRestoredError(path, finding.keepPath).description()) << '\n';
+    return std::nullopt;
+}
+
+} // namespace
+
+std::optional<HeaderData> ReadForCli(const std::shared_ptr<OpenPart>& part, const std::string& path,
+                                     ConsoleDialogs& dialogs, std::ostream& err, const ReplaceOptions* writing,
+                                     int& status)
 {
     dialogs.setCurrentFile(path);
     try {
-        if (restoreWith != nullptr)
-            RestoreInterruptedSaveOf(path, dialogs, restoreWith);
-        FileBytes content(path);
+        std::optional<std::string> restored;
+        if (writing == nullptr)
+            restored = bytesAfterRestore(*part, path, err);
+        else if (RestoreInterruptedSaveOf(*part, dialogs, *writing) == RestoreOutcome::CopyKept) {
+            status = ExitStatus::SaveFailed;
+            return std::nullopt;
+        }
+        FileBytes content(*part, [&path](std::string_view head) { EnsureTextFile(head, path); });
         HeaderData header;
-        header.ReadStamp = content.stamp();
         ParseProgress silent;
-        OpenPartFileContent(header, path, content.takeBytes(), dialogs, silent);
+        OpenPartFileContent(header, path, restored ? std::move(*restored) : content.takeBytes(), dialogs, silent);
+        header.Part = part;
+        header.ReadStamp = content.stamp();
         return header;
     } catch (const std::exception& failure) {
         ReportUnreadable(path, failure, err);
+        status = ExitStatus::Unreadable;
+        return std::nullopt;
+    }
+}
+
+std::optional<HeaderData> OpenForCli(const PartFileEntry& entry, ConsoleDialogs& dialogs, std::ostream& err,
+                                     int& status)
+{
+    try {
+        return ReadForCli(OpenEntry(entry), entry.path, dialogs, err, nullptr, status);
+    } catch (const std::exception& failure) {
+        ReportUnreadable(entry.path, failure, err);
+        status = ExitStatus::Unreadable;
         return std::nullopt;
     }
 }
@@ -63,8 +102,9 @@ int ForEachOpenedFile(const std::vector<std::string>& paths, ConsoleDialogs& dia
 {
     int status = ExitStatus::Ok;
     for (const auto& path : paths) {
-        auto opened = OpenForCli(path, dialogs, err);
-        status = std::max(status, opened ? handleCatching(path, *opened, err, handle) : ExitStatus::Unreadable);
+        int opening = ExitStatus::Ok;
+        auto opened = OpenForCli({path, nullptr, {}}, dialogs, err, opening);
+        status = std::max(status, opened ? handleCatching(path, *opened, err, handle) : opening);
     }
     return status;
 }

@@ -10,8 +10,10 @@
 #include "HeaderData.h"
 #include "ListKinds.h"
 
+#include "PartFileList.h"
+#include "SafeReplace.h"
+
 class ConsoleDialogs;
-class FolderSweeps;
 
 // Exit statuses shared by the commands; a larger one wins when several apply.
 namespace ExitStatus {
@@ -25,12 +27,20 @@ inline constexpr int SaveFailed = 3;
 // The one line that names a file that could not be read or worked on.
 void ReportUnreadable(const std::string& path, const std::exception& failure, std::ostream& err);
 
-// Opens path as the Open command does; with restoreWith (see ReplaceOptions::sweeps), after undoing
-// what a killed save left there, as a command that writes does first. The file's bytes become the
-// record's body: the file is in memory once. When the file cannot be read, says so in one line on
-// err and returns nullopt.
-std::optional<HeaderData> OpenForCli(const std::string& path, ConsoleDialogs& dialogs, std::ostream& err,
-                                     FolderSweeps* restoreWith = nullptr);
+// Reads the open part as the Open command does; path names it in messages. A command that writes
+// (writing: its run's sweeps and lock wait) first undoes what a killed save left there; when the
+// part changed since, its copy stays and the file fails (status SaveFailed). A command that only
+// reads writes nothing: a part that an interrupted save left torn is read as the restore would
+// leave it, and said so. The file's bytes become the record's body: the file is in memory once.
+// When the file cannot be read, says so in one line on err and returns nullopt with status
+// Unreadable.
+std::optional<HeaderData> ReadForCli(const std::shared_ptr<OpenPart>& part, const std::string& path,
+                                     ConsoleDialogs& dialogs, std::ostream& err, const ReplaceOptions* writing,
+                                     int& status);
+
+// Opens and reads the file an entry names for a command that only reads (see ReadForCli).
+std::optional<HeaderData> OpenForCli(const PartFileEntry& entry, ConsoleDialogs& dialogs, std::ostream& err,
+                                     int& status);
 
 // The folder of the running program, where a build keeps its list and data files.
 std::string ProgramFolder();

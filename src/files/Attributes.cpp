@@ -4,6 +4,7 @@
 #include <cerrno>
 #include <map>
 #include <optional>
+#include <string>
 #include <sys/xattr.h>
 
 namespace {
@@ -51,11 +52,11 @@ std::optional<Attributes> attributes(const List& list, const Get& get)
 
 } // namespace
 
-bool TakeAttributesOf(const std::string& from, int fd)
+bool TakeAttributesOf(int from, int fd)
 {
     const auto wanted = attributes(
-        [&](char* b, std::size_t s) { return ::listxattr(from.c_str(), b, s); },
-        [&](const std::string& name, char* b, std::size_t s) { return ::getxattr(from.c_str(), name.c_str(), b, s); });
+        [&](char* b, std::size_t s) { return ::flistxattr(from, b, s); },
+        [&](const std::string& name, char* b, std::size_t s) { return ::fgetxattr(from, name.c_str(), b, s); });
     const auto present = attributes(
         [&](char* b, std::size_t s) { return ::flistxattr(fd, b, s); },
         [&](const std::string& name, char* b, std::size_t s) { return ::fgetxattr(fd, name.c_str(), b, s); });

@@ -2,10 +2,8 @@
 #include "FileWrites.h"
 
 #include <cerrno>
-#include <fcntl.h>
 #include <unistd.h>
 
-#include "FileDescriptor.h"
 #include "QmError.h"
 
 void WriteAll(int fd, std::string_view bytes, const std::string& path)
@@ -21,24 +19,15 @@ void WriteAll(int fd, std::string_view bytes, const std::string& path)
     }
 }
 
-void OverwriteFile(const std::string& path, std::initializer_list<std::string_view> pieces)
+void OverwriteFile(int fd, std::initializer_list<std::string_view> pieces, const std::string& path)
 {
-    const FileDescriptor file(::open(path.c_str(), O_WRONLY | O_CLOEXEC | O_NOCTTY));
-    if (!file.valid())
+    if (::lseek(fd, 0, SEEK_SET) != 0)
         throw OsError(errno, path);
     std::size_t size = 0;
     for (const auto piece : pieces) {
-        WriteAll(file.get(), piece, path);
+        WriteAll(fd, piece, path);
         size += piece.size();
     }
-    if (::ftruncate(file.get(), static_cast<off_t>(size)) != 0 || ::fsync(file.get()) != 0)
+    if (::ftruncate(fd, static_cast<off_t>(size)) != 0 || ::fsync(fd) != 0)
         throw OsError(errno, path);
-}
-
-void SyncFolder(const std::string& folder)
-{
-    const FileDescriptor handle(::open(folder.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
-    // Best effort: some file systems cannot sync a folder, and the file itself is in place.
-    if (handle.valid())
-        ::fsync(handle.get());
 }

@@ -1,142 +1,280 @@
 // SPDX-License-Identifier: MIT
 #include "KeepFile.h"
 
-#include <array>
+#include <algorithm>
 #include <cerrno>
+#include <charconv>
 #include <cinttypes>
 #include <cstdio>
 #include <fcntl.h>
-#include <filesystem>
+#include <pwd.h>
+#include <sys/file.h>
 #include <sys/stat.h>
 #include <unistd.h>
+#include <vector>
 
 #include "FileWrites.h"
-#include "Folders.h"
-#include "NewFile.h"
 #include "PartFile.h"
-#include "QmError.h"
 
 namespace {
 
 constexpr std::string_view KeepPrefix = ".quillmark-keep-";
+// Below the home folder: where this user keeps the copies of files in folders he may not write.
+constexpr const char* PrivatePath[] = {".local", "state", "Quillmark", "keep"};
 
-std::string keepPathIn(const std::string& folder, const struct stat& part)
+std::string keepNameOf(const FileIdentity& identity)
 {
-    return folder + "/" + std::string(KeepPrefix) + std::to_string(part.st_dev) + "-" + std::to_string(part.st_ino);
+    return std::string(KeepPrefix) + std::to_string(identity.device) + "-" + std::to_string(identity.inode);
 }
 
-// The first line of a keep file: "quillmark-keep <pid> <new size> <new checksum>".
-std::string recordLine(const TextFingerprint& newText)
+// The first line of a keep file: the part's identity, then the sizes of the old bytes and of the
+// new text that follow it.
+std::string recordLine(const FileIdentity& id, std::size_t oldSize, std::size_t newSize)
 {
-    char line[96];
-    std::snprintf(line, sizeof line, "quillmark-keep %ld %" PRIu64 " %" PRIu64 "\n", static_cast<long>(::getpid()),
-                  newText.size, newText.checksum);
+    char line[160];
+    std::snprintf(line, sizeof line, "quillmark-keep 2 %" PRIu64 " %" PRIu64 " %" PRId64 " %" PRIu32 " %zu %zu\n",
+                  id.device, id.inode, id.bornSeconds, id.bornNanoseconds, oldSize, newSize);
     return line;
 }
 
 struct KeepRecord {
-    long pid = 0;
-    TextFingerprint newText;
-    std::string_view oldBytes;
+    FileIdentity identity;
+    std::string_view oldBytes, newText;
 };
 
 bool parseRecord(std::string_view keep, KeepRecord& record)
 {
     const auto end = keep.find('\n');
-    if (end == std::string_view::npos)
+    if (end == std::string_view::npos || end > 200)
         return false;
     const std::string line(keep.substr(0, end));
-    if (std::sscanf(line.c_str(), "quillmark-keep %ld %" SCNu64 " %" SCNu64, &record.pid, &record.newText.size,
-                    &record.newText.checksum) != 3)
+    auto& id = record.identity;
+    std::size_t oldSize = 0, newSize = 0;
+    if (std::sscanf(line.c_str(), "quillmark-keep 2 %" SCNu64 " %" SCNu64 " %" SCNd64 " %" SCNu32 " %zu %zu",
+                    &id.device, &id.inode, &id.bornSeconds, &id.bornNanoseconds, &oldSize, &newSize) != 6)
         return false;
-    record.oldBytes = keep.substr(end + 1);
+    const auto rest = keep.substr(end + 1);
+    if (rest.size() != oldSize + newSize)
+        return false;
+    record.oldBytes = rest.substr(0, oldSize);
+    record.newText = rest.substr(oldSize);
     return true;
 }
 
-// A keep file made by someone who may write the part anyway: this user, the part's owner, its
-// group when the group may write it, anyone when everyone may. Never one that another user put
-// in a shared temporary folder to have its bytes written into a part he may not write.
-bool mayStandFor(const std::string& keepPath, const struct stat& part)
+// The folder of this user's own below his home, made when create is on; null when there is none
+// or when it is not his alone.
+std::shared_ptr<const OpenFolder> privateFolder(const std::string& home, bool create)
 {
-    struct stat keep {};
-    if (::lstat(keepPath.c_str(), &keep) != 0 || !S_ISREG(keep.st_mode))
-        return false;
+    if (home.empty())
+        return nullptr;
+    FileDescriptor folder(::open(home.c_str(), O_RDONLY | O_DIRECTORY | O_CLOEXEC));
+    for (const char* step : PrivatePath) {
+        if (!folder.valid())
+            return nullptr;
+        if (create)
+            ::mkdirat(folder.get(), step, 0700);
+        folder = FileDescriptor(::openat(folder.get(), step, O_RDONLY | O_DIRECTORY | O_NOFOLLOW | O_CLOEXEC));
+    }
+    struct stat info {};
+    if (!folder.valid() || ::fstat(folder.get(), &info) != 0 || info.st_uid != ::geteuid() || (info.st_mode & 077) != 0)
+        return nullptr;
+    std::string path = home;
+    for (const char* step : PrivatePath)
+        path += std::string("/") + step;
+    return std::make_shared<const OpenFolder>(std::move(folder), path);
+}
+
+// A keep file in the part's folder made by someone who may write the part anyway: this user, the
+// part's owner, its group when the group may write it, anyone when everyone may. Never one that
+// another user put there to have its bytes written into a part he may not write.
+bool mayStandFor(const struct stat& keep, const struct stat& part)
+{
     return keep.st_uid == ::geteuid() || keep.st_uid == part.st_uid ||
            (keep.st_gid == part.st_gid && (part.st_mode & S_IWGRP) != 0) || (part.st_mode & S_IWOTH) != 0;
 }
 
-// Where the keep file of the file at path may be: which of the two it is depends on the rights of
-// the user who saved, not of the one who looks.
-std::array<std::string, 2> keepFoldersFor(const std::string& path)
+// A keep file found for a part, open.
+struct FoundKeep {
+    std::shared_ptr<const OpenFolder> folder;
+    std::string name;
+    FileDescriptor fd;
+    std::string path() const { return folder->pathOf(name); }
+};
+
+FoundKeep findKeep(const OpenPart& part, const std::string& home)
 {
-    return {FolderOf(path), std::filesystem::temp_directory_path().string()};
+    const auto name = keepNameOf(part.identity());
+    const auto partStatus = part.status();
+    for (auto folder : {part.sharedFolder(), privateFolder(home, false)}) {
+        if (!folder)
+            continue;
+        FileDescriptor fd(::openat(folder->fd(), name.c_str(), O_RDONLY | O_NOFOLLOW | O_NONBLOCK | O_CLOEXEC));
+        struct stat keep {};
+        const bool own = folder != part.sharedFolder();
+        if (fd.valid() && ::fstat(fd.get(), &keep) == 0 && S_ISREG(keep.st_mode) &&
+            (own || mayStandFor(keep, partStatus)))
+            return {std::move(folder), name, std::move(fd)};
+    }
+    return {nullptr, {}, FileDescriptor()};
+}
+
+// True when current is a state that the rewrite of old into newText, stopped anywhere, leaves: the
+// new text's first k bytes, followed by the old bytes from k on where the old text is longer.
+bool isInterruptedRewrite(std::string_view current, std::string_view old, std::string_view newText)
+{
+    if (current.size() < old.size())
+        return false;
+    const auto common = static_cast<std::size_t>(
+        std::mismatch(current.begin(), current.end(), newText.begin(), newText.end()).first - current.begin());
+    if (current.size() > old.size())
+        return common == current.size();
+    auto oldFrom = current.size();
+    while (oldFrom > 0 && current[oldFrom - 1] == old[oldFrom - 1])
+        --oldFrom;
+    return oldFrom <= common;
+}
+
+KeepFinding::State judge(std::string_view current, const KeepRecord& record)
+{
+    using State = KeepFinding::State;
+    if (current == record.newText)
+        return State::Finished;
+    if (current == record.oldBytes)
+        return State::Untouched;
+    return isInterruptedRewrite(current, record.oldBytes, record.newText) ? State::Restorable : State::Changed;
+}
+
+// Examines the keep file found, holding its lock (exclusive for a restore) while the finding is
+// used; the lock goes with found.fd.
+KeepFinding examine(const OpenPart& part, const FoundKeep& found, int lockKind)
+{
+    KeepFinding finding;
+    if (!found.fd.valid())
+        return finding;
+    finding.keepPath = found.path();
+    // Where the file system has no locks, nothing tells a live writer: the part's own lock, taken
+    // by every save before it looks here, keeps saves apart.
+    if (::flock(found.fd.get(), lockKind | LOCK_NB) != 0 && errno == EWOULDBLOCK) {
+        finding.state = KeepFinding::State::Busy;
+        return finding;
+    }
+    const FileBytes keep(found.fd.get(), finding.keepPath);
+    KeepRecord record;
+    if (!parseRecord(keep.view(), record) || record.identity != part.identity()) {
+        finding.state = KeepFinding::State::Changed; // another file has the inode now
+        return finding;
+    }
+    const FileBytes current(part);
+    finding.state = judge(current.view(), record);
+    if (finding.state == KeepFinding::State::Restorable)
+        finding.oldBytes = record.oldBytes;
+    return finding;
+}
+
+// Removes the keep file's name, when it still is the file found.
+void removeKeep(const FoundKeep& found)
+{
+    struct stat named {
+    }, held{};
+    if (::fstatat(found.folder->fd(), found.name.c_str(), &named, AT_SYMLINK_NOFOLLOW) == 0 &&
+        ::fstat(found.fd.get(), &held) == 0 && named.st_ino == held.st_ino && named.st_dev == held.st_dev)
+        ::unlinkat(found.folder->fd(), found.name.c_str(), 0);
 }
 
 } // namespace
 
-TextFingerprint FingerprintOf(std::initializer_list<std::string_view> pieces)
+const std::string& HomeOfThisUser()
 {
-    // FNV-1a: enough to tell the complete new text from a torn one.
-    TextFingerprint fingerprint{0, 14695981039346656037ull};
-    for (const auto piece : pieces) {
-        fingerprint.size += piece.size();
-        for (const unsigned char byte : piece)
-            fingerprint.checksum = (fingerprint.checksum ^ byte) * 1099511628211ull;
-    }
-    return fingerprint;
+    static const std::string home = [] {
+        std::vector<char> buffer(16384);
+        struct passwd entry {};
+        struct passwd* found = nullptr;
+        if (::getpwuid_r(::geteuid(), &entry, buffer.data(), buffer.size(), &found) != 0 || found == nullptr ||
+            found->pw_dir == nullptr)
+            return std::string();
+        return std::string(found->pw_dir);
+    }();
+    return home;
 }
 
-std::string KeepFolderFor(const std::string& folder)
+KeepFile::KeepFile(const OpenPart& part, std::string_view oldBytes, std::initializer_list<std::string_view> newText,
+                   const std::string& home)
+    : name_(keepNameOf(part.identity()))
 {
-    const bool writable = ::faccessat(AT_FDCWD, folder.c_str(), W_OK | X_OK, AT_EACCESS) == 0;
-    return writable ? folder : std::filesystem::temp_directory_path().string();
-}
-
-std::string WriteKeepFile(const std::string& folder, const struct stat& part, std::string_view oldBytes,
-                          const TextFingerprint& newText)
-{
-    const auto path = keepPathIn(folder, part);
-    NewFile keep(folder, path);
-    keep.write({recordLine(newText), oldBytes});
-    keep.setMode(0600);
-    keep.sync();
-    if (!keep.linkAs(path))
-        throw OsError(EEXIST, path);
-    return path;
-}
-
-bool HasKeepFile(const std::string& path)
-{
-    struct stat part {
-    }, keep{};
-    if (::stat(path.c_str(), &part) != 0)
-        return false;
-    for (const auto& keepFolder : keepFoldersFor(path))
-        if (::lstat(keepPathIn(keepFolder, part).c_str(), &keep) == 0)
-            return true;
-    return false;
-}
-
-bool RestoreInterruptedRewrite(const std::string& path)
-{
-    struct stat part {};
-    if (::stat(path.c_str(), &part) != 0)
-        return false;
-    for (const auto& keepFolder : keepFoldersFor(path)) {
-        const auto keepPath = keepPathIn(keepFolder, part);
-        KeepRecord record;
-        if (!mayStandFor(keepPath, part))
+    std::size_t newSize = 0;
+    for (const auto piece : newText)
+        newSize += piece.size();
+    const auto record = recordLine(part.identity(), oldBytes.size(), newSize);
+    // A name taken in the part's folder by a file that does not stand for the part sends the copy
+    // to this user's own folder.
+    for (auto folder : {part.folder().mayCreateFiles() ? part.sharedFolder() : nullptr, privateFolder(home, true)}) {
+        if (!folder)
             continue;
-        const FileBytes keep(keepPath);
-        if (!parseRecord(keep.view(), record) || !ProcessIsGone(record.pid))
-            continue;
-        const FileBytes now(path);
-        const bool untouched = now.view() == record.oldBytes;
-        const bool complete = FingerprintOf({now.view()}) == record.newText;
-        if (!untouched && !complete)
-            OverwriteFile(path, {record.oldBytes});
-        ::unlink(keepPath.c_str());
-        return !untouched && !complete;
+        auto file = std::make_unique<NewFile>(*folder, part.path());
+        file->write({record, oldBytes});
+        file->write(newText);
+        file->setMode(0600);
+        file->sync();
+        if (file->linkAs(name_)) {
+            folder->sync();
+            folder_ = std::move(folder);
+            file_ = std::move(file);
+            return;
+        }
     }
-    return false;
+    throw OsError(part.folder().mayCreateFiles() ? EEXIST : EACCES, part.path());
+}
+
+KeepFile::~KeepFile()
+{
+    if (!kept_ && folder_)
+        ::unlinkat(folder_->fd(), name_.c_str(), 0);
+}
+
+KeepFinding ExamineKeepFile(const OpenPart& part, const std::string& home)
+{
+    const auto found = findKeep(part, home);
+    return examine(part, found, LOCK_SH);
+}
+
+KeepNotRestoredError::KeepNotRestoredError(const std::string& path, const std::string& keepPath)
+    : QmError(ErrorNumber::PathFileAccessError,
+              path + ": an interrupted save was not restored because the file changed since; its old bytes are in " +
+                  keepPath)
+{
+}
+
+bool RestoreInterruptedRewrite(const OpenPart& part, const std::string& home)
+{
+    const auto found = findKeep(part, home);
+    const auto finding = examine(part, found, LOCK_EX);
+    using State = KeepFinding::State;
+    switch (finding.state) {
+    case State::None:
+    case State::Busy: return false;
+    case State::Changed: throw KeepNotRestoredError(part.path(), finding.keepPath);
+    case State::Restorable: {
+        const auto writable = part.openForWriting();
+        OverwriteFile(writable.get(), {finding.oldBytes}, part.path());
+        break;
+    }
+    case State::Untouched:
+    case State::Finished: break;
+    }
+    removeKeep(found);
+    found.folder->sync();
+    return finding.state == State::Restorable;
+}
+
+bool IsKeepFileName(std::string_view name, unsigned long long& device, unsigned long long& inode)
+{
+    if (!name.starts_with(KeepPrefix))
+        return false;
+    const auto* begin = name.data() + KeepPrefix.size();
+    const auto* end = name.data() + name.size();
+    const auto [afterDevice, deviceError] = std::from_chars(begin, end, device);
+    if (deviceError != std::errc() || afterDevice == end || *afterDevice != '-')
+        return false;
+    const auto [afterInode, inodeError] = std::from_chars(afterDevice + 1, end, inode);
+    return inodeError == std::errc() && afterInode == end;
 }

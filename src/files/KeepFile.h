@@ -1,39 +1,71 @@
 // SPDX-License-Identifier: MIT
 #pragma once
 
-#include <cstdint>
 #include <initializer_list>
+#include <memory>
 #include <string>
 #include <string_view>
 
-struct stat;
+#include "NewFile.h"
+#include "OpenPart.h"
+#include "QmError.h"
 
 // A file that must keep its inode is rewritten in place. Before that, a keep file takes a whole
-// copy of its old bytes, on disk, together with a record of the rewrite: which process does it,
-// and the size and checksum of the new text. The keep file is named after the device and inode
-// of the file it keeps, so that any later open finds it with one look, whatever the file's name.
-// It is removed when the rewrite is done; when the rewriting process was killed, the next open
-// or save finishes the rewrite's undoing (RestoreInterruptedRewrite).
+// copy of its old bytes and of the new text, on disk, with the identity of the file it keeps
+// (device, inode, birth time). It is named after device and inode, so that any later open finds it
+// with one look whatever the file's name, and it stands in the part's folder, or where this user
+// may not create files there, in a folder of his own (KeepFolderIn). The writer holds a lock on it
+// for the whole rewrite: a keep file that can be locked was left by a writer that is gone.
 
-struct TextFingerprint {
-    std::uint64_t size = 0;
-    std::uint64_t checksum = 0;
-    bool operator==(const TextFingerprint&) const = default;
+// The home folder of the user this program runs as, from the password database (never from the
+// environment); empty when he has none.
+const std::string& HomeOfThisUser();
+
+// The writer's keep file, removed when it goes unless kept.
+class KeepFile {
+public:
+    KeepFile(const OpenPart& part, std::string_view oldBytes, std::initializer_list<std::string_view> newText,
+             const std::string& home);
+    ~KeepFile();
+    KeepFile(const KeepFile&) = delete;
+    KeepFile& operator=(const KeepFile&) = delete;
+    // Leaves the keep file for the next open or save: the one whole copy of the old bytes.
+    void keep() { kept_ = true; }
+
+private:
+    std::shared_ptr<const OpenFolder> folder_;
+    std::string name_;
+    std::unique_ptr<NewFile> file_; // holds the lock
+    bool kept_ = false;
 };
-TextFingerprint FingerprintOf(std::initializer_list<std::string_view> pieces);
 
-// Writes the keep file for the file whose status is part into folder and returns its path.
-std::string WriteKeepFile(const std::string& folder, const struct stat& part, std::string_view oldBytes,
-                          const TextFingerprint& newText);
+// What a keep file left for a part says, looked at without writing anything.
+struct KeepFinding {
+    enum class State {
+        None,       // no keep file stands for the part
+        Busy,       // its writer is still at work
+        Untouched,  // the part still holds the old bytes
+        Finished,   // the part holds the whole new text: the rewrite ended
+        Restorable, // the part holds what an interrupted rewrite leaves: the old bytes go back
+        Changed,    // the part holds something else: another file, or a later change
+    };
+    State state = State::None;
+    std::string keepPath;
+    std::string oldBytes; // when Restorable
+};
+KeepFinding ExamineKeepFile(const OpenPart& part, const std::string& home);
 
-// The folder where this user keeps the keep files of the files in folder: the folder itself, or
-// the temporary folder when he may not create files there.
-std::string KeepFolderFor(const std::string& folder);
+// A keep file that stays because the part changed since the interrupted save.
+class KeepNotRestoredError : public QmError {
+public:
+    KeepNotRestoredError(const std::string& path, const std::string& keepPath);
+};
 
-// True when a keep file for the file at path exists: a look at its name, nothing read.
-bool HasKeepFile(const std::string& path);
+// Acts on what ExamineKeepFile finds, under the part's lock: writes the old bytes back through the
+// part's descriptor when the part is Restorable, removes the keep file when it no longer
+// applies, and throws KeepNotRestoredError when the part Changed. True when old bytes went back.
+bool RestoreInterruptedRewrite(const OpenPart& part, const std::string& home);
 
-// Looks for the keep file of the file at path left by a process that no longer runs. When the
-// file does not hold that rewrite's complete new text, writes the kept old bytes back over it.
-// Removes the keep file. True when old bytes were written back. The caller holds the file's lock.
-bool RestoreInterruptedRewrite(const std::string& path);
+// The keep-file name of the file with this device and inode; for folder runs that report keep
+// files whose part is gone.
+bool IsKeepFileName(std::string_view name, unsigned long long& device, unsigned long long& inode);

@@ -2,75 +2,98 @@
 #include "NewFile.h"
 
 #include <cerrno>
-#include <charconv>
-#include <climits>
-#include <csignal>
 #include <dirent.h>
 #include <fcntl.h>
 #include <random>
+#include <sys/file.h>
 #include <sys/stat.h>
 #include <unistd.h>
 
 #include "FileWrites.h"
+#include "OpenPart.h"
 #include "QmError.h"
 
 namespace {
 
-// Temporary files that have a name carry the process id, so that a later save can tell the
-// leftover of a killed save from a file that another save is still writing.
 constexpr std::string_view TemporaryPrefix = ".quillmark-save-";
+constexpr std::size_t RandomDigits = 16;
 
-} // namespace
-
-std::string UniqueNameIn(const std::string& folder, std::string_view prefix)
+bool isTemporaryName(std::string_view name)
 {
-    static thread_local std::mt19937_64 random{std::random_device{}()};
-    return folder + "/" + std::string(prefix) + std::to_string(::getpid()) + "-" +
-           std::to_string(random() % 1000000007);
-}
-
-std::string TemporaryNameIn(const std::string& folder) { return UniqueNameIn(folder, TemporaryPrefix); }
-
-bool ProcessIsGone(long pid)
-{
-    if (pid <= 0 || pid > INT_MAX)
+    if (!name.starts_with(TemporaryPrefix) || name.size() != TemporaryPrefix.size() + RandomDigits)
         return false;
-    return ::kill(static_cast<pid_t>(pid), 0) != 0 && errno == ESRCH;
+    return name.substr(TemporaryPrefix.size()).find_first_not_of("0123456789abcdef") == std::string_view::npos;
 }
 
-bool FolderSweeps::firstVisit(const std::string& folder)
+bool before(const struct timespec& a, const struct timespec& b)
 {
-    const std::lock_guard lock(mutex_);
-    return visited_.insert(folder).second;
+    return a.tv_sec < b.tv_sec || (a.tv_sec == b.tv_sec && a.tv_nsec < b.tv_nsec);
 }
 
-void RemoveStaleTemporaries(const std::string& folder)
+// A leftover of a killed save: this user's regular file whose name it got before the run began,
+// and that no save holds locked any more.
+bool isLeftover(int folder, const char* name, const struct timespec& runStart)
 {
-    DIR* entries = ::opendir(folder.c_str());
-    if (entries == nullptr)
+    const FileDescriptor file(::openat(folder, name, O_RDONLY | O_NOFOLLOW | O_NONBLOCK | O_CLOEXEC | O_NOCTTY));
+    struct stat info {};
+    return file.valid() && ::fstat(file.get(), &info) == 0 && S_ISREG(info.st_mode) && info.st_uid == ::geteuid() &&
+           before(info.st_ctim, runStart) && ::flock(file.get(), LOCK_EX | LOCK_NB) == 0;
+}
+
+void removeLeftovers(const OpenFolder& folder, const struct timespec& runStart)
+{
+    const int listing = ::openat(folder.fd(), ".", O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+    DIR* entries = listing < 0 ? nullptr : ::fdopendir(listing);
+    if (entries == nullptr) {
+        if (listing >= 0)
+            ::close(listing);
         return;
-    while (const auto* entry = ::readdir(entries)) {
-        const std::string_view name(entry->d_name);
-        if (!name.starts_with(TemporaryPrefix))
-            continue;
-        const auto pidText = name.substr(TemporaryPrefix.size());
-        long pid = 0;
-        const auto [end, error] = std::from_chars(pidText.data(), pidText.data() + pidText.size(), pid);
-        if (error == std::errc() && *end == '-' && ProcessIsGone(pid))
-            ::unlinkat(::dirfd(entries), entry->d_name, 0);
     }
+    while (const auto* entry = ::readdir(entries))
+        if (isTemporaryName(entry->d_name) && isLeftover(folder.fd(), entry->d_name, runStart))
+            ::unlinkat(folder.fd(), entry->d_name, 0);
     ::closedir(entries);
 }
 
-NewFile::NewFile(const std::string& folder, const std::string& reportedPath)
-    : folder_(folder), reportedPath_(reportedPath), fd_(openInFolder())
+} // namespace
+
+std::string TemporaryName()
 {
+    static thread_local std::mt19937_64 random{std::random_device{}()};
+    constexpr char Digits[] = "0123456789abcdef";
+    std::string name(TemporaryPrefix);
+    auto bits = random();
+    for (std::size_t i = 0; i < RandomDigits; ++i, bits >>= 4)
+        name += Digits[bits & 15];
+    return name;
+}
+
+FolderSweeps::FolderSweeps() { ::clock_gettime(CLOCK_REALTIME, &start_); }
+
+void FolderSweeps::sweep(const OpenFolder& folder)
+{
+    struct stat info {};
+    if (::fstat(folder.fd(), &info) != 0)
+        return;
+    {
+        const std::lock_guard lock(mutex_);
+        if (!visited_.insert({info.st_dev, info.st_ino}).second)
+            return;
+    }
+    removeLeftovers(folder, start_);
+}
+
+NewFile::NewFile(const OpenFolder& folder, std::string reportedPath)
+    : folder_(folder), reportedPath_(std::move(reportedPath)), fd_(openInFolder())
+{
+    if (::flock(fd_.get(), LOCK_EX) != 0 && errno != ENOLCK && errno != EOPNOTSUPP)
+        throw OsError(errno, reportedPath_);
 }
 
 NewFile::~NewFile()
 {
     if (!temporaryName_.empty())
-        ::unlink(temporaryName_.c_str());
+        ::unlinkat(folder_.fd(), temporaryName_.c_str(), 0);
 }
 
 void NewFile::write(std::initializer_list<std::string_view> pieces)
@@ -103,9 +126,12 @@ void NewFile::sync()
         throw OsError(errno, reportedPath_);
 }
 
-bool NewFile::linkAs(const std::string& path)
+bool NewFile::linkAs(std::string_view name)
 {
-    const int result = temporaryName_.empty() ? linkUnnamed(path) : ::link(temporaryName_.c_str(), path.c_str());
+    const std::string wanted(name);
+    const int result = temporaryName_.empty()
+                           ? linkUnnamed(wanted)
+                           : ::linkat(folder_.fd(), temporaryName_.c_str(), folder_.fd(), wanted.c_str(), 0);
     if (result != 0) {
         if (errno == EEXIST)
             return false;
@@ -115,34 +141,41 @@ bool NewFile::linkAs(const std::string& path)
     return true;
 }
 
+FileDescriptor NewFile::openForReading() const
+{
+    const int held = fd_.valid() ? fd_.get() : lockHolder_.get();
+    return FileDescriptor(::open(DescriptorPath(held).c_str(), O_RDONLY | O_CLOEXEC | O_NOCTTY | O_NONBLOCK));
+}
+
 void NewFile::nameAndClose()
 {
     if (temporaryName_.empty()) {
-        const auto name = TemporaryNameIn(folder_);
+        auto name = TemporaryName();
         if (linkUnnamed(name) != 0)
             throw OsError(errno, reportedPath_);
-        temporaryName_ = name;
+        temporaryName_ = std::move(name);
     }
     closeChecked();
 }
 
-void NewFile::renameTo(const std::string& path)
+void NewFile::renameTo(std::string_view name)
 {
-    if (::rename(temporaryName_.c_str(), path.c_str()) != 0)
-        throw OsError(errno, path);
+    if (::renameat(folder_.fd(), temporaryName_.c_str(), folder_.fd(), std::string(name).c_str()) != 0)
+        throw OsError(errno, reportedPath_);
     temporaryName_.clear();
 }
 
 int NewFile::openInFolder()
 {
-    const int fd = ::open(folder_.c_str(), O_TMPFILE | O_WRONLY | O_CLOEXEC, 0600);
+    const int fd = ::openat(folder_.fd(), ".", O_TMPFILE | O_WRONLY | O_CLOEXEC, 0600);
     if (fd >= 0)
         return fd;
     if (errno != EOPNOTSUPP && errno != EISDIR && errno != EINVAL)
         throw OsError(errno, reportedPath_);
     for (;;) {
-        temporaryName_ = TemporaryNameIn(folder_);
-        const int named = ::open(temporaryName_.c_str(), O_CREAT | O_EXCL | O_WRONLY | O_CLOEXEC, 0600);
+        temporaryName_ = TemporaryName();
+        const int named =
+            ::openat(folder_.fd(), temporaryName_.c_str(), O_CREAT | O_EXCL | O_WRONLY | O_CLOEXEC | O_NOFOLLOW, 0600);
         if (named >= 0)
             return named;
         if (errno != EEXIST)
@@ -150,14 +183,15 @@ int NewFile::openInFolder()
     }
 }
 
-int NewFile::linkUnnamed(const std::string& path) const
+int NewFile::linkUnnamed(const std::string& name) const
 {
-    const auto self = "/proc/self/fd/" + std::to_string(fd_.get());
-    return ::linkat(AT_FDCWD, self.c_str(), AT_FDCWD, path.c_str(), AT_SYMLINK_FOLLOW);
+    return ::linkat(AT_FDCWD, DescriptorPath(fd_.get()).c_str(), folder_.fd(), name.c_str(), AT_SYMLINK_FOLLOW);
 }
 
 void NewFile::closeChecked()
 {
+    if (!lockHolder_.valid())
+        lockHolder_ = FileDescriptor(::dup(fd_.get()));
     if (::close(fd_.release()) != 0)
         throw OsError(errno, reportedPath_);
 }

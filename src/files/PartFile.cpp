@@ -10,6 +10,7 @@
 
 #include "FileDescriptor.h"
 #include "LargeBuffer.h"
+#include "OpenPart.h"
 #include "QmError.h"
 
 namespace {
@@ -44,7 +45,27 @@ void reserveFor(std::string& bytes, std::size_t size)
 // cache before read() overwrites them.
 constexpr std::size_t ReadStep = std::size_t{256} * 1024;
 
+// Reads up to size bytes at offset, fewer only at the end of the file. The file's own offset is
+// left alone: the descriptor may be shared with whoever holds the file open.
+std::size_t readAt(int fd, char* buffer, std::size_t size, std::size_t offset, const std::string& path)
+{
+    std::size_t filled = 0;
+    while (filled < size) {
+        const auto got = ::pread(fd, buffer + filled, size - filled, static_cast<off_t>(offset + filled));
+        if (got < 0 && errno == EINTR)
+            continue;
+        if (got < 0)
+            throw OsError(errno, path);
+        if (got == 0)
+            break;
+        filled += static_cast<std::size_t>(got);
+    }
+    return filled;
+}
+
 } // namespace
+
+FileBytes::FileBytes(const OpenPart& part, const HeadCheck& headCheck) : FileBytes(part.fd(), part.path(), headCheck) {}
 
 FileBytes::FileBytes(const std::string& path)
 {
@@ -52,13 +73,23 @@ FileBytes::FileBytes(const std::string& path)
     const FileDescriptor file(::open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK | O_NOCTTY));
     if (!file.valid())
         throw OsError(errno, path);
+    *this = FileBytes(file.get(), path);
+}
+
+FileBytes::FileBytes(int fd, const std::string& path, const HeadCheck& headCheck)
+{
     struct stat info {};
-    if (::fstat(file.get(), &info) != 0)
+    if (::fstat(fd, &info) != 0)
         throw OsError(errno, path);
     if (!S_ISREG(info.st_mode))
         throw PathFileAccessError();
     stamp_ = StampOf(info);
     const auto expected = static_cast<std::size_t>(info.st_size);
+    if (headCheck) {
+        std::string head(HeadSize, '\0');
+        head.resize(readAt(fd, head.data(), head.size(), 0, path));
+        headCheck(head);
+    }
     reserveFor(bytes_, expected);
     for (;;) {
         const auto filled = bytes_.size();
@@ -68,14 +99,8 @@ FileBytes::FileBytes(const std::string& path)
         // more than that; past it, the file grew.
         const auto wanted = filled <= expected ? expected + 1 - filled : ReadStep;
         bytes_.resize(filled + std::min({bytes_.capacity() - filled, ReadStep, wanted}));
-        const auto got = ::read(file.get(), bytes_.data() + filled, bytes_.size() - filled);
-        const int readError = errno;
-        bytes_.resize(filled + static_cast<std::size_t>(std::max<ssize_t>(got, 0)));
-        if (got < 0) {
-            if (readError == EINTR)
-                continue;
-            throw OsError(readError, path);
-        }
+        const auto got = readAt(fd, bytes_.data() + filled, bytes_.size() - filled, filled, path);
+        bytes_.resize(filled + got);
         if (got == 0)
             return;
     }

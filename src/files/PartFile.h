@@ -1,10 +1,20 @@
 // SPDX-License-Identifier: MIT
 #pragma once
 
+#include <cstddef>
+#include <functional>
 #include <string>
 #include <string_view>
 
 #include "FileStamp.h"
+
+class OpenPart;
+
+// Looks at the first bytes of a file before the rest is read, and throws to refuse it.
+using HeadCheck = std::function<void(std::string_view head)>;
+
+// How many bytes a HeadCheck sees: all of a shorter file.
+inline constexpr std::size_t HeadSize = std::size_t{64} * 1024;
 
 // The bytes of a regular file, read at once into one buffer. Anything else (a folder, a FIFO, a
 // device) is refused before a byte is read, so a file name can never make the program wait
@@ -16,8 +26,13 @@
 // held in memory once.
 class FileBytes {
 public:
-    // Throws QmError: the classic number when the file cannot be read, 75 (Path/File access
-    // error) when it is no regular file, 7 (Out of memory) when it is too large to work on.
+    // Reads the open file from its start. The head check sees its first bytes before the rest is
+    // read, so that a file it refuses costs no more than those. Throws QmError: the classic number
+    // when the file cannot be read, 7 (Out of memory) when it is too large to work on.
+    explicit FileBytes(const OpenPart& part, const HeadCheck& headCheck = {});
+    // The same for any open file; path names it in messages.
+    FileBytes(int fd, const std::string& path, const HeadCheck& headCheck = {});
+    // The file at path, links followed; 75 (Path/File access error) when it is no regular file.
     explicit FileBytes(const std::string& path);
 
     std::string_view view() const { return bytes_; }

@@ -10,10 +10,8 @@
 #include <unistd.h>
 
 #include "Attributes.h"
-#include "FileLock.h"
 #include "FileWrites.h"
 #include "Folders.h"
-#include "KeepFile.h"
 #include "NewFile.h"
 #include "PartFile.h"
 
@@ -37,13 +35,13 @@ mode_t modeForNewFile()
     return 0666 & ~mask;
 }
 
-void checkWritable(const std::string& path, const struct stat& info)
+std::string fileNameOf(const std::string& path) { return path.substr(path.rfind('/') + 1); }
+
+void checkWritable(const OpenPart& part, const struct stat& info)
 {
     // A file without any write permission stays as it is, even for root.
-    if ((info.st_mode & 0222) == 0)
-        throw OsError(EACCES, path);
-    if (::faccessat(AT_FDCWD, path.c_str(), W_OK, AT_EACCESS) != 0)
-        throw OsError(errno, path);
+    if ((info.st_mode & 0222) == 0 || !part.mayWrite())
+        throw OsError(EACCES, part.path());
 }
 
 // "a_Backup.dat", "a_Backup (2).dat", "a_Backup (3).dat"...
@@ -57,23 +55,25 @@ std::string numberedName(const std::string& path, int number)
     return path.substr(0, at) + " (" + std::to_string(number) + ")" + path.substr(at);
 }
 
-// Tries makeAs with each numbered form of path until one is free; returns the name it took.
+// Tries makeAs with the file name of each numbered form of path until one is free; returns the
+// numbered path it took.
 template <typename MakeAs>
 std::string firstFreeName(const std::string& path, const MakeAs& makeAs)
 {
     for (int number = 1; number <= MostBackupNumbers; ++number) {
         auto name = numberedName(path, number);
-        if (makeAs(name))
+        if (makeAs(fileNameOf(name)))
             return name;
     }
     throw OsError(EEXIST, path);
 }
 
-// A new file at the first free form of path holding bytes, on disk, with the mode and, where the
-// system allows, the owner of original. Returns its name.
-std::string writeCopy(const std::string& path, std::string_view bytes, const struct stat& original)
+// A new file in folder at the first free form of path holding bytes, on disk, with the mode and,
+// where the system allows, the owner of original. Returns its path.
+std::string writeCopy(const OpenFolder& folder, const std::string& path, std::string_view bytes,
+                      const struct stat& original)
 {
-    NewFile copy(FolderOf(path), path);
+    NewFile copy(folder, path);
     copy.write({bytes});
     if (!copy.takeOwnerAndModeOf(original))
         copy.setMode(original.st_mode & 07777);
@@ -81,118 +81,133 @@ std::string writeCopy(const std::string& path, std::string_view bytes, const str
     return firstFreeName(path, [&copy](const std::string& name) { return copy.linkAs(name); });
 }
 
-// Removes the file at path unless it was kept.
+// Removes a name in a folder unless it was kept.
 class Undo {
 public:
-    explicit Undo(std::string path = {}) : path_(std::move(path)) {}
+    Undo(const OpenFolder& folder, std::string path) : folder_(folder), name_(path.empty() ? "" : fileNameOf(path)) {}
     ~Undo()
     {
-        if (!path_.empty())
-            ::unlink(path_.c_str());
+        if (!name_.empty())
+            ::unlinkat(folder_.fd(), name_.c_str(), 0);
     }
     Undo(const Undo&) = delete;
     Undo& operator=(const Undo&) = delete;
-    void keep() { path_.clear(); }
+    void keep() { name_.clear(); }
 
 private:
-    std::string path_;
+    const OpenFolder& folder_;
+    std::string name_;
+};
+
+// A second name in the part's folder for the open part itself, whatever its name stands for
+// now; the link's errno, 0 when made.
+int linkPartAs(const OpenPart& part, const std::string& name)
+{
+    const int made =
+        ::linkat(AT_FDCWD, DescriptorPath(part.fd()).c_str(), part.folder().fd(), name.c_str(), AT_SYMLINK_FOLLOW);
+    return made == 0 ? 0 : errno;
+}
+
+struct Backup {
+    std::string path;
+    bool secondName = false; // a second name of the old file, not a copy
 };
 
 // The old file under the backup name: a second name for it where the file system allows,
-// otherwise a copy of its bytes. Returns the name it took.
-std::string makeBackup(const std::string& target, const std::string& backupPath, const struct stat& original)
+// otherwise a copy of its bytes.
+Backup makeBackup(const OpenPart& part, const std::string& backupPath, const struct stat& original)
 {
     int linkError = 0;
     const auto linked = firstFreeName(backupPath, [&](const std::string& name) {
-        linkError = ::link(target.c_str(), name.c_str()) == 0 ? 0 : errno;
+        linkError = linkPartAs(part, name);
         return linkError != EEXIST;
     });
     if (linkError == 0)
-        return linked;
+        return {linked, true};
     if (linkError != EPERM && linkError != EXDEV && linkError != EMLINK && linkError != ENOTSUP)
-        throw OsError(linkError, target);
-    const FileBytes old(target);
-    return writeCopy(backupPath, old.view(), original);
+        throw OsError(linkError, part.path());
+    const FileBytes old(part);
+    return {writeCopy(part.folder(), backupPath, old.view(), original), false};
 }
 
-struct stat statOf(const std::string& path)
+// The last look before the new text takes the file's name: the name still stands for the file
+// read, and the file is as it was read.
+void ensureUnchanged(const OpenPart& part, const FileStamp& expected)
 {
-    struct stat info {};
-    ::stat(path.c_str(), &info);
-    return info;
-}
-
-// The last look before the new text takes the file's name.
-void ensureUnchanged(const std::string& target, const FileStamp& expected)
-{
-    if (StampOfPath(target) != expected)
-        throw FileChangedError(target);
+    if (part.stamp() != expected || !part.stillNamed())
+        throw FileChangedError(part.path());
 }
 
 // The old file keeps a name until the new one is in place and checked: its backup, or else a
 // temporary second name. Empty where the file system has no second names.
-std::string keepAName(const std::string& target, const std::string& backupPath)
+std::string keepAName(const OpenPart& part, const Backup& backup)
 {
-    if (!backupPath.empty() && statOf(backupPath).st_ino == statOf(target).st_ino)
-        return backupPath;
-    auto name = TemporaryNameIn(FolderOf(target));
-    return ::link(target.c_str(), name.c_str()) == 0 ? name : std::string();
-}
-
-bool stillAsRead(int fd, const FileStamp& expected)
-{
-    struct stat now {};
-    return ::fstat(fd, &now) == 0 && StampOf(now) == expected;
+    if (backup.secondName)
+        return fileNameOf(backup.path);
+    auto name = TemporaryName();
+    return linkPartAs(part, name) == 0 ? name : std::string();
 }
 
 // What every road needs to know about the replace it does.
 struct Replace {
-    const std::string& target;
+    const std::shared_ptr<OpenPart>& part;
     const struct stat& original;
-    bool exists;
     std::initializer_list<std::string_view> pieces;
     const ReplaceOptions& options;
     FileStamp expected;
-    const FileLock& lock; // on the old file
+    const FileLock& lock;
 };
 
 // For a file that must keep its inode (several hard links, an owner or attributes a new file
-// could not have): its old bytes are first made safe in a keep file, then it is rewritten, and
-// written back from the copy if that fails.
+// could not have): its old bytes are first made safe in a keep file, then it is rewritten through
+// its own descriptor, and written back from the copy if that fails.
 ReplaceResult rewriteInPlace(const Replace& r)
 {
-    const FileBytes old(r.target);
+    const auto& part = *r.part;
+    const FileBytes old(part);
     ReplaceResult result;
-    Undo keep(WriteKeepFile(KeepFolderFor(FolderOf(r.target)), r.original, old.view(), FingerprintOf(r.pieces)));
+    KeepFile keep(part, old.view(), r.pieces, r.options.home);
     if (r.options.backupPath)
-        result.backupPath = writeCopy(*r.options.backupPath, old.view(), r.original);
-    Undo backup(result.backupPath);
+        result.backupPath = writeCopy(part.folder(), *r.options.backupPath, old.view(), r.original);
+    Undo backup(part.folder(), result.backupPath);
     reach(r.options.afterStep, ReplaceStep::BackupMade);
-    ensureUnchanged(r.target, r.expected);
+    ensureUnchanged(part, r.expected);
+    const auto writable = part.openForWriting();
     try {
-        OverwriteFile(r.target, r.pieces);
+        OverwriteFile(writable.get(), r.pieces, part.path());
     } catch (const QmError&) {
         try {
-            OverwriteFile(r.target, {old.view()});
+            OverwriteFile(writable.get(), {old.view()}, part.path());
         } catch (const QmError&) {
             keep.keep(); // the one whole version of the old bytes, for the next open to restore
         }
         throw;
     }
     backup.keep();
+    result.written = r.part;
     reach(r.options.afterStep, ReplaceStep::Placed);
     return result;
+}
+
+// The part as the new file that took its name, open for reading; null when this user may not
+// read it.
+std::shared_ptr<OpenPart> writtenPart(const OpenPart& part, const NewFile& file)
+{
+    auto fd = file.openForReading();
+    if (!fd.valid())
+        return nullptr;
+    return std::make_shared<OpenPart>(part.sharedFolder(), part.name(), part.path(), std::move(fd));
 }
 
 // The usual road: the new file takes the old one's name in one rename. Nullopt, with nothing
 // changed, when the new file could not keep the old one's owner or attributes.
 std::optional<ReplaceResult> replaceByRename(const Replace& r)
 {
-    NewFile file(FolderOf(r.target), r.target);
+    const auto& part = *r.part;
+    const auto& folder = part.folder();
+    NewFile file(folder, part.path());
     file.write(r.pieces);
-    if (!r.exists)
-        file.setMode(modeForNewFile());
-    else if (!file.takeOwnerAndModeOf(r.original) || !TakeAttributesOf(r.target, file.fd()))
+    if (!file.takeOwnerAndModeOf(r.original) || !TakeAttributesOf(part.fd(), file.fd()))
         return std::nullopt;
     file.sync();
     reach(r.options.afterStep, ReplaceStep::NewTextWritten);
@@ -201,47 +216,50 @@ std::optional<ReplaceResult> replaceByRename(const Replace& r)
     // bytes. Killed between the two, the part and its backup are one file with two names; the
     // next save knows that backup by its name and replaces the part by rename again
     // (onlyOtherNameIsABackup), so no save ever writes into a backup.
-    ReplaceResult result;
-    if (r.options.backupPath)
-        result.backupPath = makeBackup(r.target, *r.options.backupPath, r.original);
-    Undo backup(result.backupPath);
-    const auto oldName = r.exists ? keepAName(r.target, result.backupPath) : std::string();
-    Undo temporaryOldName(oldName == result.backupPath ? std::string() : oldName);
+    const auto backup = r.options.backupPath ? makeBackup(part, *r.options.backupPath, r.original) : Backup{};
+    Undo undoBackup(folder, backup.path);
+    const auto oldName = keepAName(part, backup);
+    Undo temporaryOldName(folder, backup.secondName ? std::string() : oldName);
     reach(r.options.afterStep, ReplaceStep::BackupMade);
-    file.replace(r.target, [&] {
-        ensureUnchanged(r.target, r.expected);
+    file.replace(part.name(), [&] {
+        ensureUnchanged(part, r.expected);
         reach(r.options.afterStep, ReplaceStep::NewTextNamed);
     });
-    SyncFolder(FolderOf(r.target));
+    folder.sync();
     // Another program that opened the old file before the rename may have written to it since the
     // last look: once it has closed the file (or after a short wait), the old file, with that write,
     // takes its name back.
-    if (!oldName.empty() && r.lock.fd() >= 0) {
+    if (!oldName.empty()) {
         r.lock.waitUntilOthersClosed(PatienceWithWriters);
-        if (!stillAsRead(r.lock.fd(), r.expected)) {
-            ::rename(oldName.c_str(), r.target.c_str());
-            SyncFolder(FolderOf(r.target));
-            throw FileChangedError(r.target);
+        if (part.stamp() != r.expected) {
+            ::renameat(folder.fd(), oldName.c_str(), folder.fd(), part.name().c_str());
+            folder.sync();
+            throw FileChangedError(part.path());
         }
     }
-    backup.keep();
+    undoBackup.keep();
+    ReplaceResult result{backup.path, writtenPart(part, file)};
     reach(r.options.afterStep, ReplaceStep::Placed);
     return result;
 }
 
 // True when the file has two names and the other one is one of its own backups.
-bool onlyOtherNameIsABackup(const std::string& target, const struct stat& original, const ReplaceOptions& options)
+bool onlyOtherNameIsABackup(const OpenPart& part, const struct stat& original, const ReplaceOptions& options)
 {
     if (original.st_nlink != 2 || !options.isBackupName)
         return false;
-    DIR* entries = ::opendir(FolderOf(target).c_str());
-    if (entries == nullptr)
+    const int listing = ::openat(part.folder().fd(), ".", O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+    DIR* entries = listing < 0 ? nullptr : ::fdopendir(listing);
+    if (entries == nullptr) {
+        if (listing >= 0)
+            ::close(listing);
         return false;
+    }
     bool found = false;
     while (const auto* entry = ::readdir(entries)) {
         struct stat info {};
         if (options.isBackupName(entry->d_name) &&
-            ::fstatat(::dirfd(entries), entry->d_name, &info, AT_SYMLINK_NOFOLLOW) == 0 &&
+            ::fstatat(part.folder().fd(), entry->d_name, &info, AT_SYMLINK_NOFOLLOW) == 0 &&
             info.st_ino == original.st_ino && info.st_dev == original.st_dev) {
             found = true;
             break;
@@ -262,10 +280,14 @@ std::string withCanonicalFolder(const std::string& path)
     return (canonical == "/" ? "" : canonical) + "/" + path.substr(path.rfind('/') + 1);
 }
 
-void sweep(const std::string& folder, FolderSweeps* sweeps)
+void sweep(const OpenFolder& folder, FolderSweeps* sweeps)
 {
-    if (sweeps == nullptr || sweeps->firstVisit(folder))
-        RemoveStaleTemporaries(folder);
+    if (sweeps != nullptr) {
+        sweeps->sweep(folder);
+        return;
+    }
+    FolderSweeps once;
+    once.sweep(folder);
 }
 
 } // namespace
@@ -291,42 +313,71 @@ std::string ResolveLinks(const std::string& path)
     throw OsError(ELOOP, path);
 }
 
-ReplaceResult ReplaceFileSafely(const std::string& path, std::initializer_list<std::string_view> pieces,
-                                const ReplaceOptions& options)
+ReplaceResult ReplacePart(const std::shared_ptr<OpenPart>& part, std::initializer_list<std::string_view> pieces,
+                          const ReplaceOptions& options)
 {
-    const auto target = ResolveLinks(path);
-    const auto folder = FolderOf(target);
-    sweep(folder, options.sweeps);
-    const FileLock lock(target);
-    RestoreInterruptedRewrite(target);
-    struct stat original {};
-    const bool exists = ::stat(target.c_str(), &original) == 0;
-    const auto expected = options.expected.value_or(exists ? StampOf(original) : FileStamp{});
-    const Replace replace{target, original, exists, pieces, options, expected, lock};
-    ensureUnchanged(target, expected);
-    if (exists)
-        checkWritable(target, original);
+    sweep(part->folder(), options.sweeps);
+    const FileLock lock(*part, options.lockWait);
+    reach(options.afterStep, ReplaceStep::Locked);
+    if (!part->stillNamed())
+        throw FileChangedError(part->path());
+    RestoreInterruptedRewrite(*part, options.home);
+    const auto original = part->status();
+    const auto expected = options.expected.value_or(StampOf(original));
+    ensureUnchanged(*part, expected);
+    checkWritable(*part, original);
     // A file this user may write in a folder where he may not create files can only be rewritten
-    // in place, with the copy of its old bytes in the temporary folder.
-    const bool folderWritable = ::faccessat(AT_FDCWD, folder.c_str(), W_OK | X_OK, AT_EACCESS) == 0;
-    const bool hardLinked = original.st_nlink > 1 && !onlyOtherNameIsABackup(target, original, options);
-    const bool keepInode = exists && (hardLinked || (!folderWritable && !options.backupPath));
+    // in place, with the copy of its old bytes in a folder of his own.
+    const bool folderWritable = part->folder().mayCreateFiles();
+    const bool hardLinked = original.st_nlink > 1 && !onlyOtherNameIsABackup(*part, original, options);
+    const bool keepInode = hardLinked || (!folderWritable && !options.backupPath);
+    const Replace replace{part, original, pieces, options, expected, lock};
     std::optional<ReplaceResult> result;
     if (!keepInode)
         result = replaceByRename(replace);
     if (!result) {
         result = rewriteInPlace(replace);
-        SyncFolder(folder);
+        part->folder().sync();
     }
     return *result;
 }
 
-bool RestoreInterruptedSave(const std::string& path, FolderSweeps* sweeps)
+ReplaceResult CreateFileIn(const std::shared_ptr<const OpenFolder>& folder, const std::string& name,
+                           const std::string& shownPath, std::initializer_list<std::string_view> pieces)
+{
+    NewFile file(*folder, shownPath);
+    file.write(pieces);
+    file.setMode(modeForNewFile());
+    file.sync();
+    if (!file.linkAs(name))
+        throw FileChangedError(shownPath);
+    folder->sync();
+    auto fd = file.openForReading();
+    return {{}, fd.valid() ? std::make_shared<OpenPart>(folder, name, shownPath, std::move(fd)) : nullptr};
+}
+
+ReplaceResult ReplaceFileSafely(const std::string& path, std::initializer_list<std::string_view> pieces,
+                                const ReplaceOptions& options)
 {
     const auto target = ResolveLinks(path);
-    sweep(FolderOf(target), sweeps);
-    if (!HasKeepFile(target))
+    const auto folder = OpenFolder::open(FolderOf(target), target);
+    const auto name = fileNameOf(target);
+    std::shared_ptr<OpenPart> part;
+    try {
+        part = OpenPart::openIn(folder, name, target);
+    } catch (const QmError& error) {
+        if (error.number() != ErrorNumber::FileNotFound)
+            throw;
+        return CreateFileIn(folder, name, target, pieces);
+    }
+    return ReplacePart(part, pieces, options);
+}
+
+bool RestoreInterruptedSave(const OpenPart& part, FolderSweeps* sweeps, const LockWait& wait, const std::string& home)
+{
+    sweep(part.folder(), sweeps);
+    if (ExamineKeepFile(part, home).state == KeepFinding::State::None)
         return false; // the usual case, found without taking the lock
-    const FileLock lock(target);
-    return RestoreInterruptedRewrite(target);
+    const FileLock lock(part, wait);
+    return RestoreInterruptedRewrite(part, home);
 }

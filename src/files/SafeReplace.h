@@ -3,11 +3,15 @@
 
 #include <functional>
 #include <initializer_list>
+#include <memory>
 #include <optional>
 #include <string>
 #include <string_view>
 
+#include "FileLock.h"
 #include "FileStamp.h"
+#include "KeepFile.h"
+#include "OpenPart.h"
 #include "QmError.h"
 
 class FolderSweeps;
@@ -17,13 +21,14 @@ class FolderSweeps;
 // link comes back as it is.
 std::string ResolveLinks(const std::string& path);
 
-// The points between the steps of a replace, where a test can stop a save as a kill would.
-enum class ReplaceStep { NewTextWritten, BackupMade, NewTextNamed, Placed };
+// The points between the steps of a replace, where a test can stop a save as a kill would, or
+// act as another program would between two steps.
+enum class ReplaceStep { Locked, NewTextWritten, BackupMade, NewTextNamed, Placed };
 using ReplaceStepHook = std::function<void(ReplaceStep)>;
 
 struct ReplaceOptions {
-    // Where the old content goes; when that name exists, " (2)", " (3)"... is put before the
-    // first "." of its file name instead. None: no backup.
+    // Where the old content goes, in the part's folder; when that name exists, " (2)", " (3)"...
+    // is put before the first "." of its file name instead. None: no backup.
     std::optional<std::string> backupPath;
     // True for the file name of one of this file's earlier backups, which may share its inode
     // when a save was killed between making the backup and renaming.
@@ -32,11 +37,16 @@ struct ReplaceOptions {
     std::optional<FileStamp> expected;
     // Leftover temporary files are looked for once per folder in a run; none: every time.
     FolderSweeps* sweeps = nullptr;
+    LockWait lockWait;
+    // The saving user's home folder, below which he keeps the copies of files in folders where
+    // he may not create files.
+    std::string home = HomeOfThisUser();
     ReplaceStepHook afterStep;
 };
 
 struct ReplaceResult {
-    std::string backupPath; // the name the backup took, when one was made
+    std::string backupPath;            // the name the backup took, when one was made
+    std::shared_ptr<OpenPart> written; // the file that holds the new text now
 };
 
 // The file changed on disk (another program wrote, replaced or removed it) between the read
@@ -50,26 +60,38 @@ private:
     std::string path_;
 };
 
-// Replaces the content of the file at path (links followed) by the pieces, one after the other,
-// so that the file is never broken, never missing and never another user's:
-// - the new text goes to a temporary file in the same folder that has no name until it is
-//   complete and on disk, gets the old file's owner, permissions and extended attributes, and
-//   then takes the file's name in one rename;
+// Replaces the content of the open part by the pieces, one after the other, so that the file is
+// never broken, never missing and never another user's:
+// - the new text goes to a new file in the part's folder that has no name until it is complete
+//   and on disk, gets the old file's owner, permissions and extended attributes, and then takes
+//   the part's name in one rename;
 // - a file with several hard links, one whose owner or attributes a new file could not keep, or
-//   one in a folder where this user may not create files, is rewritten in place instead, after a
-//   copy of its old bytes is safe on disk (a keep file), and restored from that copy if writing
-//   fails or, when the process is killed, by the next open or save;
+//   one in a folder where this user may not create files, is rewritten in place through its own
+//   descriptor instead, after a copy of its old bytes is safe on disk (a keep file), and restored
+//   from that copy if writing fails or, when the process is killed, by the next open or save;
 // - with a backup path, the old content ends under that name (a second name for the old file,
 //   or a copy of it);
 // - a file this user may not write, or that has no write permission at all, is refused;
-// - a file that changed since expected is left alone (FileChangedError), checked again right
-//   before the new text takes its name; Quillmark processes saving one file take turns.
-// On any failure the file keeps its old content, nothing else is left behind, and QmError is
-// thrown.
+// - a file that changed since expected, or whose name came to stand for another file, is left
+//   alone (FileChangedError), checked again right before the new text takes its name;
+//   Quillmark processes saving one file take turns.
+// Every step works on the part's descriptor or relative to its folder's. On any failure the file
+// keeps its old content, nothing else is left behind, and QmError is thrown.
+ReplaceResult ReplacePart(const std::shared_ptr<OpenPart>& part, std::initializer_list<std::string_view> pieces,
+                          const ReplaceOptions& options = {});
+
+// Gives the pieces the name in folder, where no file has it yet (FileChangedError when one has),
+// with the permissions a new file gets.
+ReplaceResult CreateFileIn(const std::shared_ptr<const OpenFolder>& folder, const std::string& name,
+                           const std::string& shownPath, std::initializer_list<std::string_view> pieces);
+
+// The file at path, opened as OpenPart::openPath does, replaced by ReplacePart; created when
+// there is none.
 ReplaceResult ReplaceFileSafely(const std::string& path, std::initializer_list<std::string_view> pieces,
                                 const ReplaceOptions& options = {});
 
-// Undoes the in-place rewrite of the file at path (links followed) that a killed process left
-// half done, and removes what killed saves left in its folder; true when old bytes were written
-// back. sweeps: see ReplaceOptions.
-bool RestoreInterruptedSave(const std::string& path, FolderSweeps* sweeps = nullptr);
+// Under the part's lock, undoes the in-place rewrite of the part that a killed process left half
+// done (see RestoreInterruptedRewrite), after removing what killed saves left in its folder
+// (sweeps: see ReplaceOptions); true when old bytes were written back.
+bool RestoreInterruptedSave(const OpenPart& part, FolderSweeps* sweeps = nullptr, const LockWait& wait = {},
+                            const std::string& home = HomeOfThisUser());

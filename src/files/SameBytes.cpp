@@ -1,7 +1,6 @@
 // SPDX-License-Identifier: MIT
 #include "SameBytes.h"
 
-#include <fcntl.h>
 #include <sys/stat.h>
 
 #include <cerrno>
@@ -9,18 +8,18 @@
 #include <numeric>
 #include <vector>
 
-#include "FileDescriptor.h"
+#include <unistd.h>
 
 namespace {
 
 constexpr std::size_t ReadStep = std::size_t{256} * 1024;
 
-// Reads up to size bytes, fewer only at the end of the file; -1 when reading fails.
-ssize_t readFully(int fd, char* buffer, std::size_t size)
+// Reads up to size bytes at offset, fewer only at the end of the file; -1 when reading fails.
+ssize_t readFully(int fd, char* buffer, std::size_t size, std::size_t offset)
 {
     std::size_t filled = 0;
     while (filled < size) {
-        const auto got = ::read(fd, buffer + filled, size - filled);
+        const auto got = ::pread(fd, buffer + filled, size - filled, static_cast<off_t>(offset + filled));
         if (got < 0 && errno == EINTR)
             continue;
         if (got < 0)
@@ -33,35 +32,35 @@ ssize_t readFully(int fd, char* buffer, std::size_t size)
 }
 
 // Whether the file's next bytes are those of piece.
-bool nextBytesAre(int fd, std::string_view piece, std::vector<char>& buffer)
+bool nextBytesAre(int fd, std::size_t& offset, std::string_view piece, std::vector<char>& buffer)
 {
     while (!piece.empty()) {
         const auto step = std::min(piece.size(), buffer.size());
-        if (readFully(fd, buffer.data(), step) != static_cast<ssize_t>(step) ||
+        if (readFully(fd, buffer.data(), step, offset) != static_cast<ssize_t>(step) ||
             std::memcmp(buffer.data(), piece.data(), step) != 0)
             return false;
         piece.remove_prefix(step);
+        offset += step;
     }
     return true;
 }
 
 } // namespace
 
-bool FileHoldsExactly(const std::string& path, std::span<const std::string_view> pieces)
+bool FileHoldsExactly(int fd, std::span<const std::string_view> pieces)
 {
-    // Not blocking on open: a FIFO put in the file's place must not make the program wait.
-    const FileDescriptor file(::open(path.c_str(), O_RDONLY | O_CLOEXEC | O_NONBLOCK));
     struct stat info {};
-    if (!file.valid() || ::fstat(file.get(), &info) != 0 || !S_ISREG(info.st_mode))
+    if (::fstat(fd, &info) != 0 || !S_ISREG(info.st_mode))
         return false;
     const auto size = std::accumulate(pieces.begin(), pieces.end(), std::size_t{0},
                                       [](std::size_t sum, std::string_view piece) { return sum + piece.size(); });
     if (static_cast<std::size_t>(info.st_size) != size)
         return false;
     std::vector<char> buffer(ReadStep);
+    std::size_t offset = 0;
     for (const auto piece : pieces)
-        if (!nextBytesAre(file.get(), piece, buffer))
+        if (!nextBytesAre(fd, offset, piece, buffer))
             return false;
     char extra = 0;
-    return readFully(file.get(), &extra, 1) == 0; // grown since fstat: not the same
+    return readFully(fd, &extra, 1, offset) == 0; // grown since fstat: not the same
 }

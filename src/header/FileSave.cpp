@@ -2,9 +2,11 @@
 #include "FileSave.h"
 
 #include <cstdio>
+#include <optional>
 
 #include "Dialogs.h"
 #include "ErrorReport.h"
+#include "Folders.h"
 #include "SafeReplace.h"
 #include "SameBytes.h"
 #include "Text.h"
@@ -97,11 +99,18 @@ std::string MakeBackupName(const std::string& path, const LocalDateTime& stamp)
     return name.folderWithSlash + backupMark(name) + stampText(stamp) + "." + name.extension;
 }
 
-void RestoreInterruptedSaveOf(const std::string& path, Dialogs& dialogs, FolderSweeps* sweeps)
+RestoreOutcome RestoreInterruptedSaveOf(const OpenPart& part, Dialogs& dialogs, const ReplaceOptions& run)
 {
-    if (RestoreInterruptedSave(path, sweeps))
-        dialogs.message({"restored " + path + " from an interrupted save", "Quillmark", Buttons::Ok, Icon::Information,
-                         Answer::Ok});
+    try {
+        if (!RestoreInterruptedSave(part, run.sweeps, run.lockWait, run.home))
+            return RestoreOutcome::NothingToDo;
+    } catch (const KeepNotRestoredError& kept) {
+        dialogs.message({kept.description(), KeptCopyTitle, Buttons::Ok, Icon::Exclamation, Answer::Ok});
+        return RestoreOutcome::CopyKept;
+    }
+    dialogs.message({"restored " + part.path() + " from an interrupted save", "Quillmark", Buttons::Ok,
+                     Icon::Information, Answer::Ok});
+    return RestoreOutcome::Restored;
 }
 
 bool IsBackupName(std::string_view fileName)
@@ -132,44 +141,108 @@ std::string SavedText(const HeaderData& header, const std::string& newHeader)
 
 bool FileHoldsSavedText(const HeaderData& header, const std::string& newHeader)
 {
-    return FileHoldsExactly(header.FilePath, SavedPieces(header, newHeader));
+    return header.Part && header.ReadStamp && header.Part->unchangedSince(*header.ReadStamp) &&
+           FileHoldsExactly(header.Part->fd(), SavedPieces(header, newHeader));
 }
 
+namespace {
+
+// Where the part is written: the folder and name it was read from, or where FilePath leads.
+struct PartPlace {
+    std::shared_ptr<const OpenFolder> folder;
+    std::string name, path;
+};
+
+PartPlace placeOf(const HeaderData& header)
+{
+    if (header.Part)
+        return {header.Part->sharedFolder(), header.Part->name(), header.Part->path()};
+    const auto target = ResolveLinks(header.FilePath);
+    return {OpenFolder::open(FolderOf(target), target), target.substr(target.rfind('/') + 1), target};
+}
+
+// The file that has the part's name now, after another program replaced or removed the one
+// read; null when there is none.
+std::shared_ptr<OpenPart> fileNamedNow(const PartPlace& place)
+{
+    try {
+        return OpenPart::openIn(place.folder, place.name, place.path);
+    } catch (const QmError& error) {
+        if (error.number() == ErrorNumber::FileNotFound)
+            return nullptr;
+        throw;
+    }
+}
+
+// The box that says why the save stopped, for the failures that have one of their own.
+std::optional<MessageBox> boxFor(const QmError& error)
+{
+    const auto box = [&error](const char* title) {
+        return MessageBox{error.description(), title, Buttons::Ok, Icon::Exclamation, Answer::Ok};
+    };
+    if (dynamic_cast<const KeepNotRestoredError*>(&error) != nullptr)
+        return box(KeptCopyTitle);
+    if (dynamic_cast<const FileLockedError*>(&error) != nullptr)
+        return box(FileLockedTitle);
+    if (dynamic_cast<const InterruptedError*>(&error) != nullptr)
+        return box(InterruptedTitle);
+    return std::nullopt;
+}
+
+// Writes the pieces over the part, or as a new file where the part is gone; asks before
+// overwriting another program's change. False when the user would not overwrite it.
+bool replaceAsked(HeaderData& header, const std::array<std::string_view, 4>& pieces, ReplaceOptions options,
+                  Dialogs& dialogs, FileSaveResult& result)
+{
+    const std::initializer_list<std::string_view> text{pieces[0], pieces[1], pieces[2], pieces[3]};
+    const auto place = placeOf(header);
+    auto part = header.Part ? header.Part : fileNamedNow(place);
+    bool changed = header.ReadStamp && !(part && part->unchangedSince(*header.ReadStamp));
+    options.expected = header.ReadStamp;
+    for (;;) {
+        if (changed) {
+            if (dialogs.message(changedOnDiskBox(header.FilePath)) != Answer::Yes)
+                return false;
+            part = fileNamedNow(place);
+            options.expected = part ? std::optional(part->stamp()) : std::nullopt;
+        }
+        try {
+            auto replaced =
+                part ? ReplacePart(part, text, options) : CreateFileIn(place.folder, place.name, place.path, text);
+            result.backupPath = std::move(replaced.backupPath);
+            header.Part = replaced.written ? std::move(replaced.written) : fileNamedNow(place);
+            return true;
+        } catch (const FileChangedError&) {
+            changed = true;
+        }
+    }
+}
+
+} // namespace
+
 FileSaveResult FileSave(HeaderData& header, std::string newHeader, bool makeBackup, const Clock& clock,
-                        Dialogs& dialogs, FolderSweeps* sweeps)
+                        Dialogs& dialogs, const ReplaceOptions& run)
 {
     FileSaveResult result;
     try {
         // The backup stands beside the file that is written, which is not the link's folder.
-        const auto target = ResolveLinks(header.FilePath);
-        RestoreInterruptedSaveOf(target, dialogs, sweeps);
+        const auto target = header.Part ? header.Part->path() : ResolveLinks(header.FilePath);
         auto options = backupOptions(target, makeBackup, clock);
-        options.expected = header.ReadStamp;
-        options.sweeps = sweeps;
-        // Another program's changes since the file was read are only overwritten when the user says
-        // so, whether they came before the save began or while it wrote.
-        const auto pieces = SavedPieces(header, newHeader);
-        bool changed = header.ReadStamp && StampOfPath(target) != *header.ReadStamp;
-        for (;;) {
-            if (changed) {
-                if (dialogs.message(changedOnDiskBox(header.FilePath)) != Answer::Yes)
-                    return result;
-                options.expected = StampOfPath(target);
-            }
-            try {
-                result.backupPath =
-                    ReplaceFileSafely(target, {pieces[0], pieces[1], pieces[2], pieces[3]}, options).backupPath;
-                break;
-            } catch (const FileChangedError&) {
-                changed = true;
-            }
-        }
-        header.ReadStamp = StampOfPath(target);
+        options.sweeps = run.sweeps;
+        options.lockWait = run.lockWait;
+        options.home = run.home;
+        options.afterStep = run.afterStep;
+        if (!replaceAsked(header, SavedPieces(header, newHeader), options, dialogs, result))
+            return result;
+        header.ReadStamp = header.Part ? std::optional(header.Part->stamp()) : std::nullopt;
         header.HeaderAtOpenOrSave = std::move(newHeader);
         header.FileChanged = false;
         result.saved = true;
     } catch (const QmError& error) {
-        ReportError(dialogs, error, FileSaveProcedure);
+        if (const auto box = boxFor(error))
+            dialogs.message(*box);
+        else
+            ReportError(dialogs, error, FileSaveProcedure);
     }
     return result;
 }

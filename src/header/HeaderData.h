@@ -1,12 +1,14 @@
 // SPDX-License-Identifier: MIT
 #pragma once
 
+#include <memory>
 #include <optional>
 #include <string>
 #include <vector>
 
 #include "EntryList.h"
 #include "FileStamp.h"
+#include "OpenPart.h"
 
 // A list of texts, such as a list file's entries. The texts talk about entry 1 to count; the code
 // indexes from 0.
@@ -42,7 +44,10 @@ struct HeaderData {
     TextEncoding Encoding = TextEncoding::Utf8;
     // The file began with a UTF-8 byte order mark: not part of the header, and written back.
     bool ByteOrderMark = false;
-    // The file at FilePath as it was read, or as the last save left it; none when nothing was read.
+    // The file at FilePath, held open from the read to the save, so that the save writes the file
+    // that was read and no other; null when nothing was read.
+    std::shared_ptr<OpenPart> Part;
+    // Part as it was read, or as the last save left it; none when nothing was read.
     std::optional<FileStamp> ReadStamp;
     // The composed header as the open or the last save left it: the file counts as changed only
     // while the header composed now differs from it.

@@ -347,12 +347,19 @@ bool ParsePartFileContent(HeaderData& header, std::string content, Dialogs& dial
     return !empty;
 }
 
-bool GetGlobalContent(HeaderData& header, Dialogs& dialogs, ParseProgress& progress)
+bool GetGlobalContent(HeaderData& header, Dialogs& dialogs, ParseProgress& progress, const PartCheck& beforeRead)
 {
     progress.processEvents();
+    std::shared_ptr<OpenPart> part;
     std::optional<FileBytes> content;
     try {
-        content.emplace(header.FilePath);
+        part = OpenPart::openPath(header.FilePath);
+        if (beforeRead)
+            beforeRead(*part);
+        content.emplace(*part, [&header](std::string_view head) { EnsureTextFile(head, header.FilePath); });
+    } catch (const NotTextFileError& notText) {
+        dialogs.message({notText.what(), ProgramTitle, Buttons::Ok, Icon::Exclamation, Answer::Ok});
+        return false;
     } catch (const QmError& error) {
         ReportError(dialogs, error, IsUnixLineEndProcedure);
         const bool missing = error.number() == ErrorNumber::FileNotFound || error.number() == ErrorNumber::PathNotFound;
@@ -366,10 +373,9 @@ bool GetGlobalContent(HeaderData& header, Dialogs& dialogs, ParseProgress& progr
     try {
         if (!ParsePartFileContent(header, content->takeBytes(), dialogs, progress))
             return false;
+        header.Part = std::move(part);
         header.ReadStamp = content->stamp();
         return true;
-    } catch (const NotTextFileError& notText) {
-        dialogs.message({notText.what(), ProgramTitle, Buttons::Ok, Icon::Exclamation, Answer::Ok});
     } catch (const std::exception& failure) {
         ReportError(dialogs, ErrorOf(failure), GetGlobalContentProcedure);
     }

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 #pragma once
 
+#include <functional>
 #include <string>
 #include <string_view>
 
@@ -20,7 +21,11 @@ void ParseHeaderText(HeaderData& header, std::string text, ParseProgress& progre
 // capacity is converted where it lies. False when the file was empty.
 bool ParsePartFileContent(HeaderData& header, std::string content, Dialogs& dialogs, ParseProgress& progress);
 
-// Reads and parses the file named by FilePath into header, a record of its own. Failures (no such
+// What is done with a part file once it is open and before it is read.
+using PartCheck = std::function<void(const OpenPart&)>;
+
+// Opens the file named by FilePath (see OpenPart::openPath), lets beforeRead look at it, then reads
+// and parses it into header, a record of its own, which holds it open as Part. Failures (no such
 // file, no regular file, an empty or binary file, a failed parse) are reported through dialogs
 // and give false: the caller then drops the record.
-bool GetGlobalContent(HeaderData& header, Dialogs& dialogs, ParseProgress& progress);
+bool GetGlobalContent(HeaderData& header, Dialogs& dialogs, ParseProgress& progress, const PartCheck& beforeRead = {});

@@ -99,6 +99,6 @@ SaveResult CheckHeaderAndSave(HeaderData& h, const SaveContext& context)
         return {SaveOutcome::Unchanged, {}};
     if (context.dryRun)
         return {SaveOutcome::NotWritten, {}};
-    const auto saved = FileSave(h, std::move(newHeader), context.makeBackup, context.clock, dialogs, context.sweeps);
+    const auto saved = FileSave(h, std::move(newHeader), context.makeBackup, context.clock, dialogs, context.run);
     return {saved.saved ? SaveOutcome::Saved : SaveOutcome::Failed, saved.backupPath};
 }

@@ -8,10 +8,10 @@
 #include <vector>
 
 #include "HeaderData.h"
+#include "SafeReplace.h"
 
 class Clock;
 class Dialogs;
-class FolderSweeps;
 
 inline constexpr std::size_t DescriptionLimit = 64;
 
@@ -55,8 +55,8 @@ struct SaveContext {
     bool limitDescription = true; // off: the description may be of any length
     // On: a save that would write what the file holds already writes nothing.
     bool skipUnchanged = false;
-    bool dryRun = false;            // everything but the writing
-    FolderSweeps* sweeps = nullptr; // see ReplaceOptions
+    bool dryRun = false;     // everything but the writing
+    ReplaceOptions run = {}; // the sweeps, the lock wait and the home of the run (see ReplaceOptions)
 };
 
 struct SaveResult {

@@ -25,8 +25,9 @@ bool LadeDATDateiCommandLine(AppState& app, const std::string& path, OpenRoad ro
 {
     HeaderData opened;
     TakeFileToOpen(opened, path, services.dialogs);
-    RestoreInterruptedSaveOf(path, services.dialogs); // a save killed while it rewrote the file
-    if (!GetGlobalContent(opened, services.dialogs, progress))
+    // A save killed while it rewrote the file is undone before the file is read.
+    const auto restore = [&services](const OpenPart& part) { RestoreInterruptedSaveOf(part, services.dialogs); };
+    if (!GetGlobalContent(opened, services.dialogs, progress, restore))
         return false;
     opened.Loading = true;
     app.Header = std::move(opened);

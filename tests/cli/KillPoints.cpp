@@ -43,4 +43,7 @@ KILL_POINT(int, link, (const char* from, const char* to), (from, to), true)
 KILL_POINT(int, linkat, (int fromFolder, const char* from, int toFolder, const char* to, int flags),
            (fromFolder, from, toFolder, to, flags), true)
 KILL_POINT(int, rename, (const char* from, const char* to), (from, to), true)
+KILL_POINT(int, renameat, (int fromFolder, const char* from, int toFolder, const char* to),
+           (fromFolder, from, toFolder, to), true)
+KILL_POINT(int, unlinkat, (int folder, const char* path, int flags), (folder, path, flags), true)
 KILL_POINT(int, unlink, (const char* path), (path), true)
