@@ -95,6 +95,37 @@ TEST(ChangedWhileSaving, EndsTheSaveAndKeepsTheOtherWrite)
     }
 }
 
+// Another user who may write the folder swaps the part for a link to a file of the victim's
+// between two steps of a save: the save writes, links and renames only the file it opened and
+// names in its own folder, so the victim's file never changes, whatever the road and the step.
+TEST(LinkPutInThePartsPlace, NeverLeadsTheSaveToAnotherFile)
+{
+    for (const bool hardLinked : {false, true}) {
+        for (const auto step : {ReplaceStep::Locked, ReplaceStep::NewTextWritten, ReplaceStep::BackupMade,
+                                ReplaceStep::NewTextNamed}) {
+            TempDir dir, victims;
+            const auto victim = victims.write("private.txt", "the victim's own bytes");
+            const auto path = dir.write("3001.dat", OldContent);
+            if (hardLinked)
+                fs::create_hard_link(path, dir.file("second.dat"));
+            auto options = withBackup(dir.file(BackupName));
+            options.afterStep = [&, step = step](ReplaceStep reached) {
+                if (reached != step)
+                    return;
+                fs::rename(path, dir.file("moved.dat"));
+                fs::create_symlink(victim, path);
+            };
+            try {
+                ReplacePart(OpenPart::openPath(path), {NewContent}, options);
+            } catch (const QmError&) {
+                // a save that sees the swap may give up; it must not write elsewhere
+            }
+            EXPECT_EQ(ReadBytes(victim), "the victim's own bytes") << hardLinked << " " << static_cast<int>(step);
+            EXPECT_EQ(NamesIn(victims.path()), std::set<std::string>{"private.txt"});
+        }
+    }
+}
+
 // A program that opened the old file before the rename writes to it a moment after: the save waits
 // for it to close the file, sees the write and gives the old file its name back.
 TEST(ChangedWhileSaving, ALateWriteToTheOldFileIsKept)
