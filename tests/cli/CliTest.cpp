@@ -15,6 +15,7 @@
 #include <unistd.h>
 
 #include "CliApp.h"
+#include "CliRuns.h"
 #include "Corpus.h"
 #include "TempDir.h"
 #include "UnifiedDiff.h"
@@ -33,64 +34,9 @@ const std::string SamplePart = "0 Brick\t2 x 4\r\n0 Name: 3001.dat\r\n0 Author: 
                                "0 BFC CERTIFY CCW\r\n0 !KEYWORDS a, b\r\n0 Caf\xe9\r\n"
                                "1 16 0 0 0 1 0 0 0 1 0 0 0 1 3001s01.dat\r\n";
 
-struct CliRun {
-    int status;
-    std::string out, err;
-};
-
-// Runs quillmark-cli in this process with the given arguments.
-CliRun RunCliWith(std::vector<std::string> args)
-{
-    args.insert(args.begin(), "quillmark-cli");
-    std::vector<const char*> argv;
-    for (const auto& arg : args)
-        argv.push_back(arg.c_str());
-    std::ostringstream out, err;
-    const int status = RunCli(static_cast<int>(argv.size()), argv.data(), out, err);
-    return {status, out.str(), err.str()};
-}
-
 std::size_t lineCount(const std::string& text)
 {
     return static_cast<std::size_t>(std::count(text.begin(), text.end(), '\n'));
-}
-
-std::string readAll(int from)
-{
-    std::string text;
-    char buffer[4096];
-    for (ssize_t got; (got = ::read(from, buffer, sizeof buffer)) > 0;)
-        text.append(buffer, static_cast<std::size_t>(got));
-    ::close(from);
-    return text;
-}
-
-// Runs quillmark-cli in a child of this process, after prepare has set the child up (limits,
-// another user, another working folder), so that nothing of it stays with the tests.
-CliRun RunCliInChild(const std::vector<std::string>& args, const std::function<void()>& prepare)
-{
-    int out[2], err[2];
-    if (::pipe(out) != 0 || ::pipe(err) != 0)
-        return {-1, "", "no pipe"};
-    const pid_t child = ::fork();
-    if (child == 0) { // it must never return into the tests, nor run their exit handlers
-        try {
-            prepare();
-            const auto run = RunCliWith(args);
-            for (const auto& [to, text] : {std::pair{out[1], &run.out}, std::pair{err[1], &run.err}})
-                if (::write(to, text->data(), text->size()) < 0)
-                    ::_exit(126);
-            ::_exit(run.status);
-        } catch (...) {
-            ::_exit(127);
-        }
-    }
-    ::close(out[1]);
-    ::close(err[1]);
-    CliRun run{-1, readAll(out[0]), readAll(err[0])};
-    ::waitpid(child, &run.status, 0);
-    run.status = WIFEXITED(run.status) ? WEXITSTATUS(run.status) : -1;
-    return run;
 }
 
 // In a child run as root, becomes the user nobody, for whom permissions count.
@@ -466,7 +412,7 @@ std::string standardErrorOfCheck(const std::string& folder, bool onTerminal)
         ::_exit(127);
     }
     ::close(ends[1]);
-    auto shown = readAll(ends[0]);
+    auto shown = ReadAllFrom(ends[0]);
     ::waitpid(child, nullptr, 0);
     return shown;
 }

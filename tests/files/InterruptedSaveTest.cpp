@@ -78,8 +78,9 @@ TEST_F(InterruptedSave, APartThatChangedSinceKeepsItsBytesAndTheCopyStays)
         restore();
         ADD_FAILURE() << "no error";
     } catch (const KeepNotRestoredError& error) {
-        EXPECT_EQ(error.description(), path + ": an interrupted save was not restored because the file changed "
-                                              "since; its old bytes are in " +
+        EXPECT_EQ(error.description(), path +
+                                           ": an interrupted save was not restored because the file changed "
+                                           "since; its old bytes are in " +
                                            dir.file(keepName()));
     }
     EXPECT_EQ(ReadBytes(path), later);

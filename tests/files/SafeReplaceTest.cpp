@@ -101,8 +101,8 @@ TEST(ChangedWhileSaving, EndsTheSaveAndKeepsTheOtherWrite)
 TEST(LinkPutInThePartsPlace, NeverLeadsTheSaveToAnotherFile)
 {
     for (const bool hardLinked : {false, true}) {
-        for (const auto step : {ReplaceStep::Locked, ReplaceStep::NewTextWritten, ReplaceStep::BackupMade,
-                                ReplaceStep::NewTextNamed}) {
+        for (const auto step :
+             {ReplaceStep::Locked, ReplaceStep::NewTextWritten, ReplaceStep::BackupMade, ReplaceStep::NewTextNamed}) {
             TempDir dir, victims;
             const auto victim = victims.write("private.txt", "the victim's own bytes");
             const auto path = dir.write("3001.dat", OldContent);
