@@ -128,9 +128,10 @@ struct Writing {
 };
 
 // Opens the file an entry names and lets handle fill the report; an unreadable file is reported
-// as such. Quiet, the messages of the file's dialogs are not shown.
+// as such, and so is one that does not fit in memory beside those that the other threads hold.
+// Quiet, the messages of the file's dialogs are not shown.
 FileReport reportOn(const PartFileEntry& entry, bool quiet, ConsoleDialogs::Answerer answerer, const Writing* writing,
-                    const std::function<void(HeaderData&, ConsoleDialogs&, FileReport&)>& handle)
+                    MemoryClaims& memory, const std::function<void(HeaderData&, ConsoleDialogs&, FileReport&)>& handle)
 {
     FileReport report;
     std::ostringstream err, discarded;
@@ -143,6 +144,7 @@ FileReport reportOn(const PartFileEntry& entry, bool quiet, ConsoleDialogs::Answ
     };
     try {
         const auto part = OpenEntry(entry);
+        const auto held = memory.claim(static_cast<std::size_t>(part->status().st_size));
         std::unique_lock<std::mutex> turn;
         if (writing != nullptr)
             turn = std::unique_lock(writing->locks.of(*part));
@@ -258,10 +260,11 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
     if (options.tracker &&
         (!ReadStandardList(ListKind::Category, categories, err) || !(colours = colourSource(options.ldconfig, err))))
         return ExitStatus::Unreadable;
+    MemoryClaims memory;
     // A check never writes, not even to undo what a killed save left: the next save does that.
     return runBatch(arguments, batch, out, err, [&](const PartFileEntry& entry) {
         const auto& path = entry.path;
-        return reportOn(entry, batch.quiet, {}, nullptr,
+        return reportOn(entry, batch.quiet, {}, nullptr, memory,
                         [&](const HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
                             const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
                             TrackerFindings tracker; // empty unless asked for
@@ -317,11 +320,12 @@ int RunEdit(const std::vector<std::string>& arguments, const SaveOptions& option
             [[maybe_unused]] const auto written = ::write(STDERR_FILENO, line.data(), line.size());
         };
     const Writing writing{run, locks};
+    MemoryClaims memory;
     // A dry run and a JSON listing write nothing.
     const bool writes = !edit.dryRun && !edit.json;
     return runBatch(arguments, batch, out, err, [&](const PartFileEntry& entry) {
         const auto& path = entry.path;
-        return reportOn(entry, batch.quiet, answer, writes ? &writing : nullptr,
+        return reportOn(entry, batch.quiet, answer, writes ? &writing : nullptr, memory,
                         [&](HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
                             if (const auto refusal = ApplyHeaderEdits(header, edit.edits, clock.now())) {
                                 report.saving = FileReport::Saving::Skipped;

@@ -15,19 +15,9 @@
 
 namespace {
 
-// Opening a file holds its bytes (which become the body), the header taken out of them and the
-// composed text: up to about three times its size. A file that cannot fit three times into memory
-// (or the process's address-space limit) is refused up front rather than failing half-way.
 void ensureRoomFor(std::size_t size)
 {
-    const auto pages = ::sysconf(_SC_PHYS_PAGES);
-    const auto pageSize = ::sysconf(_SC_PAGESIZE);
-    std::size_t room =
-        pages > 0 && pageSize > 0 ? static_cast<std::size_t>(pages) * static_cast<std::size_t>(pageSize) : SIZE_MAX;
-    struct rlimit limit {};
-    if (::getrlimit(RLIMIT_AS, &limit) == 0 && limit.rlim_cur != RLIM_INFINITY)
-        room = std::min(room, static_cast<std::size_t>(limit.rlim_cur));
-    if (size > room / 3)
+    if (size > RoomForFiles())
         throw OutOfMemoryError();
 }
 
@@ -64,6 +54,35 @@ std::size_t readAt(int fd, char* buffer, std::size_t size, std::size_t offset, c
 }
 
 } // namespace
+
+std::size_t RoomForFiles()
+{
+    const auto pages = ::sysconf(_SC_PHYS_PAGES);
+    const auto pageSize = ::sysconf(_SC_PAGESIZE);
+    std::size_t room =
+        pages > 0 && pageSize > 0 ? static_cast<std::size_t>(pages) * static_cast<std::size_t>(pageSize) : SIZE_MAX;
+    struct rlimit limit {};
+    if (::getrlimit(RLIMIT_AS, &limit) == 0 && limit.rlim_cur != RLIM_INFINITY)
+        room = std::min(room, static_cast<std::size_t>(limit.rlim_cur));
+    return room / 3;
+}
+
+MemoryClaims::Claim::~Claim()
+{
+    if (claims_ != nullptr) {
+        const std::lock_guard lock(claims_->mutex_);
+        claims_->claimed_ -= size_;
+    }
+}
+
+MemoryClaims::Claim MemoryClaims::claim(std::size_t size)
+{
+    const std::lock_guard lock(mutex_);
+    if (size > RoomForFiles() - std::min(claimed_, RoomForFiles()))
+        throw OutOfMemoryError();
+    claimed_ += size;
+    return Claim(this, size);
+}
 
 FileBytes::FileBytes(const OpenPart& part, const HeadCheck& headCheck) : FileBytes(part.fd(), part.path(), headCheck) {}
 

@@ -3,12 +3,47 @@
 
 #include <cstddef>
 #include <functional>
+#include <mutex>
 #include <string>
 #include <string_view>
+#include <utility>
 
 #include "FileStamp.h"
 
 class OpenPart;
+
+// Opening a file holds its bytes (which become the body), the header taken out of them and the
+// composed text: up to about three times its size. The largest file that fits three times into
+// memory (or the process's address-space limit); a larger one is refused up front rather than
+// failing half-way.
+std::size_t RoomForFiles();
+
+// The files that the threads of a run hold at once, so that together they stay within
+// RoomForFiles: a file that does not fit beside the others is refused.
+class MemoryClaims {
+public:
+    // Gives its bytes back when it goes.
+    class Claim {
+    public:
+        ~Claim();
+        Claim(Claim&& other) noexcept : claims_(std::exchange(other.claims_, nullptr)), size_(other.size_) {}
+        Claim(const Claim&) = delete;
+        Claim& operator=(const Claim&) = delete;
+        Claim& operator=(Claim&&) = delete;
+
+    private:
+        friend class MemoryClaims;
+        Claim(MemoryClaims* claims, std::size_t size) : claims_(claims), size_(size) {}
+        MemoryClaims* claims_;
+        std::size_t size_;
+    };
+    // Throws QmError 7 (Out of memory) when size does not fit beside what is claimed.
+    Claim claim(std::size_t size);
+
+private:
+    std::mutex mutex_;
+    std::size_t claimed_ = 0;
+};
 
 // Looks at the first bytes of a file before the rest is read, and throws to refuse it.
 using HeadCheck = std::function<void(std::string_view head)>;

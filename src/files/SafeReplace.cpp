@@ -368,6 +368,7 @@ ReplaceResult ReplaceFileSafely(const std::string& path, std::initializer_list<s
     } catch (const QmError& error) {
         if (error.number() != ErrorNumber::FileNotFound)
             throw;
+        sweep(*folder, options.sweeps);
         return CreateFileIn(folder, name, target, pieces);
     }
     return ReplacePart(part, pieces, options);

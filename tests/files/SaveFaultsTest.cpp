@@ -208,6 +208,14 @@ TEST_F(SaveFaults, AFileLargerThanAThirdOfMemoryIsRefused)
     const auto small = dir.write("small.dat", std::string(static_cast<std::size_t>(page) * 8, 'x'));
     EXPECT_EQ(ErrorNumberOf([&] { FileBytes bytes(large); }), 7);
     EXPECT_EQ(ErrorNumberOf([&] { FileBytes bytes(small); }), 0);
+    // The files that the threads of a run hold at once count together.
+    MemoryClaims claims;
+    const auto size = static_cast<std::size_t>(page) * 8;
+    {
+        const auto first = claims.claim(size);
+        EXPECT_EQ(ErrorNumberOf([&] { claims.claim(size); }), 7);
+    }
+    EXPECT_EQ(ErrorNumberOf([&] { claims.claim(size); }), 0);
     physicalPages = 0;
 }
 

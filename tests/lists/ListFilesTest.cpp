@@ -47,4 +47,15 @@ TEST(ListFiles, WriterPutsCrLfAfterEveryEntry)
     EXPECT_EQ(ReadBytes(path), "");
 }
 
+// What a killed list save left is cleared by the next one; files of the user's that only look alike
+// stay.
+TEST(ListFiles, AListSaveClearsWhatAKilledOneLeft)
+{
+    TempDir dir;
+    dir.write(".quillmark-save-0123456789abcdef", "A\r\n");
+    dir.write(".quillmark-save-99999-notes.txt", "notes");
+    WriteListFile(dir.file("bfc.txt"), {"A"});
+    EXPECT_EQ(NamesIn(dir.path()), (std::set<std::string>{"bfc.txt", ".quillmark-save-99999-notes.txt"}));
+}
+
 } // namespace
