@@ -104,6 +104,21 @@ void noteFindings(FileReport& report, const SaveFindings& findings)
     report.fixups = findings.fixups;
 }
 
+// Why a save failed, in the words of the "failed" line.
+std::string failureText(const ConsoleDialogs& dialogs)
+{
+    const auto& title = dialogs.lastTitle();
+    if (title == ChangedOnDiskTitle)
+        return "changed while saving";
+    if (title == FileLockedTitle)
+        return "locked by another program";
+    if (title == InterruptedTitle)
+        return "interrupted";
+    if (title == KeptCopyTitle)
+        return "an interrupted save was not restored";
+    return OneLine(dialogs.lastMessage());
+}
+
 // Saves of one file never run at the same time, even when it is named twice or by two of its
 // hard links: the second opens after the first saved, or sees its save as a change.
 class FileLocks {
@@ -153,8 +168,10 @@ FileReport reportOn(const PartFileEntry& entry, bool quiet, ConsoleDialogs::Answ
             handle(*opened, dialogs, report);
         else if (report.status == ExitStatus::Unreadable)
             report.unreadable = true;
-        else
+        else {
             report.saving = FileReport::Saving::Failed;
+            report.out = "failed " + ShownText(entry.path) + ": " + failureText(dialogs) + '\n';
+        }
     } catch (const std::exception& failure) {
         unreadable(failure);
     }
@@ -205,21 +222,6 @@ int runBatch(const std::vector<std::string>& arguments, const BatchOptions& batc
     if (!batch.quiet)
         summary.print(err);
     return status;
-}
-
-// Why a save failed, in the words of the "failed" line.
-std::string failureText(const ConsoleDialogs& dialogs)
-{
-    const auto& title = dialogs.lastTitle();
-    if (title == ChangedOnDiskTitle)
-        return "changed while saving";
-    if (title == FileLockedTitle)
-        return "locked by another program";
-    if (title == InterruptedTitle)
-        return "interrupted";
-    if (title == KeptCopyTitle)
-        return "an interrupted save was not restored";
-    return OneLine(dialogs.lastMessage());
 }
 
 std::string savedLine(const std::string& filePath, const SaveOptions& options, const SaveResult& result,

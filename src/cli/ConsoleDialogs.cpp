@@ -11,7 +11,9 @@ Answer ConsoleDialogs::message(const MessageBox& box)
     lastTitle_ = box.title;
     if (box.buttons != Buttons::Ok && answerer_)
         return answerer_(box);
-    err_ << currentFile_ << ": " << OneLine(box.text) << '\n';
+    // A text that names the file itself is not prefixed with it a second time.
+    const auto line = OneLine(box.text);
+    err_ << (line.starts_with(currentFile_ + ": ") ? "" : currentFile_ + ": ") << line << '\n';
     return box.buttons == Buttons::Ok ? Answer::Ok : box.defaultButton;
 }
 

@@ -12,11 +12,3 @@ FileStamp StampOf(const struct stat& info)
             static_cast<std::int64_t>(info.st_mtim.tv_sec),
             static_cast<std::int64_t>(info.st_mtim.tv_nsec)};
 }
-
-FileStamp StampOfPath(const std::string& path)
-{
-    struct stat info {};
-    if (::stat(path.c_str(), &info) != 0)
-        return {};
-    return StampOf(info);
-}

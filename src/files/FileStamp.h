@@ -21,6 +21,3 @@ struct FileStamp {
 };
 
 FileStamp StampOf(const struct stat& info);
-
-// The stamp of the file path names (links followed); exists is false when there is none.
-FileStamp StampOfPath(const std::string& path);

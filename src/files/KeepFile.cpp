@@ -13,6 +13,7 @@
 #include <unistd.h>
 #include <vector>
 
+#include "FileLock.h"
 #include "FileWrites.h"
 #include "PartFile.h"
 
@@ -250,8 +251,8 @@ bool RestoreInterruptedRewrite(const OpenPart& part, const std::string& home)
     const auto finding = examine(part, found, LOCK_EX);
     using State = KeepFinding::State;
     switch (finding.state) {
-    case State::None:
-    case State::Busy: return false;
+    case State::None: return false;
+    case State::Busy: throw FileLockedError(part.path());
     case State::Changed: throw KeepNotRestoredError(part.path(), finding.keepPath);
     case State::Restorable: {
         const auto writable = part.openForWriting();

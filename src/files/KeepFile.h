@@ -63,7 +63,8 @@ public:
 
 // Acts on what ExamineKeepFile finds, under the part's lock: writes the old bytes back through the
 // part's descriptor when the part is Restorable, removes the keep file when it no longer
-// applies, and throws KeepNotRestoredError when the part Changed. True when old bytes went back.
+// applies, throws KeepNotRestoredError when the part Changed and FileLockedError while another
+// process holds the keep file. True when old bytes went back.
 bool RestoreInterruptedRewrite(const OpenPart& part, const std::string& home);
 
 // The keep-file name of the file with this device and inode; for folder runs that report keep

@@ -35,9 +35,9 @@ void reserveFor(std::string& bytes, std::size_t size)
 // cache before read() overwrites them.
 constexpr std::size_t ReadStep = std::size_t{256} * 1024;
 
-// Reads up to size bytes at offset, fewer only at the end of the file. The file's own offset is
-// left alone: the descriptor may be shared with whoever holds the file open.
-std::size_t readAt(int fd, char* buffer, std::size_t size, std::size_t offset, const std::string& path)
+} // namespace
+
+std::size_t ReadAt(int fd, char* buffer, std::size_t size, std::size_t offset, const std::string& path)
 {
     std::size_t filled = 0;
     while (filled < size) {
@@ -52,8 +52,6 @@ std::size_t readAt(int fd, char* buffer, std::size_t size, std::size_t offset, c
     }
     return filled;
 }
-
-} // namespace
 
 std::size_t RoomForFiles()
 {
@@ -106,7 +104,7 @@ FileBytes::FileBytes(int fd, const std::string& path, const HeadCheck& headCheck
     const auto expected = static_cast<std::size_t>(info.st_size);
     if (headCheck) {
         std::string head(HeadSize, '\0');
-        head.resize(readAt(fd, head.data(), head.size(), 0, path));
+        head.resize(ReadAt(fd, head.data(), head.size(), 0, path));
         headCheck(head);
     }
     reserveFor(bytes_, expected);
@@ -118,7 +116,7 @@ FileBytes::FileBytes(int fd, const std::string& path, const HeadCheck& headCheck
         // more than that; past it, the file grew.
         const auto wanted = filled <= expected ? expected + 1 - filled : ReadStep;
         bytes_.resize(filled + std::min({bytes_.capacity() - filled, ReadStep, wanted}));
-        const auto got = readAt(fd, bytes_.data() + filled, bytes_.size() - filled, filled, path);
+        const auto got = ReadAt(fd, bytes_.data() + filled, bytes_.size() - filled, filled, path);
         bytes_.resize(filled + got);
         if (got == 0)
             return;

@@ -45,6 +45,11 @@ private:
     std::size_t claimed_ = 0;
 };
 
+// Reads up to size bytes of the open file fd at offset, fewer only at the end of the file. The
+// file's own offset is left alone: the descriptor may be shared with whoever holds the file open.
+// A failure throws QmError naming path.
+std::size_t ReadAt(int fd, char* buffer, std::size_t size, std::size_t offset, const std::string& path);
+
 // Looks at the first bytes of a file before the rest is read, and throws to refuse it.
 using HeadCheck = std::function<void(std::string_view head)>;
 

@@ -8,7 +8,8 @@
 #include <numeric>
 #include <vector>
 
-#include <unistd.h>
+#include "PartFile.h"
+#include "QmError.h"
 
 namespace {
 
@@ -17,18 +18,11 @@ constexpr std::size_t ReadStep = std::size_t{256} * 1024;
 // Reads up to size bytes at offset, fewer only at the end of the file; -1 when reading fails.
 ssize_t readFully(int fd, char* buffer, std::size_t size, std::size_t offset)
 {
-    std::size_t filled = 0;
-    while (filled < size) {
-        const auto got = ::pread(fd, buffer + filled, size - filled, static_cast<off_t>(offset + filled));
-        if (got < 0 && errno == EINTR)
-            continue;
-        if (got < 0)
-            return -1;
-        if (got == 0)
-            break;
-        filled += static_cast<std::size_t>(got);
+    try {
+        return static_cast<ssize_t>(ReadAt(fd, buffer, size, offset, {}));
+    } catch (const QmError&) {
+        return -1;
     }
-    return static_cast<ssize_t>(filled);
 }
 
 // Whether the file's next bytes are those of piece.

@@ -91,6 +91,26 @@ TEST(ReadOnlyCommands, WriteNothingAndReportATornPartAsItsRestoreWouldLeaveIt)
     EXPECT_EQ(NamesIn(dir.path()), (std::set<std::string>{"a.dat", ".quillmark-save-99999-notes.txt"}));
 }
 
+// The part changed after its save was killed: the save leaves it and the copy alone, and fails.
+TEST(WritingCommands, APartThatChangedSinceItsSaveWasKilledIsLeftAndFails)
+{
+    TempDir dir;
+    const auto path = dir.write("a.dat", Part);
+    {
+        KeepFile keep(*OpenPart::openPath(path), Part, {"0 New\r\n" + Part}, "");
+        keep.keep();
+    }
+    TempDir::writeTo(path, "0 The user's own\r\n");
+    const auto before = snapshot(dir.path());
+    const auto run = RunCliWith({"save", "--no-backup", path});
+    EXPECT_EQ(run.status, 3);
+    EXPECT_EQ(run.out, "failed " + path + ": an interrupted save was not restored\n");
+    EXPECT_EQ(run.err.find(path + ": " + path), std::string::npos) << run.err;
+    EXPECT_NE(run.err.find(path + ": an interrupted save was not restored because the file changed since"),
+              std::string::npos);
+    EXPECT_EQ(snapshot(dir.path()), before);
+}
+
 // Another program appends to the part between the read and the save: the save fails, the append
 // stays.
 TEST(WritingCommands, AChangeBetweenReadAndSaveFailsTheSave)

@@ -103,7 +103,7 @@ TEST_F(InterruptedSave, ACopyWhoseWriterStillHoldsItIsLeftAlone)
     interruptedWith(New.substr(0, 5) + Old.substr(5));
     const FileDescriptor writer(::open(dir.file(keepName()).c_str(), O_RDONLY));
     ASSERT_EQ(::flock(writer.get(), LOCK_EX), 0);
-    EXPECT_FALSE(restore());
+    EXPECT_THROW(restore(), FileLockedError);
     EXPECT_EQ(ReadBytes(path), New.substr(0, 5) + Old.substr(5));
     EXPECT_TRUE(fs::exists(dir.file(keepName())));
 }

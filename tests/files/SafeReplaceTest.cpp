@@ -77,7 +77,7 @@ TEST(ChangedWhileSaving, EndsTheSaveAndKeepsTheOtherWrite)
             if (hardLinked)
                 fs::create_hard_link(path, dir.file("second.dat"));
             auto options = backup ? withBackup(dir.file(BackupName)) : ReplaceOptions{};
-            options.expected = StampOfPath(path);
+            options.expected = OpenPart::openPath(path)->stamp();
             options.afterStep = [&, removed = removed, when = when](ReplaceStep reached) {
                 if (reached != when)
                     return;
@@ -152,7 +152,7 @@ TEST(ConcurrentSaves, TheSecondSeesTheFirstAsAChange)
     TempDir dir;
     const auto path = dir.write("3001.dat", OldContent);
     ReplaceOptions first;
-    first.expected = StampOfPath(path);
+    first.expected = OpenPart::openPath(path)->stamp();
     int secondError = -1;
     std::jthread secondSave;
     first.afterStep = [&](ReplaceStep reached) {

@@ -152,7 +152,7 @@ TEST_F(FileSaving, EveryHardLinkShowsTheNewContent)
 
 TEST_F(FileSaving, AFileChangedOnDiskIsOverwrittenOnlyAfterAsking)
 {
-    h.ReadStamp = StampOfPath(h.FilePath);
+    h.ReadStamp = OpenPart::openPath(h.FilePath)->stamp();
     const std::string theirs = OldContent + "1 16 b.dat\r\n";
     TempDir::writeTo(h.FilePath, theirs);
     dialogs.expectMessage(Answer::No);
