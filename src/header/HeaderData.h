@@ -6,6 +6,7 @@
 #include <vector>
 
 #include "EntryList.h"
+#include "FileLines.h"
 #include "FileStamp.h"
 
 // A list of texts, such as a list file's entries. The texts talk about entry 1 to count; the code
@@ -39,6 +40,8 @@ struct HeaderData {
     EntryList ColorLines;
     std::string OldHeader;
     std::string Body;
+    // Where the lines of OldHeader and of Body stand in the file as it was read.
+    FileLines OldHeaderLines, BodyLines;
     TextEncoding Encoding = TextEncoding::Utf8;
     // The file began with a UTF-8 byte order mark: not part of the header, and written back.
     bool ByteOrderMark = false;
