@@ -10,11 +10,13 @@
 #include <sstream>
 
 #include "Batch.h"
+#include "CheckOutput.h"
 #include "CliFiles.h"
 #include "Clock.h"
 #include "ColourSource.h"
 #include "Composer.h"
 #include "ConsoleDialogs.h"
+#include "DryRunDiff.h"
 #include "EditCommandLine.h"
 #include "FieldsJson.h"
 #include "FileSave.h"
@@ -24,10 +26,10 @@
 #include "PartFile.h"
 #include "PartFileList.h"
 #include "QmError.h"
+#include "SarifLog.h"
 #include "Summary.h"
 #include "Text.h"
 #include "TrackerCheck.h"
-#include "UnifiedDiff.h"
 
 namespace {
 
@@ -47,53 +49,7 @@ std::unique_ptr<ColourSource> colourSource(const std::string& ldconfig, std::ost
     }
 }
 
-// "line 12: " before a finding about one line.
-std::string linePrefix(const TrackerFinding& finding)
-{
-    return finding.line > 0 ? "line " + std::to_string(finding.line) + ": " : "";
-}
-
 std::string firstLine(const std::string& text) { return text.substr(0, text.find('\r')); }
-
-nlohmann::ordered_json checkJson(const HeaderData& header, const SaveFindings& findings, const TrackerFindings* tracker)
-{
-    nlohmann::ordered_json json;
-    json["FilePath"] = TextForJson(header.FilePath);
-    json["refusals"] = findings.refusals;
-    json["missing_username"] = findings.missingUserName;
-    json["fixups"] = {{"certify_invertnext", findings.fixups.certifyInvertNext},
-                      {"rotation", findings.fixups.rotation},
-                      {"write", findings.fixups.write},
-                      {"color", findings.fixups.color}};
-    if (tracker != nullptr) {
-        json["tracker"] = nlohmann::ordered_json::array();
-        for (const auto& finding : *tracker) {
-            auto& entry = json["tracker"].emplace_back(nlohmann::ordered_json{
-                {"id", finding.id}, {"level", LevelText(finding.level)}, {"text", finding.text}});
-            if (finding.line > 0)
-                entry["line"] = finding.line;
-        }
-    }
-    return json;
-}
-
-std::string findingLines(const std::string& filePath, const SaveFindings& findings, const TrackerFindings* tracker)
-{
-    const auto path = ShownText(filePath);
-    std::string lines;
-    for (const auto& refusal : findings.refusals)
-        lines += path + ": refused: " + firstLine(refusal) + '\n';
-    if (findings.missingUserName)
-        lines += path + ": missing user name\n";
-    for (const auto& [offered, what] : FixUpNames(findings.fixups))
-        if (offered)
-            lines += path + ": fix-up offered: " + what + '\n';
-    if (tracker != nullptr)
-        for (const auto& finding : *tracker)
-            lines += path + ": tracker " + LevelText(finding.level) + " " + finding.id + ": " + linePrefix(finding) +
-                     finding.text + '\n';
-    return lines.empty() ? path + ": ok\n" : lines;
-}
 
 void noteFindings(FileReport& report, const SaveFindings& findings)
 {
@@ -125,7 +81,7 @@ FileReport reportOn(const std::string& path, bool quiet, ConsoleDialogs::Answere
             report.status = ExitStatus::Unreadable;
         }
     }
-    report.err = err.str();
+    report.err.insert(0, err.str());
     return report;
 }
 
@@ -226,21 +182,23 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
     if (options.tracker &&
         (!ReadStandardList(ListKind::Category, categories, err) || !(colours = colourSource(options.ldconfig, err))))
         return ExitStatus::Unreadable;
-    // A check never writes, not even to undo what a killed save left: the next save does that.
-    return runBatch(arguments, batch, out, err, [&](const std::string& path) {
+    // A SARIF log is one document: its results are gathered and written at the end.
+    const bool sarif = options.format == OutputFormat::Sarif;
+    std::ostringstream sarifResults;
+    const auto status = runBatch(arguments, batch, sarif ? sarifResults : out, err, [&](const std::string& path) {
         // A check never writes, not even to undo what a killed save left: the next save does that.
         return reportOn(
             path, batch.quiet, {}, nullptr, [&](const HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
                 const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
+                const auto composed = ComposeHeader(header);
                 TrackerFindings tracker; // empty unless asked for
                 if (options.tracker) {
                     const auto& codes =
                         colours->forPart(path, [&dialogs](const std::string& text) { dialogs.message({text}); });
-                    tracker = CheckRecordForTracker(header, ComposeHeader(header), categories, codes);
+                    tracker = CheckRecordForTracker(header, composed, categories, codes);
                 }
-                const auto* trackerFindings = options.tracker ? &tracker : nullptr;
-                report.out = options.json ? checkJson(header, findings, trackerFindings).dump() + '\n'
-                                          : findingLines(header.FilePath, findings, trackerFindings);
+                report.out =
+                    CheckOutput(options.format, header, composed, findings, options.tracker ? &tracker : nullptr);
                 noteFindings(report, findings);
                 bool trackerRefuses = false;
                 for (const auto& finding : tracker) {
@@ -251,6 +209,9 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
                 report.status = findings.refusals.empty() && !trackerRefuses ? ExitStatus::Ok : ExitStatus::Refused;
             });
     });
+    if (sarif)
+        WriteSarifLog(sarifResults.view(), out);
+    return status;
 }
 
 int RunSave(const std::vector<std::string>& arguments, const SaveOptions& options, const BatchOptions& batch,
@@ -274,21 +235,24 @@ int RunEdit(const std::vector<std::string>& arguments, const SaveOptions& option
     const SystemClock clock;
     FileLocks locks;
     FolderSweeps sweeps;
+    DiffedFiles diffed;
     return runBatch(arguments, batch, out, err, [&](const std::string& path) {
         const std::lock_guard lock(locks.of(path));
         return reportOn(path, batch.quiet, answer, edit.dryRun ? nullptr : &sweeps, // a dry run writes nothing
                         [&](HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
+                            // A dry run prints a diff and only a diff on standard output.
+                            auto& said = edit.dryRun ? report.err : report.out;
                             if (const auto refusal = ApplyHeaderEdits(header, edit.edits, clock.now())) {
                                 report.saving = FileReport::Saving::Skipped;
                                 report.status = ExitStatus::Refused;
-                                report.out = "skipped " + ShownText(path) + ": " + *refusal + '\n';
+                                said = "skipped " + ShownText(path) + ": " + *refusal + '\n';
                                 return;
                             }
                             if (edit.json) {
                                 const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
-                                auto json = checkJson(header, findings, nullptr);
-                                json["old_header"] = TextForJson(header.OldHeader);
-                                json["new_header"] = TextForJson(ComposeHeader(header));
+                                auto json = CheckJson(header, findings, nullptr);
+                                json["old_header"] = HeaderTextForJson(header.OldHeader, header.Encoding);
+                                json["new_header"] = HeaderTextForJson(ComposeHeader(header), header.Encoding);
                                 report.out = json.dump() + '\n';
                                 noteFindings(report, findings);
                                 report.status = findings.refusals.empty() ? ExitStatus::Ok : ExitStatus::Refused;
@@ -308,11 +272,13 @@ int RunEdit(const std::vector<std::string>& arguments, const SaveOptions& option
                                                       .dryRun = edit.dryRun,
                                                       .sweeps = &sweeps};
                             const auto result = CheckHeaderAndSave(header, context);
-                            report.out = savedLine(header.FilePath, options, result, dialogs, report);
+                            const auto line = savedLine(header.FilePath, options, result, dialogs, report);
                             if (edit.dryRun &&
                                 (result.outcome == SaveOutcome::NotWritten || result.outcome == SaveOutcome::Unchanged))
-                                report.out =
-                                    UnifiedDiff(FileBytes(path).view(), SavedText(header, ComposeHeader(header)), path);
+                                report.out = DryRunDiff(path, FileBytes(path).view(),
+                                                        SavedText(header, ComposeHeader(header)), diffed, report.err);
+                            else
+                                said = line;
                         });
     });
 }
