@@ -1,7 +1,8 @@
 # SPDX-License-Identifier: MIT
 # quillmark_releases(FILE VERSION): reads the release list FILE and sets, in the caller,
 # releases_xml (AppStream <release> elements) and releases_changelog (a Debian changelog), both
-# signed by QUILLMARK_MAINTAINER. Stops when the newest release is not VERSION.
+# signed by QUILLMARK_MAINTAINER, and releases_newest_date. Stops when the newest release is not
+# VERSION.
 
 function(_quillmark_add_release version date notes)
   # The notes' lines joined for AppStream, kept as they are for the changelog's one item.
@@ -36,6 +37,8 @@ function(quillmark_releases file version)
         _quillmark_add_release(${current} ${current_date} "${notes}")
       elseif(NOT CMAKE_MATCH_1 STREQUAL version)
         message(FATAL_ERROR "${file}: the newest release is ${CMAKE_MATCH_1}, not ${version}")
+      else()
+        set(releases_newest_date ${CMAKE_MATCH_2} PARENT_SCOPE)
       endif()
       set(current ${CMAKE_MATCH_1})
       set(current_date ${CMAKE_MATCH_2})

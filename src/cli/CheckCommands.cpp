@@ -11,11 +11,13 @@
 #include <unistd.h>
 
 #include "Batch.h"
+#include "CheckOutput.h"
 #include "CliFiles.h"
 #include "Clock.h"
 #include "ColourSource.h"
 #include "Composer.h"
 #include "ConsoleDialogs.h"
+#include "DryRunDiff.h"
 #include "EditCommandLine.h"
 #include "FieldsJson.h"
 #include "FileSave.h"
@@ -25,10 +27,10 @@
 #include "PartFile.h"
 #include "PartFileList.h"
 #include "QmError.h"
+#include "SarifLog.h"
 #include "Summary.h"
 #include "Text.h"
 #include "TrackerCheck.h"
-#include "UnifiedDiff.h"
 
 namespace {
 
@@ -48,53 +50,7 @@ std::unique_ptr<ColourSource> colourSource(const std::string& ldconfig, std::ost
     }
 }
 
-// "line 12: " before a finding about one line.
-std::string linePrefix(const TrackerFinding& finding)
-{
-    return finding.line > 0 ? "line " + std::to_string(finding.line) + ": " : "";
-}
-
 std::string firstLine(const std::string& text) { return text.substr(0, text.find('\r')); }
-
-nlohmann::ordered_json checkJson(const HeaderData& header, const SaveFindings& findings, const TrackerFindings* tracker)
-{
-    nlohmann::ordered_json json;
-    json["FilePath"] = TextForJson(header.FilePath);
-    json["refusals"] = findings.refusals;
-    json["missing_username"] = findings.missingUserName;
-    json["fixups"] = {{"certify_invertnext", findings.fixups.certifyInvertNext},
-                      {"rotation", findings.fixups.rotation},
-                      {"write", findings.fixups.write},
-                      {"color", findings.fixups.color}};
-    if (tracker != nullptr) {
-        json["tracker"] = nlohmann::ordered_json::array();
-        for (const auto& finding : *tracker) {
-            auto& entry = json["tracker"].emplace_back(nlohmann::ordered_json{
-                {"id", finding.id}, {"level", LevelText(finding.level)}, {"text", finding.text}});
-            if (finding.line > 0)
-                entry["line"] = finding.line;
-        }
-    }
-    return json;
-}
-
-std::string findingLines(const std::string& filePath, const SaveFindings& findings, const TrackerFindings* tracker)
-{
-    const auto path = ShownText(filePath);
-    std::string lines;
-    for (const auto& refusal : findings.refusals)
-        lines += path + ": refused: " + firstLine(refusal) + '\n';
-    if (findings.missingUserName)
-        lines += path + ": missing user name\n";
-    for (const auto& [offered, what] : FixUpNames(findings.fixups))
-        if (offered)
-            lines += path + ": fix-up offered: " + what + '\n';
-    if (tracker != nullptr)
-        for (const auto& finding : *tracker)
-            lines += path + ": tracker " + LevelText(finding.level) + " " + finding.id + ": " + linePrefix(finding) +
-                     finding.text + '\n';
-    return lines.empty() ? path + ": ok\n" : lines;
-}
 
 void noteFindings(FileReport& report, const SaveFindings& findings)
 {
@@ -158,11 +114,15 @@ FileReport reportOn(const PartFileEntry& entry, bool quiet, ConsoleDialogs::Answ
         report.status = ExitStatus::Unreadable;
     };
     try {
-        const auto part = OpenEntry(entry);
+        auto part = OpenEntry(entry);
         const auto held = memory.claim(static_cast<std::size_t>(part->status().st_size));
         std::unique_lock<std::mutex> turn;
-        if (writing != nullptr)
+        if (writing != nullptr) {
             turn = std::unique_lock(writing->locks.of(*part));
+            // Another name of the file was saved meanwhile: this one reads what that save wrote.
+            if (!part->stillNamed())
+                part = OpenEntry(entry);
+        }
         auto opened = ReadForCli(part, entry.path, dialogs, err, writing ? &writing->run : nullptr, report.status);
         if (opened)
             handle(*opened, dialogs, report);
@@ -175,7 +135,7 @@ FileReport reportOn(const PartFileEntry& entry, bool quiet, ConsoleDialogs::Answ
     } catch (const std::exception& failure) {
         unreadable(failure);
     }
-    report.err = err.str();
+    report.err.insert(0, err.str());
     return report;
 }
 
@@ -263,32 +223,38 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
         (!ReadStandardList(ListKind::Category, categories, err) || !(colours = colourSource(options.ldconfig, err))))
         return ExitStatus::Unreadable;
     MemoryClaims memory;
-    // A check never writes, not even to undo what a killed save left: the next save does that.
-    return runBatch(arguments, batch, out, err, [&](const PartFileEntry& entry) {
+    // A SARIF log is one document: its results are gathered and written at the end.
+    const bool sarif = options.format == OutputFormat::Sarif;
+    std::ostringstream sarifResults;
+    const auto status = runBatch(arguments, batch, sarif ? sarifResults : out, err, [&](const PartFileEntry& entry) {
         const auto& path = entry.path;
-        return reportOn(entry, batch.quiet, {}, nullptr, memory,
-                        [&](const HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
-                            const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
-                            TrackerFindings tracker; // empty unless asked for
-                            if (options.tracker) {
-                                const auto& codes = colours->forPart(
-                                    path, [&dialogs](const std::string& text) { dialogs.message({text}); });
-                                tracker = CheckRecordForTracker(header, ComposeHeader(header), categories, codes);
-                            }
-                            const auto* trackerFindings = options.tracker ? &tracker : nullptr;
-                            report.out = options.json ? checkJson(header, findings, trackerFindings).dump() + '\n'
-                                                      : findingLines(header.FilePath, findings, trackerFindings);
-                            noteFindings(report, findings);
-                            bool trackerRefuses = false;
-                            for (const auto& finding : tracker) {
-                                report.trackerIds.push_back(finding.id);
-                                trackerRefuses = trackerRefuses || finding.level == FindingLevel::Error;
-                            }
-                            report.refused = trackerRefuses;
-                            report.status =
-                                findings.refusals.empty() && !trackerRefuses ? ExitStatus::Ok : ExitStatus::Refused;
-                        });
+        // A check never writes, not even to undo what a killed save left: the next save does that.
+        return reportOn(
+            entry, batch.quiet, {}, nullptr, memory,
+            [&](const HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
+                const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
+                const auto composed = ComposeHeader(header);
+                TrackerFindings tracker; // empty unless asked for
+                if (options.tracker) {
+                    const auto& codes =
+                        colours->forPart(path, [&dialogs](const std::string& text) { dialogs.message({text}); });
+                    tracker = CheckRecordForTracker(header, composed, categories, codes);
+                }
+                report.out =
+                    CheckOutput(options.format, header, composed, findings, options.tracker ? &tracker : nullptr);
+                noteFindings(report, findings);
+                bool trackerRefuses = false;
+                for (const auto& finding : tracker) {
+                    report.trackerIds.push_back(finding.id);
+                    trackerRefuses = trackerRefuses || finding.level == FindingLevel::Error;
+                }
+                report.refused = trackerRefuses;
+                report.status = findings.refusals.empty() && !trackerRefuses ? ExitStatus::Ok : ExitStatus::Refused;
+            });
     });
+    if (sarif)
+        WriteSarifLog(sarifResults.view(), out);
+    return status;
 }
 
 int RunSave(const std::vector<std::string>& arguments, const SaveOptions& options, const BatchOptions& batch,
@@ -323,23 +289,26 @@ int RunEdit(const std::vector<std::string>& arguments, const SaveOptions& option
         };
     const Writing writing{run, locks};
     MemoryClaims memory;
+    DiffedFiles diffed;
     // A dry run and a JSON listing write nothing.
     const bool writes = !edit.dryRun && !edit.json;
     return runBatch(arguments, batch, out, err, [&](const PartFileEntry& entry) {
         const auto& path = entry.path;
         return reportOn(entry, batch.quiet, answer, writes ? &writing : nullptr, memory,
                         [&](HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
+                            // A dry run prints a diff and only a diff on standard output.
+                            auto& said = edit.dryRun ? report.err : report.out;
                             if (const auto refusal = ApplyHeaderEdits(header, edit.edits, clock.now())) {
                                 report.saving = FileReport::Saving::Skipped;
                                 report.status = ExitStatus::Refused;
-                                report.out = "skipped " + ShownText(path) + ": " + *refusal + '\n';
+                                said = "skipped " + ShownText(path) + ": " + *refusal + '\n';
                                 return;
                             }
                             if (edit.json) {
                                 const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
-                                auto json = checkJson(header, findings, nullptr);
-                                json["old_header"] = TextForJson(header.OldHeader);
-                                json["new_header"] = TextForJson(ComposeHeader(header));
+                                auto json = CheckJson(header, findings, nullptr);
+                                json["old_header"] = HeaderTextForJson(header.OldHeader, header.Encoding);
+                                json["new_header"] = HeaderTextForJson(ComposeHeader(header), header.Encoding);
                                 report.out = json.dump() + '\n';
                                 noteFindings(report, findings);
                                 report.status = findings.refusals.empty() ? ExitStatus::Ok : ExitStatus::Refused;
@@ -359,11 +328,13 @@ int RunEdit(const std::vector<std::string>& arguments, const SaveOptions& option
                                                       .dryRun = edit.dryRun,
                                                       .run = run};
                             const auto result = CheckHeaderAndSave(header, context);
-                            report.out = savedLine(header.FilePath, options, result, dialogs, report);
+                            const auto line = savedLine(header.FilePath, options, result, dialogs, report);
                             if (edit.dryRun &&
                                 (result.outcome == SaveOutcome::NotWritten || result.outcome == SaveOutcome::Unchanged))
-                                report.out = UnifiedDiff(FileBytes(*header.Part).view(),
-                                                         SavedText(header, ComposeHeader(header)), path);
+                                report.out = DryRunDiff(path, FileBytes(*header.Part).view(),
+                                                        SavedText(header, ComposeHeader(header)), diffed, report.err);
+                            else
+                                said = line;
                         });
     });
 }

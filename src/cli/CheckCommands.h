@@ -5,6 +5,7 @@
 #include <string>
 #include <vector>
 
+#include "FindingLines.h"
 #include "HeaderEdits.h"
 
 // How check and save work through many files.
@@ -16,7 +17,7 @@ struct BatchOptions {
 };
 
 struct CheckOptions {
-    bool json = false;
+    OutputFormat format = OutputFormat::Text;
     bool tracker = false; // the Parts Tracker's rules too
     std::string ldconfig; // the LDConfig.ldr for the Tracker's colour codes; empty: search above each file
 };

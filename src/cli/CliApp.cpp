@@ -2,15 +2,37 @@
 #include "CliApp.h"
 
 #include <CLI/CLI.hpp>
+#include <filesystem>
+#include <map>
+#include <unistd.h>
 
 #include "Batch.h"
 #include "CheckCommands.h"
 #include "CliFiles.h"
+#include "ClosestWord.h"
 #include "ConsoleDialogs.h"
 #include "EditCommandLine.h"
 #include "PrintCommands.h"
 
 namespace {
+
+constexpr const char* ReadExitStatuses =
+    "Exit status:\n  0  every file was read\n  2  a file cannot be read, or the command line is wrong\n";
+constexpr const char* SaveExitStatuses =
+    "Exit status:\n  0  every file was saved or left as it was\n  1  a file was skipped: refused, or without user "
+    "name\n  2  a file or folder cannot be read, or the command line or one of its values is wrong\n  3  a save "
+    "failed, or the run was interrupted\n";
+
+// A file named on the command line is read before any part file: one that cannot be is a mistake
+// of the command line.
+const CLI::Validator ReadableFile(
+    [](const std::string& path) {
+        std::error_code error;
+        if (!std::filesystem::is_regular_file(path, error) || ::access(path.c_str(), R_OK) != 0)
+            return "cannot read " + ShownText(path);
+        return std::string();
+    },
+    "FILE");
 
 // The commands, their options and what the options fill.
 class CommandLine {
@@ -28,6 +50,8 @@ public:
 
     int run(int argc, const char* const* argv, std::ostream& out, std::ostream& err)
     {
+        if (argc > 1 && !knownCommand(argv[1], err))
+            return ExitStatus::Usage;
         try {
             app_.parse(argc, argv);
         } catch (const CLI::ParseError& error) {
@@ -48,15 +72,35 @@ public:
     }
 
 private:
+    // A word where the command belongs must name one: a typo gets a hint, not a list of options.
+    bool knownCommand(std::string_view word, std::ostream& err) const
+    {
+        if (word.starts_with('-'))
+            return true;
+        std::vector<std::string> names;
+        for (const auto* command : app_.get_subcommands({}))
+            names.push_back(command->get_name());
+        if (std::find(names.begin(), names.end(), word) != names.end())
+            return true;
+        err << "quillmark-cli: unknown command '" << ShownText(word) << "'";
+        if (const auto closest = ClosestWord(word, names); !closest.empty())
+            err << "; did you mean '" << closest << "'?";
+        err << "\nRun quillmark-cli --help for the commands.\n";
+        return false;
+    }
+
     void addReadCommands()
     {
         fields_ = app_.add_subcommand(
-            "fields", "Print, per FILE, one JSON line with the header record after opening it (texts as ISO-8859-1; "
-                      "the two paths as UTF-8 when their bytes are valid UTF-8, else as ISO-8859-1 too).");
+            "fields", "Print, per FILE, one JSON line with the header record after opening it: the texts of a file "
+                      "whose bytes are valid UTF-8 as UTF-8, of any other file each byte as the ISO-8859-1 character "
+                      "of that code; the two paths likewise, each by its own bytes.");
+        fields_->footer(ReadExitStatuses);
         fields_->add_option("FILE", files_, "Part files to read")->required();
         auto* print = app_.add_subcommand(
             "print", "Write to standard output exactly the bytes that saving FILE right after opening it would write.");
         print->add_option("FILE", printFile_, "Part file to read")->required();
+        print->footer(ReadExitStatuses);
     }
 
     void addBatchOptions(CLI::App* command)
@@ -75,17 +119,35 @@ private:
         check_ = app_.add_subcommand(
             "check", "Run every save check on each FILE, or each part file (*.dat) below a FOLDER, without writing: "
                      "refusals, a missing user name, and the fix-ups a save would offer; then a summary on standard "
-                     "error. Exit status 1 when any file would be refused, 2 when one cannot be read.");
-        check_->add_flag("--json", checkOptions_.json,
-                         "One JSON object per file and line. A path is given as UTF-8 when its bytes are valid UTF-8, "
-                         "otherwise each byte as the ISO-8859-1 character of that code");
+                     "error.");
+        check_->footer("Exit status:\n  0  no file would be refused\n  1  a file would be refused, by a save check or "
+                       "an error of the Parts Tracker's rules\n  2  a file or folder cannot be read, or the command "
+                       "line is wrong\n");
+        const std::map<std::string, OutputFormat> formats{{"text", OutputFormat::Text},
+                                                          {"json", OutputFormat::Json},
+                                                          {"sarif", OutputFormat::Sarif},
+                                                          {"github", OutputFormat::Github}};
+        auto* format =
+            check_
+                ->add_option("--format", checkOptions_.format,
+                             "text: \"path:line: level id: message\" per finding, as compilers write them; json: one "
+                             "object per file and line; sarif: one SARIF 2.1.0 log for code scanning; github: GitHub "
+                             "Actions annotations")
+                ->transform(CLI::CheckedTransformer(formats, CLI::ignore_case))
+                ->option_text("text|json|sarif|github");
+        check_
+            ->add_flag_callback(
+                "--json", [this] { checkOptions_.format = OutputFormat::Json; }, "The same as --format json")
+            ->excludes(format);
         check_->add_flag("--tracker", checkOptions_.tracker,
                          "Check the Parts Tracker's header and line rules too (an error there refuses the file). "
                          "Rules that need the Tracker's database (registered authors, duplicates, held subfiles) are "
                          "not checked.");
-        check_->add_option("--ldconfig", checkOptions_.ldconfig,
-                           "The LDConfig.ldr whose colour codes --tracker accepts (default: the first LDConfig.ldr in "
-                           "the file's folder or above it, else the built-in list)");
+        check_
+            ->add_option("--ldconfig", checkOptions_.ldconfig,
+                         "The LDConfig.ldr whose colour codes --tracker accepts (default: the first LDConfig.ldr in "
+                         "the file's folder or above it, else the built-in list)")
+            ->check(ReadableFile);
         addBatchOptions(check_);
         check_->add_option("FILE", files_, "Part files or folders to check")->required();
     }
@@ -105,12 +167,14 @@ private:
         save_ = app_.add_subcommand(
             "save", "Re-save each FILE, or each part file below a FOLDER, as the editor's Save does: checked, "
                     "optionally fixed, with a dated backup; a file that would stay byte for byte as it is is not "
-                    "written. Exit status 1 when a file was skipped, 2 when one cannot be read, 3 when a save failed.");
+                    "written.");
+        save_->footer(SaveExitStatuses);
         addSaveOptions(save_);
         edit_ = app_.add_subcommand(
             "edit", "Change the headers of each FILE, or each part file below a FOLDER, and save them as save does. "
                     "Values are the header's own texts; those from a standard list are checked before any file is "
-                    "read. Exit statuses as for save, and 2 for a value refused up front.");
+                    "read.");
+        edit_->footer(SaveExitStatuses);
         AddEditOptions(*edit_, editOptions_, noCategory_);
         addSaveOptions(edit_);
     }

@@ -5,6 +5,7 @@
 
 #include "CliFiles.h"
 #include "ConsoleDialogs.h"
+#include "EditValues.h"
 #include "IniSettingsStore.h"
 #include "Preferences.h"
 
@@ -48,10 +49,11 @@ void AddEditOptions(CLI::App& command, EditOptions& edit, bool& noCategory)
     addText(command, "--description", e.description, "The description");
     addText(command, "--author", e.author, "\"Real Name [user]\"; either part alone changes that part only");
     addText(command, "--type", e.type, "The part type, an entry of the part type list");
-    addText(command, "--update", e.update, "The update tag, YYYY-RR");
+    addText(command, "--update", e.update, "The update tag, YYYY-RR (year and release)");
     addText(command, "--license", e.license,
-            "The licence, an entry of the licence list; \"current\": CC BY 4.0 for a file with a history line "
-            "dated 2023-03-05 or later (one this command adds included), else CC BY 2.0 and CC BY 4.0; CC0 stays");
+            "The licence, an entry of the licence list; \"current\": a file under the CC BY 4.0 or the CC0 text "
+            "keeps it; any other gets CC BY 4.0 when its first history line is dated 2023-03-05 or later, else "
+            "CC BY 2.0 and CC BY 4.0");
     addText(command, "--bfc", e.bfc, "The BFC statement, an entry of the BFC list; CW and CCW are never swapped");
     auto* category = command.add_option_function<std::string>(
         "--category", [&e](const std::string& value) { e.category = value; }, "The category, an entry of its list");
@@ -63,10 +65,11 @@ void AddEditOptions(CLI::App& command, EditOptions& edit, bool& noCategory)
     command.add_flag("--name-from-path", e.nameFromPath,
                      "Name: becomes the file's name, after the folder its type wants (s\\, 8\\, 48\\, helpers\\)");
     command.add_flag("--dry-run", edit.dryRun,
-                     "Write nothing; print, per file that would change, a unified diff that patch -p1 applies");
+                     "Write nothing; print on standard output only the unified diff of each file that would change, "
+                     "which patch -p1 run in the current folder applies; messages go to standard error");
     command.add_flag("--json", edit.json,
                      "Write nothing; print per file one JSON object with its path, old and new header and what the "
-                     "save checks say (texts as UTF-8 when their bytes are valid UTF-8, else as ISO-8859-1)");
+                     "save checks say (the texts of a file that is valid UTF-8 as UTF-8, of any other as ISO-8859-1)");
 }
 
 std::string HistoryUser(const std::string& given)
@@ -80,21 +83,15 @@ std::string HistoryUser(const std::string& given)
 
 bool EditsValid(const HeaderEdits& edits, std::ostream& err)
 {
-    const bool listed = inList(edits.type, ListKind::PartType, "--type", err) &&
-                        inList(edits.license, ListKind::License, "--license", err, {CurrentLicense}) &&
-                        inList(edits.bfc, ListKind::Bfc, "--bfc", err) &&
-                        inList(edits.category, ListKind::Category, "--category", err, {""});
-    if (!listed)
-        return false;
-    const auto& tag = edits.update;
-    if (tag && !(tag->size() == 7 && (*tag)[4] == '-' &&
-                 std::all_of(tag->begin(), tag->end(), [](char c) { return c == '-' || (c >= '0' && c <= '9'); }))) {
-        err << "quillmark-cli: --update " << ShownText(*tag) << " is not YYYY-RR\n";
-        return false;
-    }
     if (edits.addHistory && edits.historyUser.empty()) {
         err << "quillmark-cli: --add-history needs a user: --as USER, or a user name in the preferences\n";
         return false;
     }
-    return true;
+    if (!EditValuesValid(edits, err))
+        return false;
+    const bool listed = inList(edits.type, ListKind::PartType, "--type", err) &&
+                        inList(edits.license, ListKind::License, "--license", err, {CurrentLicense}) &&
+                        inList(edits.bfc, ListKind::Bfc, "--bfc", err) &&
+                        inList(edits.category, ListKind::Category, "--category", err, {""});
+    return listed;
 }

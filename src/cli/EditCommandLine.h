@@ -11,6 +11,6 @@ void AddEditOptions(CLI::App& command, EditOptions& edit, bool& noCategory);
 // The user an added history line names: the one given with --as, else the preferences' user name.
 std::string HistoryUser(const std::string& given);
 
-// The edits that can be checked before any file is touched: values from a standard list, the
-// update tag's form, a user for an added history line. Says on err what is wrong.
+// The edits that can be checked before any file is touched: a user for an added history line,
+// the values' forms (see EditValuesValid), values from a standard list. Says on err what is wrong.
 bool EditsValid(const HeaderEdits& edits, std::ostream& err);

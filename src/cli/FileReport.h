@@ -3,7 +3,6 @@
 
 #include <array>
 #include <string>
-#include <utility>
 #include <vector>
 
 #include "SaveChecks.h"
@@ -22,11 +21,17 @@ struct FileReport {
     enum class Saving { NotAsked, Saved, Previewed, Unchanged, Skipped, Failed } saving = Saving::NotAsked;
 };
 
-// Each fix-up with the words the output uses for it.
-inline std::array<std::pair<bool, const char*>, 4> FixUpNames(const FixUpOffers& f)
+struct FixUpName {
+    bool offered;
+    const char* what; // the words the output uses for it
+    const char* id;   // its name in reports
+};
+
+// Each fix-up, whether it is offered.
+inline std::array<FixUpName, 4> FixUpNames(const FixUpOffers& f)
 {
-    return {{{f.certifyInvertNext, "0 BFC CERTIFY INVERTNEXT in the body"},
-             {f.rotation, "0 ROTATION lines in the body"},
-             {f.write, "0 WRITE lines in the body"},
-             {f.color, "COLOR lines in the header"}}};
+    return {{{f.certifyInvertNext, "0 BFC CERTIFY INVERTNEXT in the body", "save.fixup.certify-invertnext"},
+             {f.rotation, "0 ROTATION lines in the body", "save.fixup.rotation"},
+             {f.write, "0 WRITE lines in the body", "save.fixup.write"},
+             {f.color, "COLOR lines in the header", "save.fixup.color"}}};
 }

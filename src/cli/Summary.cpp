@@ -19,7 +19,7 @@ void Summary::add(const FileReport& report)
     for (const auto& reason : report.refusals)
         ++reasons_[reason];
     missingUserName_ += report.missingUserName ? 1 : 0;
-    for (const auto& [offered, what] : FixUpNames(report.fixups))
+    for (const auto& [offered, what, id] : FixUpNames(report.fixups))
         if (offered)
             ++fixups_[what];
     for (const auto& id : report.trackerIds)
@@ -32,22 +32,32 @@ void Summary::add(const FileReport& report)
     failed_ += report.saving == FileReport::Saving::Failed ? 1 : 0;
 }
 
+namespace {
+
+// "1 file", "2 files".
+std::string counted(std::size_t count, const char* one, const char* many)
+{
+    return std::to_string(count) + ' ' + (count == 1 ? one : many);
+}
+
+} // namespace
+
 void Summary::print(std::ostream& err) const
 {
-    err << files_ << " files, " << refused_ << " refused, " << missingUserName_ << " without user name, " << unreadable_
-        << " unreadable";
+    err << counted(files_, "file", "files") << ", " << refused_ << " refused, " << missingUserName_
+        << " without user name, " << unreadable_ << " unreadable";
     if (backupsSkipped_ > 0)
-        err << ", " << backupsSkipped_ << " backups skipped";
+        err << ", " << counted(backupsSkipped_, "backup", "backups") << " skipped";
     if (linksSkipped_ > 0)
-        err << ", " << linksSkipped_ << " links skipped";
+        err << ", " << counted(linksSkipped_, "link", "links") << " skipped";
     if (saving_)
         err << "; " << saved_ << " saved, " << (previewed_ > 0 ? std::to_string(previewed_) + " would be saved, " : "")
             << unchanged_ << " unchanged, " << skipped_ << " skipped, " << failed_ << " failed";
     err << '\n';
     for (const auto& [reason, count] : reasons_)
-        err << "  refused: " << reason << ": " << count << '\n';
+        err << "  refused (" << count << "): " << reason << '\n';
     for (const auto& [what, count] : fixups_)
-        err << "  fix-up offered: " << what << ": " << count << '\n';
+        err << "  fix-up offered (" << count << "): " << what << '\n';
     for (const auto& [id, count] : trackerIds_)
-        err << "  tracker " << id << ": " << count << '\n';
+        err << "  tracker " << id << " (" << count << ")\n";
 }

@@ -119,7 +119,7 @@ void addLine(std::string& out, char sign, std::string_view line)
 
 } // namespace
 
-std::string UnifiedDiff(std::string_view before, std::string_view after, const std::string& path)
+std::string UnifiedDiff(std::string_view before, std::string_view after, const std::string& from, const std::string& to)
 {
     const auto a = linesOf(before), b = linesOf(after);
     const auto script = editScript(a, b);
@@ -157,5 +157,5 @@ std::string UnifiedDiff(std::string_view before, std::string_view after, const s
         }
         out += "@@ -" + range(startX, fromA) + " +" + range(startY, fromB) + " @@\n" + body;
     }
-    return out.empty() ? out : "--- a/" + path + "\n+++ b/" + path + "\n" + out;
+    return out.empty() ? out : "--- " + from + "\n+++ " + to + "\n" + out;
 }

@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "EntryList.h"
+#include "FileLines.h"
 #include "FileStamp.h"
 #include "OpenPart.h"
 
@@ -41,6 +42,8 @@ struct HeaderData {
     EntryList ColorLines;
     std::string OldHeader;
     std::string Body;
+    // Where the lines of OldHeader and of Body stand in the file as it was read.
+    FileLines OldHeaderLines, BodyLines;
     TextEncoding Encoding = TextEncoding::Utf8;
     // The file began with a UTF-8 byte order mark: not part of the header, and written back.
     bool ByteOrderMark = false;

@@ -45,14 +45,15 @@ bool datedSince(std::string_view entry, std::string_view day)
     return date && *date >= day;
 }
 
-std::string currentLicense(const HeaderData& h, const HeaderEdits& edits, const std::string& today)
+// A file under one of the library's current texts keeps it: CC BY 4.0 alone is never widened to
+// CC BY 2.0 as well. Any other file was first published under CC BY 4.0 alone when its first
+// history line dates from the contributor agreement on, otherwise under CC BY 2.0 as well.
+std::string currentLicense(const HeaderData& h)
 {
-    if (h.License == Cc0License)
+    if (h.License == Cc0License || h.License == CcBy4License)
         return h.License;
-    const bool editedSince =
-        std::any_of(h.History.begin(), h.History.end(), [](const auto& e) { return datedSince(e, CcBy4Since); }) ||
-        (edits.addHistory && today >= CcBy4Since);
-    return std::string(editedSince ? CcBy4License : CcBy2And4License);
+    const bool bornUnderCcBy4 = !h.History.empty() && datedSince(h.History[0], CcBy4Since);
+    return std::string(bornUnderCcBy4 ? CcBy4License : CcBy2And4License);
 }
 
 void addKeywords(HeaderData& h, const StringList& keywords)
@@ -142,7 +143,7 @@ std::optional<std::string> ApplyHeaderEdits(HeaderData& h, const HeaderEdits& ed
     h.PartType = edits.type.value_or(h.PartType);
     h.UpdateTag = edits.update.value_or(h.UpdateTag);
     if (edits.license)
-        h.License = *edits.license == CurrentLicense ? currentLicense(h, edits, day) : *edits.license;
+        h.License = *edits.license == CurrentLicense ? currentLicense(h) : *edits.license;
     h.Bfc = edits.bfc.value_or(h.Bfc);
     h.Category = edits.category.value_or(h.Category);
     addKeywords(h, edits.addKeywords);

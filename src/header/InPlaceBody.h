@@ -37,6 +37,7 @@ public:
     // moved, a piece at a time that stays in the cache for the line reader.
     bool utf8() const { return checkedUpTo_ != NotUtf8; }
     std::size_t remainingBytes() const { return reader_.remainingBytes(); }
+    bool bodyEmpty() const { return written_ == 0 && runEnd_ == NoRun; }
 
     // Adds the line that nextLine returned last, trimmed, to the body. Most lines just lengthen
     // the run before them.
@@ -59,7 +60,6 @@ public:
 
 private:
     std::size_t offsetOf(std::string_view line) const { return static_cast<std::size_t>(line.data() - text_.data()); }
-    bool bodyEmpty() const { return written_ == 0 && runEnd_ == NoRun; }
     // A line joins a run when it needs no trimming; an empty line only after text, since an empty
     // line adds nothing to an empty body.
     bool mayJoinRun(std::string_view line) const

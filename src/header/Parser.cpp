@@ -79,11 +79,16 @@ public:
     bool headerEnded() const { return headerEnded_; }
 
 private:
-    void toBody(std::string_view line) { body_.keep(line); }
+    void toBody(std::string_view line)
+    {
+        h_.BodyLines.add(lineNumber_);
+        body_.keep(line);
+    }
+    // The rest of the body, from this line on, is numbered where the parse goes on.
     void endHeader(std::string_view line)
     {
         headerEnded_ = true;
-        toBody(line);
+        body_.keep(line);
     }
     std::string_view word(std::size_t position) const { return words_.word(position); }
     std::size_t wordCount() const { return words_.count(); }
@@ -120,6 +125,7 @@ private:
     HeaderData& h_;
     InPlaceBody& body_;
     bool headerEnded_ = false;
+    std::size_t lineNumber_ = 0;
     Words words_;
 };
 
@@ -127,6 +133,7 @@ void HeaderParser::classify(std::string_view line, std::size_t lineNumber)
 {
     if (line.empty())
         return;
+    lineNumber_ = lineNumber;
     words_ = Words(line);
     if (word(1) != "0") {
         endHeader(line);
@@ -134,6 +141,7 @@ void HeaderParser::classify(std::string_view line, std::size_t lineNumber)
     }
     makeRoom(h_.OldHeader, line.size() + CrLf.size(), body_.remainingBytes());
     appendLine(h_.OldHeader, line);
+    h_.OldHeaderLines.add(lineNumber);
     if (lineNumber == 1) {
         takeDescription(line);
         return;
@@ -265,6 +273,8 @@ void clearParsedContent(HeaderData& header)
 {
     header.OldHeader.clear();
     header.Body.clear();
+    header.OldHeaderLines.clear();
+    header.BodyLines.clear();
     header.HelpLines.clear();
     header.CmdLines.clear();
     header.Keywords.clear();
@@ -317,8 +327,19 @@ void ParseHeaderText(HeaderData& header, std::string text, ParseProgress& progre
             const auto line = nextLine();
             parser.classify(line, linesRead);
         }
+        // The rest of the body follows the file line for line from its first line on: the line
+        // that ended the header, or the first after it that the body keeps.
+        bool restNumbered = false;
+        const auto numberRest = [&] {
+            if (!restNumbered && parser.headerEnded() && !lines.bodyEmpty()) {
+                header.BodyLines.add(linesRead);
+                restNumbered = true;
+            }
+        };
+        numberRest();
         while (!lines.atEnd()) {
             lines.keep(nextLine());
+            numberRest();
             linesRead += lines.keepPlainLines();
         }
     } catch (...) {

@@ -17,6 +17,7 @@ bool missingUserName(const HeaderData& h) { return h.AuthorUserName.empty(); }
 // One step of the save's checks: a rule that stops the save with its sentence, or the question
 // whether to save without a user name.
 struct Check {
+    const char* id;       // the check's name in reports, "save." and a few words
     const char* sentence; // nullptr for the user-name question
     bool (*fails)(const HeaderData&);
     SaveOutcome outcome = SaveOutcome::Refused;
@@ -24,13 +25,16 @@ struct Check {
 
 // The checks in the one order in which a save makes them and a check lists them.
 const Check Checks[] = {
-    {"Length of the part description is limited to 64 character!", descriptionTooLong, SaveOutcome::DescriptionTooLong},
-    {"You need to mention the Author!", [](const HeaderData& h) { return h.AuthorRealName.empty(); }},
-    {nullptr, missingUserName},
-    {"You need to set the BFC type!", [](const HeaderData& h) { return h.Bfc.empty(); }},
-    {"You need to set the Liscense type!", [](const HeaderData& h) { return h.License.empty(); }},
-    {"You need to set the Part type!", [](const HeaderData& h) { return h.PartType.empty(); }},
-    {"Parts with 'needs work' in title needs a proper comment!",
+    {SaveCheckIds::DescriptionLength, "Length of the part description is limited to 64 character!", descriptionTooLong,
+     SaveOutcome::DescriptionTooLong},
+    {SaveCheckIds::Author, "You need to mention the Author!",
+     [](const HeaderData& h) { return h.AuthorRealName.empty(); }},
+    {SaveCheckIds::UserName, nullptr, missingUserName},
+    {SaveCheckIds::Bfc, "You need to set the BFC type!", [](const HeaderData& h) { return h.Bfc.empty(); }},
+    {SaveCheckIds::License, "You need to set the Liscense type!",
+     [](const HeaderData& h) { return h.License.empty(); }},
+    {SaveCheckIds::PartType, "You need to set the Part type!", [](const HeaderData& h) { return h.PartType.empty(); }},
+    {SaveCheckIds::NeedsWork, "Parts with 'needs work' in title needs a proper comment!",
      [](const HeaderData& h) { return h.NeedsWork && h.Comments.empty(); }},
 };
 
@@ -73,8 +77,10 @@ SaveFindings EvaluateSaveChecks(const HeaderData& h, bool limitDescription)
             continue;
         if (check.sentence == nullptr)
             findings.missingUserName = true;
-        else
+        else {
             findings.refusals.push_back(RefusalText(check.sentence));
+            findings.refusalIds.emplace_back(check.id);
+        }
     }
     findings.fixups = {HasCertifyInvertNext(h.Body), HasRotationLines(h.Body), HasWriteLines(h.Body), HasColorLines(h)};
     return findings;

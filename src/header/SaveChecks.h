@@ -25,9 +25,21 @@ struct FixUpOffers {
     bool certifyInvertNext = false, rotation = false, write = false, color = false;
 };
 
+// The names under which reports list the save checks, stable from one version to the next.
+namespace SaveCheckIds {
+inline constexpr const char* DescriptionLength = "save.description-length";
+inline constexpr const char* Author = "save.author";
+inline constexpr const char* UserName = "save.username";
+inline constexpr const char* Bfc = "save.bfc";
+inline constexpr const char* License = "save.license";
+inline constexpr const char* PartType = "save.type";
+inline constexpr const char* NeedsWork = "save.needs-work-comment";
+} // namespace SaveCheckIds
+
 // Every check at once, for tools that list what a save would say.
 struct SaveFindings {
-    std::vector<std::string> refusals; // the stop texts, in the order the save checks them
+    std::vector<std::string> refusals;   // the stop texts, in the order the save checks them
+    std::vector<std::string> refusalIds; // the check of each stop text
     bool missingUserName = false;
     FixUpOffers fixups;
 };

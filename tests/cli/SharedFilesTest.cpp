@@ -17,7 +17,7 @@
 #include <unistd.h>
 
 #include "CliFiles.h"
-#include "CliRuns.h"
+#include "CliRun.h"
 #include "Composer.h"
 #include "ConsoleDialogs.h"
 #include "FileSave.h"

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 // The header edits that quillmark-cli edit makes on many files at once.
 #include <gtest/gtest.h>
+#include <tuple>
 
 #include "HeaderEdits.h"
 
@@ -57,25 +58,31 @@ TEST(HeaderEdits, EachSetFieldChangesTheRecordAndNothingElse)
     EXPECT_EQ(h.AuthorRealName + "|" + h.AuthorUserName, "Jo Tester|jtester");
 }
 
-TEST(HeaderEdits, CurrentLicenceByTheNewestHistoryDateAndCc0Kept)
+// A licence is never widened: only a file under neither current text gets one, by the date of
+// its first history line.
+TEST(HeaderEdits, CurrentLicenceKeepsTheCurrentTextsAndDatesTheOthersByTheFirstHistoryLine)
 {
+    const std::string other(partRecord().License);
     HeaderEdits edits;
     edits.license = std::string(CurrentLicense);
-    for (const auto& [history, wanted] :
-         {std::pair{"2023-03-04 [a] x", CcBy2And4License}, std::pair{"2023-03-05 [a] x", CcBy4License},
-          std::pair{"05-03-2023 [a] x", CcBy2And4License}}) {
+    edits.addHistory = "Header edits"; // dated today, and never the first line that counts
+    edits.historyUser = "jtester";
+    const EntryList none, before{"2023-03-04 [a] x", "2024-01-01 [b] y"}, since{"2023-03-05 [a] x"},
+        undated{"05-03-2023 [a] x"};
+    for (const auto& [license, history, wanted] : {std::tuple{std::string(CcBy4License), none, CcBy4License},
+                                                   {std::string(CcBy4License), before, CcBy4License},
+                                                   {std::string(Cc0License), none, Cc0License},
+                                                   {std::string(Cc0License), before, Cc0License},
+                                                   {other, none, CcBy2And4License},
+                                                   {other, before, CcBy2And4License},
+                                                   {other, undated, CcBy2And4License},
+                                                   {other, since, CcBy4License}}) {
         auto h = partRecord();
-        h.History.push_back(history);
+        h.License = license;
+        h.History = history;
         ApplyHeaderEdits(h, edits, Today);
-        EXPECT_EQ(h.License, wanted) << history;
+        EXPECT_EQ(h.License, wanted) << license << " with " << history.size() << " history lines";
     }
-    auto h = partRecord();
-    edits.addHistory = "Header edits";
-    ApplyHeaderEdits(h, edits, Today);
-    EXPECT_EQ(h.License, CcBy4License) << "the history line the same edit adds";
-    h.License = Cc0License;
-    ApplyHeaderEdits(h, edits, Today);
-    EXPECT_EQ(h.License, Cc0License);
 }
 
 TEST(HeaderEdits, NameFromPathWithTheFolderOfTheType)

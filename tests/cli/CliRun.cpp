@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
-#include "CliRuns.h"
+#include "CliRun.h"
 
+#include <algorithm>
 #include <sstream>
 #include <sys/wait.h>
 #include <unistd.h>
@@ -18,7 +19,12 @@ CliRun RunCliWith(std::vector<std::string> args)
     return {status, out.str(), err.str()};
 }
 
-std::string ReadAllFrom(int from)
+std::size_t lineCount(const std::string& text)
+{
+    return static_cast<std::size_t>(std::count(text.begin(), text.end(), '\n'));
+}
+
+std::string readAll(int from)
 {
     std::string text;
     char buffer[4096];
@@ -48,7 +54,7 @@ CliRun RunCliInChild(const std::vector<std::string>& args, const std::function<v
     }
     ::close(out[1]);
     ::close(err[1]);
-    CliRun run{-1, ReadAllFrom(out[0]), ReadAllFrom(err[0])};
+    CliRun run{-1, readAll(out[0]), readAll(err[0])};
     ::waitpid(child, &run.status, 0);
     run.status = WIFEXITED(run.status) ? WEXITSTATUS(run.status) : -1;
     return run;

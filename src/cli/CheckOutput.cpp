@@ -1,0 +1,48 @@
+// SPDX-License-Identifier: MIT
+#include "CheckOutput.h"
+
+#include "FieldsJson.h"
+#include "FileLinePlaces.h"
+#include "SarifLog.h"
+
+nlohmann::ordered_json CheckJson(const HeaderData& header, const SaveFindings& save,
+                                 const std::vector<FileFinding>* tracker)
+{
+    nlohmann::ordered_json json;
+    json["FilePath"] = TextForJson(header.FilePath);
+    json["refusals"] = save.refusals;
+    json["missing_username"] = save.missingUserName;
+    json["fixups"] = {{"certify_invertnext", save.fixups.certifyInvertNext},
+                      {"rotation", save.fixups.rotation},
+                      {"write", save.fixups.write},
+                      {"color", save.fixups.color}};
+    if (tracker != nullptr) {
+        json["tracker"] = nlohmann::ordered_json::array();
+        for (const auto& finding : *tracker) {
+            auto& entry = json["tracker"].emplace_back(nlohmann::ordered_json{
+                {"id", finding.id}, {"level", SeverityText(finding.severity)}, {"text", finding.message}});
+            if (finding.line > 0)
+                entry["line"] = finding.line;
+        }
+    }
+    return json;
+}
+
+std::string CheckOutput(OutputFormat format, const HeaderData& header, const std::string& composedHeader,
+                        const SaveFindings& save, const std::vector<TrackerFinding>* tracker)
+{
+    const FileLinePlaces places(header, composedHeader);
+    const auto trackerFindings =
+        tracker != nullptr ? TrackerFileFindings(*tracker, places) : std::vector<FileFinding>{};
+    if (format == OutputFormat::Json)
+        return CheckJson(header, save, tracker != nullptr ? &trackerFindings : nullptr).dump() + '\n';
+    auto findings = SaveCheckFindings(save, places);
+    findings.insert(findings.end(), trackerFindings.begin(), trackerFindings.end());
+    switch (format) {
+    case OutputFormat::Sarif: return SarifResultLines(header.FilePath, findings);
+    case OutputFormat::Github: return GithubFindingLines(header.FilePath, findings);
+    case OutputFormat::Text:
+    case OutputFormat::Json: break;
+    }
+    return TextFindingLines(header.FilePath, findings);
+}

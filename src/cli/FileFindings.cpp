@@ -1,0 +1,63 @@
+// SPDX-License-Identifier: MIT
+#include "FileFindings.h"
+
+#include "FileLinePlaces.h"
+#include "FileReport.h"
+
+namespace {
+
+// The header line each save check is about.
+const char* keywordOfSaveCheck(std::string_view id)
+{
+    if (id == SaveCheckIds::Author || id == SaveCheckIds::UserName)
+        return "Author:";
+    if (id == SaveCheckIds::Bfc)
+        return "BFC";
+    if (id == SaveCheckIds::License)
+        return "!LICENSE";
+    if (id == SaveCheckIds::PartType)
+        return "!LDRAW_ORG";
+    return ""; // the description's line
+}
+
+std::string firstLine(const std::string& text) { return text.substr(0, text.find('\r')); }
+
+Severity severityOf(FindingLevel level) { return level == FindingLevel::Error ? Severity::Error : Severity::Warning; }
+
+} // namespace
+
+const char* SeverityText(Severity severity)
+{
+    switch (severity) {
+    case Severity::Error: return "error";
+    case Severity::Warning: return "warning";
+    case Severity::Note: break;
+    }
+    return "note";
+}
+
+std::vector<FileFinding> SaveCheckFindings(const SaveFindings& save, const FileLinePlaces& places)
+{
+    std::vector<FileFinding> findings;
+    for (std::size_t k = 0; k < save.refusals.size(); ++k)
+        findings.push_back({save.refusalIds[k], Severity::Error, firstLine(save.refusals[k]),
+                            places.ofHeaderKeyword(keywordOfSaveCheck(save.refusalIds[k]))});
+    if (save.missingUserName)
+        findings.push_back({SaveCheckIds::UserName, Severity::Warning, "The author line names no user.",
+                            places.ofHeaderKeyword("Author:")});
+    for (const auto& [offered, what, id] : FixUpNames(save.fixups))
+        if (offered)
+            findings.push_back({id, Severity::Note, std::string("A save would offer a fix-up: ") + what + ".",
+                                std::string_view(id) == "save.fixup.color" ? places.ofHeaderKeyword("COLOR") : 0});
+    return findings;
+}
+
+std::vector<FileFinding> TrackerFileFindings(const std::vector<TrackerFinding>& tracker, const FileLinePlaces& places)
+{
+    std::vector<FileFinding> findings;
+    for (const auto& finding : tracker)
+        findings.push_back({finding.id, severityOf(finding.level), finding.text,
+                            finding.line > 0 ? places.ofCheckedLine(static_cast<std::size_t>(finding.line))
+                                             : places.ofTrackerRule(finding.id)});
+    return findings;
+}
