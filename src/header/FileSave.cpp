@@ -166,6 +166,7 @@ FileSaveResult FileSave(HeaderData& header, std::string newHeader, bool makeBack
         }
         header.ReadStamp = StampOfPath(target);
         header.HeaderAtOpenOrSave = std::move(newHeader);
+        header.BodyChanged = false;
         header.FileChanged = false;
         result.saved = true;
     } catch (const QmError& error) {
