@@ -125,8 +125,16 @@ FileReport reportOn(const std::string& path, bool quiet, ConsoleDialogs::Answere
             report.status = ExitStatus::Unreadable;
         }
     }
-    report.err = err.str();
+    report.err = err.str() + report.err;
     return report;
+}
+
+std::string noteLines(const std::string& path, const std::vector<std::string>& notes)
+{
+    std::string lines;
+    for (const auto& note : notes)
+        lines += ShownText(path) + ": " + note + '\n';
+    return lines;
 }
 
 std::string outputClosedText(int error)
@@ -284,11 +292,14 @@ int RunEdit(const std::vector<std::string>& arguments, const SaveOptions& option
                                 report.out = "skipped " + ShownText(path) + ": " + *refusal + '\n';
                                 return;
                             }
+                            const auto notes = edit.afterEdits ? edit.afterEdits(header) : std::vector<std::string>{};
                             if (edit.json) {
                                 const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
                                 auto json = checkJson(header, findings, nullptr);
                                 json["old_header"] = TextForJson(header.OldHeader);
                                 json["new_header"] = TextForJson(ComposeHeader(header));
+                                if (edit.afterEdits)
+                                    json["notes"] = notes;
                                 report.out = json.dump() + '\n';
                                 noteFindings(report, findings);
                                 report.status = findings.refusals.empty() ? ExitStatus::Ok : ExitStatus::Refused;
@@ -308,7 +319,9 @@ int RunEdit(const std::vector<std::string>& arguments, const SaveOptions& option
                                                       .dryRun = edit.dryRun,
                                                       .sweeps = &sweeps};
                             const auto result = CheckHeaderAndSave(header, context);
-                            report.out = savedLine(header.FilePath, options, result, dialogs, report);
+                            // A dry run's standard output is a patch and nothing else.
+                            (edit.dryRun ? report.err : report.out) += noteLines(path, notes);
+                            report.out += savedLine(header.FilePath, options, result, dialogs, report);
                             if (edit.dryRun &&
                                 (result.outcome == SaveOutcome::NotWritten || result.outcome == SaveOutcome::Unchanged))
                                 report.out =
