@@ -298,8 +298,11 @@ int RunEdit(const std::vector<std::string>& arguments, const SaveOptions& option
                                 auto json = checkJson(header, findings, nullptr);
                                 json["old_header"] = TextForJson(header.OldHeader);
                                 json["new_header"] = TextForJson(ComposeHeader(header));
-                                if (edit.afterEdits)
-                                    json["notes"] = notes;
+                                if (edit.afterEdits) {
+                                    auto& notesJson = json["notes"] = nlohmann::ordered_json::array();
+                                    for (const auto& note : notes)
+                                        notesJson.push_back(TextForJson(note));
+                                }
                                 report.out = json.dump() + '\n';
                                 noteFindings(report, findings);
                                 report.status = findings.refusals.empty() ? ExitStatus::Ok : ExitStatus::Refused;
