@@ -20,9 +20,10 @@ QString valueAfter(const QString& line, QLatin1StringView keyword)
 // A type line that does not read as a whole as a part type names none.
 void takeTypeLine(HeaderFacts& facts, const QString& value)
 {
-    const auto words = value.split(' ', Qt::SkipEmptyParts);
-    if (!IsPartTypeLine(QStringLiteral("0 !LDRAW_ORG ") + words.join(' ')))
+    const auto type = value.simplified(); // runs of blanks collapsed
+    if (!IsPartTypeLine("0 !LDRAW_ORG " + type))
         return;
+    const auto words = type.split(' ');
     facts.hasType = true;
     facts.type = words.at(0);
     if (words.size() > 1 && QStringList{"Alias", "Flexible_Section", "Physical_Colour"}.contains(words.at(1)))

@@ -19,6 +19,7 @@ TEST(TrackerRules, AMissingOrMalformedHeaderLineStopsEveryOtherRule)
     EXPECT_EQ(findings[0].level, FindingLevel::Error);
     EXPECT_EQ(idsOf(cleanPart("Brick", "3001.dat", "Mystery")), Ids{"missing"});
     EXPECT_EQ(idsOf(cleanPart("Brick", "3001.dat", "Part UPDATE 2004-3")), Ids{"missing"}) << "read as a whole";
+    EXPECT_EQ(idsOf(cleanPart("Brick", "3001.dat", "Part\t UPDATE 2004-03")), Ids{}) << "its blanks collapsed";
     auto commentFirst = cleanPart();
     commentFirst.replace(0, commentFirst.find("\r\n"), "0 // Brick  2 x  4");
     EXPECT_EQ(idsOf(commentFirst), Ids{"missing"}) << "line 1 is a header meta, not the description";
