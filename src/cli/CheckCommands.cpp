@@ -139,6 +139,14 @@ FileReport reportOn(const PartFileEntry& entry, bool quiet, ConsoleDialogs::Answ
     return report;
 }
 
+std::string noteLines(const std::string& path, const std::vector<std::string>& notes)
+{
+    std::string lines;
+    for (const auto& note : notes)
+        lines += ShownText(path) + ": " + note + '\n';
+    return lines;
+}
+
 std::string outputClosedText(int error)
 {
     const char* name = ::strerrorname_np(error);
@@ -304,11 +312,17 @@ int RunEdit(const std::vector<std::string>& arguments, const SaveOptions& option
                                 said = "skipped " + ShownText(path) + ": " + *refusal + '\n';
                                 return;
                             }
+                            const auto notes = edit.afterEdits ? edit.afterEdits(header) : std::vector<std::string>{};
                             if (edit.json) {
                                 const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
                                 auto json = CheckJson(header, findings, nullptr);
                                 json["old_header"] = HeaderTextForJson(header.OldHeader, header.Encoding);
                                 json["new_header"] = HeaderTextForJson(ComposeHeader(header), header.Encoding);
+                                if (edit.afterEdits) {
+                                    auto& notesJson = json["notes"] = nlohmann::ordered_json::array();
+                                    for (const auto& note : notes)
+                                        notesJson.push_back(HeaderTextForJson(note, header.Encoding));
+                                }
                                 report.out = json.dump() + '\n';
                                 noteFindings(report, findings);
                                 report.status = findings.refusals.empty() ? ExitStatus::Ok : ExitStatus::Refused;
@@ -329,12 +343,13 @@ int RunEdit(const std::vector<std::string>& arguments, const SaveOptions& option
                                                       .run = run};
                             const auto result = CheckHeaderAndSave(header, context);
                             const auto line = savedLine(header.FilePath, options, result, dialogs, report);
+                            said += noteLines(path, notes);
                             if (edit.dryRun &&
                                 (result.outcome == SaveOutcome::NotWritten || result.outcome == SaveOutcome::Unchanged))
                                 report.out = DryRunDiff(path, FileBytes(*header.Part).view(),
                                                         SavedText(header, ComposeHeader(header)), diffed, report.err);
                             else
-                                said = line;
+                                said += line;
                         });
     });
 }

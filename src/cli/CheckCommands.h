@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 #pragma once
 
+#include <functional>
 #include <ostream>
 #include <string>
 #include <vector>
@@ -40,6 +41,8 @@ struct EditOptions {
     HeaderEdits edits;
     bool dryRun = false; // a diff of what the save would write instead of the save
     bool json = false;   // one JSON object per file with its old and new header, nothing written
+    // Runs on each record after the edits, before the save; each note it returns is told with the file.
+    std::function<std::vector<std::string>(HeaderData&)> afterEdits;
 };
 
 // edit: save with the edits made to each record first. Values that must come from a standard

@@ -12,6 +12,7 @@
 #include "ClosestWord.h"
 #include "ConsoleDialogs.h"
 #include "EditCommandLine.h"
+#include "FixCommand.h"
 #include "PrintCommands.h"
 
 namespace {
@@ -68,6 +69,8 @@ public:
             return RunSave(files_, saveOptions_, batch_, out, err);
         if (*edit_)
             return RunEdit(files_, saveOptions_, editOptions(), batch_, out, err);
+        if (*fix_)
+            return RunFix(files_, only_, saveOptions_, editOptions(), batch_, out, err);
         return RunPrint(printFile_, dialogs, out, err);
     }
 
@@ -177,6 +180,17 @@ private:
         edit_->footer(SaveExitStatuses);
         AddEditOptions(*edit_, editOptions_, noCategory_);
         addSaveOptions(edit_);
+        fix_ = app_.add_subcommand(
+            "fix", "Repair in each FILE, or each part file below a FOLDER, the Parts Tracker's findings that have one "
+                   "correct repair (licence, Name: folder, description numbers, \"Pattern\", retired category, "
+                   "decimals and zeros of numbers), after edit's changes, and save as edit does. Per file, each "
+                   "repair done is named with its count, and each finding left with why. Exit statuses as for edit.");
+        fix_->add_option("--only", only_,
+                         "Run only these repairs, by the Tracker's ids (a,b); "
+                         "line.invalidcoloredlines runs only when named here")
+            ->delimiter(',');
+        AddEditOptions(*fix_, editOptions_, noCategory_);
+        addSaveOptions(fix_);
     }
 
     EditOptions editOptions() const
@@ -190,8 +204,8 @@ private:
     }
 
     CLI::App app_{"quillmark-cli: reads LDraw part files (*.dat) the way the Quillmark editor opens them."};
-    CLI::App *fields_ = nullptr, *check_ = nullptr, *save_ = nullptr, *edit_ = nullptr;
-    std::vector<std::string> files_;
+    CLI::App *fields_ = nullptr, *check_ = nullptr, *save_ = nullptr, *edit_ = nullptr, *fix_ = nullptr;
+    std::vector<std::string> files_, only_;
     std::string printFile_;
     BatchOptions batch_;
     bool noLengthLimit_ = false, noBackup_ = false, noCategory_ = false;

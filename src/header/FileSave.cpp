@@ -236,6 +236,7 @@ FileSaveResult FileSave(HeaderData& header, std::string newHeader, bool makeBack
             return result;
         header.ReadStamp = header.Part ? std::optional(header.Part->stamp()) : std::nullopt;
         header.HeaderAtOpenOrSave = std::move(newHeader);
+        header.BodyChanged = false;
         header.FileChanged = false;
         result.saved = true;
     } catch (const QmError& error) {

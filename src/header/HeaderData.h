@@ -56,6 +56,9 @@ struct HeaderData {
     // while the header composed now differs from it.
     std::string HeaderAtOpenOrSave;
 
+    // The body was changed since the open or the last save (by the Parts Tracker's repairs).
+    bool BodyChanged = false;
+
     bool FileChanged = false;
     bool FileLoaded = false;
     bool Loading = false;

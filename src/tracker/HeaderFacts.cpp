@@ -3,6 +3,8 @@
 
 #include <QRegularExpression>
 
+#include "MetaLine.h"
+
 namespace {
 
 // The value after a meta line's keyword ("0 !LICENSE value"), or a null string for another line.
@@ -15,15 +17,26 @@ QString valueAfter(const QString& line, QLatin1StringView keyword)
     return line.mid(end).trimmed();
 }
 
+// A type line that does not read as a whole as a part type names none.
 void takeTypeLine(HeaderFacts& facts, const QString& value)
 {
-    const auto words = value.split(' ', Qt::SkipEmptyParts);
-    if (words.isEmpty())
+    const auto type = value.simplified(); // runs of blanks collapsed
+    if (!IsPartTypeLine("0 !LDRAW_ORG " + type))
         return;
+    const auto words = type.split(' ');
     facts.hasType = true;
     facts.type = words.at(0);
     if (words.size() > 1 && QStringList{"Alias", "Flexible_Section", "Physical_Colour"}.contains(words.at(1)))
         facts.qualifier = words.at(1);
+}
+
+// Line 1 is the description unless it is one of the header's own meta lines.
+bool isHeaderMeta(const QString& line)
+{
+    static const QStringList metas = {"!LDRAW_ORG", "!LICENSE", "!HELP",    "BFC",      "!CATEGORY",
+                                      "!KEYWORDS",  "!CMDLINE", "!HISTORY", "!PREVIEW", "//"};
+    const auto word = line.mid(2).section(' ', 0, 0, QString::SectionSkipEmpty);
+    return word.startsWith(u"Name:") || word.startsWith(u"Author:") || metas.contains(word);
 }
 
 bool isSpace(char c) { return c == ' ' || (c >= '\t' && c <= '\r'); }
@@ -54,7 +67,7 @@ void takeHeaderLine(HeaderFacts& facts, const QString& line, QString& firstCateg
         facts.license = v.simplified(); // runs of blanks collapsed
     } else if (v = valueAfter(line, QLatin1StringView("!CATEGORY")); !v.isNull()) {
         if (firstCategory.isNull())
-            firstCategory = v;
+            firstCategory = v.simplified(); // runs of blanks collapsed
     } else if (v = valueAfter(line, QLatin1StringView("!KEYWORDS")); !v.isNull()) {
         for (const auto& keyword : v.split(','))
             if (!keyword.trimmed().isEmpty())
@@ -75,6 +88,22 @@ QString PlainType(const QString& type)
     return type.startsWith("Unofficial_") ? type.mid(QStringLiteral("Unofficial_").size()) : type;
 }
 
+const QStringList RetiredCategories = {"Minifig", "Pov-RAY", "Lever", "Grab", "Forklift"};
+
+std::vector<SingleBlankNumber> SingleBlankNumbers(const QString& description)
+{
+    static const QRegularExpression singleBlankNumber(
+        QStringLiteral("(?<!\\s)\\s(?<!Type\\s)(?<!Phase\\s)(?<!Functions\\s)\\d(?:\\.\\d+)?\\b(?![\\d\"/-])"
+                       "(?!\\s+(?:Ball|Balls|Stripe|Stripes|White)\\b)"),
+        QRegularExpression::CaseInsensitiveOption | QRegularExpression::UseUnicodePropertiesOption);
+    std::vector<SingleBlankNumber> numbers;
+    for (auto it = singleBlankNumber.globalMatch(description); it.hasNext();) {
+        const auto match = it.next();
+        numbers.push_back({match.capturedStart(0), match.capturedLength(0)});
+    }
+    return numbers;
+}
+
 const QStringList KnownPartTypes = {"Part",         "Subpart",  "Primitive", "8_Primitive",
                                     "48_Primitive", "Shortcut", "Helper"};
 
@@ -89,9 +118,9 @@ HeaderFacts ReadHeaderFacts(std::string_view text)
         if (isGeometryLine(bytes))
             break;
         const auto line = QString::fromUtf8(bytes.data(), static_cast<qsizetype>(bytes.size()));
-        if (number == 0 && line.startsWith("0 "))
+        if (number == 0 && line.startsWith("0 ") && !isHeaderMeta(line))
             facts.description = line.mid(2).trimmed();
-        else if (number > 0)
+        else if (number > 0 || isHeaderMeta(line))
             takeHeaderLine(facts, line, firstCategory);
     }
     static const QRegularExpression prefix(QStringLiteral("^[~_=|]+"));

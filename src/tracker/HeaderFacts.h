@@ -4,6 +4,7 @@
 #include <QString>
 #include <QStringList>
 #include <string_view>
+#include <vector>
 
 // A part file's header as the Parts Tracker reads it: the meta lines up to the first line of
 // another type, as Unicode text.
@@ -28,6 +29,19 @@ HeaderFacts ReadHeaderFacts(std::string_view text);
 
 // The part types the library knows, without "Unofficial_".
 extern const QStringList KnownPartTypes;
+
+// The categories the library has retired, with or without a replacement.
+extern const QStringList RetiredCategories;
+
+// A number that the library wants after two blanks but finds after one, as the blank before it
+// and the number.
+struct SingleBlankNumber {
+    qsizetype start, length;
+};
+// Each in description, from its start on: a number after exactly one blank, other than a
+// two-digit one, a size in inches or a fraction, "Type 2", "Phase 1", "Functions 3", or a number
+// of balls, stripes or white parts.
+std::vector<SingleBlankNumber> SingleBlankNumbers(const QString& description);
 
 // Type without "Unofficial_".
 QString PlainType(const QString& type);

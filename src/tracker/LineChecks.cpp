@@ -91,7 +91,30 @@ void checkQuadShape(const std::array<Point, 4>& p, int number, Findings& finding
                          number);
 }
 
-void checkGeometry(const GeometryLine& line, int number, Findings& findings)
+void checkBodyLine(const GeometryLine& line, std::string_view text, const LinePart& part, int number,
+                   Findings& findings)
+{
+    checkNumbers(text, number, findings);
+    checkColour(line, part.colours, number, findings);
+    CheckLineGeometry(line, number, findings);
+}
+
+// A file name as the Tracker compares it with the part's name: lower case (ASCII), trimmed.
+bool placesItself(const GeometryLine& line, std::string_view name)
+{
+    if (line.file.size() != name.size())
+        return false;
+    for (std::size_t i = 0; i < name.size(); ++i) {
+        const auto c = line.file[i];
+        if ((c >= 'A' && c <= 'Z' ? c + ('a' - 'A') : c) != name[i])
+            return false;
+    }
+    return true;
+}
+
+} // namespace
+
+void CheckLineGeometry(const GeometryLine& line, int number, Findings& findings)
 {
     if (line.type == 1) {
         if (IsSingularPlacement(line.numbers))
@@ -114,26 +137,7 @@ void checkGeometry(const GeometryLine& line, int number, Findings& findings)
         checkQuadShape(points, number, findings);
 }
 
-void checkBodyLine(const GeometryLine& line, std::string_view text, const LinePart& part, int number,
-                   Findings& findings)
-{
-    checkNumbers(text, number, findings);
-    checkColour(line, part.colours, number, findings);
-    checkGeometry(line, number, findings);
-}
-
-// A file name as the Tracker compares it with the part's name: lower case (ASCII), trimmed.
-bool placesItself(const GeometryLine& line, std::string_view name)
-{
-    if (line.file.size() != name.size())
-        return false;
-    for (std::size_t i = 0; i < name.size(); ++i) {
-        const auto c = line.file[i];
-        if ((c >= 'A' && c <= 'Z' ? c + ('a' - 'A') : c) != name[i])
-            return false;
-    }
-    return true;
-}
+namespace {
 
 // Reads each line's shape; hands the body's valid geometry to the rules.
 class LineReader {

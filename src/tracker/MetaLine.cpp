@@ -117,13 +117,9 @@ bool validPreview(std::string_view rest)
 
 bool validLDrawOrg(std::string_view text)
 {
-    static const Pattern partType("^0 !LDRAW_ORG (?:Unofficial_)?(?:" + KnownPartTypes.join('|') +
-                                      ")(?: (?:Alias|Physical_Colour|Flexible_Section))?"
-                                      "(?: (?:ORIGINAL|UPDATE \\d{4}-\\d{2}))?$",
-                                  Unicode);
     static const Pattern configuration("^0 !LDRAW_ORG Configuration UPDATE \\d{4}-\\d{2}-\\d{2}", Unicode);
     const auto line = qt(text);
-    return partType.match(line).hasMatch() || configuration.match(line).hasMatch();
+    return IsPartTypeLine(line) || configuration.match(line).hasMatch();
 }
 
 bool validTexMap(std::string_view text)
@@ -134,9 +130,11 @@ bool validTexMap(std::string_view text)
     return shape.match(qt(text)).hasMatch();
 }
 
+// A category, a description, a placement of nine numbers and the file shown.
 bool validAvatar(std::string_view text)
 {
-    static const Pattern shape("^0 !AVATAR CATEGORY \"[^\"]+\" DESCRIPTION \"[^\"]+\" PARTS \"[^\"]+\"$");
+    static const Pattern shape("^0 !AVATAR CATEGORY \"[^\"]+\" DESCRIPTION \"[^\"]+\" PART(?: -?\\d+(?:\\.\\d+)?){9} "
+                               "\"[^\"]+\"$");
     return shape.match(qt(text)).hasMatch();
 }
 
@@ -214,15 +212,32 @@ std::string_view EmbeddedLine(std::string_view text) { return text.size() > 5 ? 
 
 std::optional<long> ColourDefinitionCode(std::string_view text)
 {
-    static const Pattern shape("^0 !COLOUR \\S+ CODE (\\d+) VALUE #[0-9A-Fa-f]{6} EDGE (?:\\d+|#[0-9A-Fa-f]{6})"
-                               "(?: ALPHA \\d+)?(?: LUMINANCE \\d+)?"
-                               "(?: (?:CHROME|PEARLESCENT|RUBBER|MATTE_METALLIC|METAL))?(?: MATERIAL .*)?$");
+    // A material's parameters: its kind, then each of the others at most once and in this order.
+    static const QString hex = "(?:0x|#)[0-9A-Fa-f]{6}", byte = "(?:25[0-5]|2[0-4]\\d|1?\\d{1,2})",
+                         fraction = "(?:0|0\\.\\d+|1|1\\.0+)", size = "(?:[1-9]\\d*(?:\\.\\d+)?|0?\\.\\d*[1-9]\\d*)";
+    static const QString material = "(?:GLITTER|SPECKLE|FABRIC)(?: VALUE " + hex + ")?(?: ALPHA " + byte +
+                                    ")?(?: LUMINANCE " + byte + ")?(?: FRACTION " + fraction + ")?(?: VFRACTION " +
+                                    fraction + ")?(?: SIZE " + size + ")?(?: MINSIZE " + size + " MAXSIZE " + size +
+                                    ")?(?: (?:VELVET|CANVAS|STRING|FUR))?";
+    static const Pattern shape("^0 !COLOUR [A-Za-z0-9_]+ CODE (\\d+) VALUE " + hex + " EDGE (?:\\d+|" + hex +
+                               ")(?: ALPHA " + byte + ")?(?: LUMINANCE " + byte +
+                               ")?(?: (?:CHROME|PEARLESCENT|RUBBER|MATTE_METALLIC|METAL|MATERIAL))*(?: MATERIAL " +
+                               material + ")?$");
     const auto match = shape.match(qt(text));
     if (!match.hasMatch())
         return std::nullopt;
     bool ok = false;
     const auto code = match.captured(1).toLong(&ok);
     return ok ? std::optional<long>(code) : std::nullopt;
+}
+
+bool IsPartTypeLine(const QString& text)
+{
+    static const Pattern partType("^0 !LDRAW_ORG (?:Unofficial_)?(?:" + KnownPartTypes.join('|') +
+                                      ")(?: (?:Alias|Physical_Colour|Flexible_Section))?"
+                                      "(?: (?:ORIGINAL|UPDATE \\d{4}-\\d{2}))?$",
+                                  Unicode);
+    return partType.match(text).hasMatch();
 }
 
 bool IsHistoryLine(const QString& line)

@@ -39,6 +39,10 @@ bool IsValidMetaLine(std::string_view text, MetaWord word, bool firstLine);
 // words, a "!LDRAW_ORG" line naming a part type, or a "BFC CERTIFY" or "BFC NOCERTIFY" line.
 bool IsHeaderMetaLine(std::string_view text, MetaWord word, bool firstLine);
 
+// "0 !LDRAW_ORG" and a part type the library knows, read as a whole: a type with its optional
+// "Unofficial_", qualifier and release.
+bool IsPartTypeLine(const QString& text);
+
 // "0 !: <line>": the line embedded after the marker.
 std::string_view EmbeddedLine(std::string_view text);
 

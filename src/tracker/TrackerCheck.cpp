@@ -12,7 +12,6 @@
 
 namespace {
 
-const QStringList RetiredCategories = {"Minifig", "Pov-RAY", "Lever", "Grab", "Forklift"};
 const QStringList ApprovedLicences = {"Licensed under CC BY 4.0 : see CAreadme.txt",
                                       "Licensed under CC BY 2.0 and CC BY 4.0 : see CAreadme.txt",
                                       "Marked with CC0 1.0 : see CAreadme.txt"};
@@ -40,13 +39,21 @@ struct Part {
 
 QString quoted(const QString& text) { return "\"" + text + "\""; }
 
-bool hasControlCharacters(const QString& text)
+// Characters of the Unicode classes Other (controls, format characters such as U+200B, unassigned
+// and private-use ones) and the line and paragraph separators.
+bool hasForbiddenCharacters(const QString& text)
 {
-    for (const QChar c : text) {
-        const auto category = c.category();
-        if (category == QChar::Other_Control || category == QChar::Separator_Line ||
-            category == QChar::Separator_Paragraph)
-            return true;
+    for (const char32_t c : text.toUcs4()) {
+        switch (QChar::category(c)) {
+        case QChar::Other_Control:
+        case QChar::Other_Format:
+        case QChar::Other_Surrogate:
+        case QChar::Other_PrivateUse:
+        case QChar::Other_NotAssigned:
+        case QChar::Separator_Line:
+        case QChar::Separator_Paragraph: return true;
+        default: break;
+        }
     }
     return false;
 }
@@ -55,7 +62,7 @@ bool hasControlCharacters(const QString& text)
 bool authorWellFormed(const QString& author)
 {
     static const QRegularExpression form(QStringLiteral("^(?:[^\\[\\]]*[^\\[\\]\\s])?\\s*(?:\\[[A-Za-z0-9_.-]+\\])?$"));
-    return !author.isEmpty() && form.match(author).hasMatch();
+    return form.match(author).hasMatch();
 }
 
 // The presence rule: when it fails, no other rule runs.
@@ -68,8 +75,7 @@ bool checkPresence(const Part& part, Findings& findings)
         {f.hasType && KnownPartTypes.contains(part.plainType),
          "The \"0 !LDRAW_ORG\" line is missing or names no known type."},
         {f.hasLicense, "The \"0 !LICENSE\" line is missing."},
-        {f.hasAuthor && authorWellFormed(f.author),
-         "The \"0 Author:\" line is missing or not of the form \"Real Name [username]\"."},
+        {f.hasAuthor && !f.author.isEmpty(), "The \"0 Author:\" line is missing or empty."},
     };
     bool complete = true;
     for (const auto& [present, text] : needs)
@@ -77,6 +83,12 @@ bool checkPresence(const Part& part, Findings& findings)
             findings.error("missing", text);
             complete = false;
         }
+    if (f.hasAuthor && !f.author.isEmpty() && !authorWellFormed(f.author)) {
+        findings.error("authorinvalid", "The author " + quoted(f.author) +
+                                            " is not of the form \"Real Name [username]\" (user name of letters, "
+                                            "digits, \"_\", \".\" and \"-\").");
+        complete = false;
+    }
     return complete;
 }
 
@@ -125,10 +137,11 @@ void checkHistory(const Part& part, Findings& findings)
 void checkName(const Part& part, Findings& findings)
 {
     const auto& f = part.facts;
-    if (hasControlCharacters(f.name))
-        findings.error("name.invalidchars", "The name " + quoted(f.name) + " holds control characters.");
-    if (part.baseName.startsWith('x'))
-        findings.error("name.xparts", "The file name " + quoted(part.fileName) + " starts with \"x\".");
+    if (hasForbiddenCharacters(f.name))
+        findings.error("name.invalidchars", "The name " + quoted(f.name) + " holds characters that are not allowed.");
+    const auto baseName = f.name.mid(std::max(f.name.lastIndexOf('\\'), f.name.lastIndexOf('/')) + 1);
+    if (baseName.startsWith('x', Qt::CaseInsensitive))
+        findings.error("name.xparts", "The name " + quoted(f.name) + " starts with \"x\".");
     const auto folder = f.name.left(f.name.lastIndexOf('\\') + 1);
     const auto wanted = QString::fromStdString(NameFolderOfType(part.plainType.toStdString()));
     if (folder.compare(wanted, Qt::CaseInsensitive) != 0)
@@ -153,7 +166,9 @@ void checkDescriptionPrefix(const Part& part, Findings& findings)
     else if (f.qualifier == "Alias" && !prefix.contains('='))
         findings.error("description.aliasdesc",
                        "An alias's description must start with \"=\": " + quoted(f.description));
-    else if (part.partsType && part.baseName.startsWith('t') && !prefix.contains('|'))
+    // The name's base is taken after its last "/" only: "s\\t12.dat" stays whole.
+    else if (part.partsType && f.name.mid(f.name.lastIndexOf('/') + 1).startsWith('t', Qt::CaseInsensitive) &&
+             !prefix.contains('|'))
         findings.error("description.thirdpartydesc",
                        "A third-party part's description must start with \"|\": " + quoted(f.description));
 }
@@ -161,19 +176,14 @@ void checkDescriptionPrefix(const Part& part, Findings& findings)
 void checkDescription(const Part& part, Findings& findings)
 {
     const auto& f = part.facts;
-    if (hasControlCharacters(f.description))
+    if (hasForbiddenCharacters(f.description))
         findings.error("description.invalidchars",
-                       "The description " + quoted(f.description) + " holds control characters.");
+                       "The description " + quoted(f.description) + " holds characters that are not allowed.");
     checkDescriptionPrefix(part, findings);
-    // A number after exactly one blank, other than a two-digit one, a size in inches or a fraction,
-    // "Type 2", "Phase 1", "Functions 3", or a number of balls, stripes or white parts.
-    static const QRegularExpression singleBlankNumber(
-        QStringLiteral("(?<!\\s)\\s(?<!Type\\s)(?<!Phase\\s)(?<!Functions\\s)\\d(?:\\.\\d+)?\\b(?![\\d\"/-])"
-                       "(?!\\s+(?:Ball|Balls|Stripe|Stripes|White)\\b)"),
-        QRegularExpression::CaseInsensitiveOption | QRegularExpression::UseUnicodePropertiesOption);
-    if (const auto match = singleBlankNumber.match(f.description); match.hasMatch())
+    if (const auto numbers = SingleBlankNumbers(f.description); !numbers.empty())
         findings.warning("warning.descriptionnumbers",
-                         "The number " + match.captured(0).trimmed() + " in " + quoted(f.description) +
+                         "The number " + f.description.mid(numbers[0].start, numbers[0].length).trimmed() + " in " +
+                             quoted(f.description) +
                              " has one blank before it; the library writes two (\"Brick  1 x  2\").");
 }
 
@@ -208,7 +218,8 @@ void checkTypeQualifiers(const Part& part, Findings& findings)
     if (part.plainType != "Part")
         findings.error("type.flex", "Flexible_Section is only allowed on a Part, not a " + part.plainType + ".");
     static const QRegularExpression flexName(QStringLiteral("k[0-9a-z]{2}$"));
-    if (!part.inCategory({"Moved", "Obsolete"}) && !flexName.match(part.baseName).hasMatch())
+    if (isOfficial(f.category, *part.categories) && !part.inCategory({"Moved", "Obsolete"}) &&
+        !flexName.match(part.baseName).hasMatch())
         findings.error("name.flex",
                        "A flexible section's name must end in \"k\" and two characters: " + quoted(part.fileName));
 }

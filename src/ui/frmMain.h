@@ -12,6 +12,7 @@
 #include "ErrorReport.h"
 #include "OpenRoad.h"
 #include "SaveChecks.h"
+#include "TrackerCheck.h"
 
 class QAction;
 class QComboBox;
@@ -109,6 +110,11 @@ private:
     void moveFocusOnEnter(QObject* watched);
     bool typedIntoBox(QObject* watched, QEvent* event);
     void showLength();
+
+    // The Parts Tracker's repairs on the open document.
+    std::vector<TrackerFinding> fixForTracker(const std::set<std::string>& ids, const StringList& categories,
+                                              const ColourCodes& colours);
+    void showFixedFields();
 
     // Line lists.
     void FillKeywordList();

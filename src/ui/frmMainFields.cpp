@@ -143,9 +143,10 @@ void frmMain::MakeNewHeader()
 {
     newHeaderText_ = ComposeHeader(app_.Header);
     txNewHeader->setPlainText(shownHeader(newHeaderText_, app_.Header.Encoding));
-    // Keys that change nothing, or a letter typed and deleted again, leave the file unchanged.
+    // Keys that change nothing, or a letter typed and deleted again, leave the file unchanged; a
+    // changed body stays a change.
     if (!app_.Header.Loading)
-        app_.Header.FileChanged = newHeaderText_ != app_.Header.HeaderAtOpenOrSave;
+        app_.Header.FileChanged = app_.Header.BodyChanged || newHeaderText_ != app_.Header.HeaderAtOpenOrSave;
     showModified();
     showLength();
 }

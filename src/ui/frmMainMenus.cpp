@@ -56,10 +56,11 @@ void frmMain::MTrackerCheck_Click()
         };
         const auto builtIn = ReadBuiltInColours(DataFileOfThisProgram(app_.ProgramFolder, BuiltInColoursFile));
         ColourSource colours(builtIn, "", report);
-        const auto findings =
-            CheckRecordForTracker(app_.Header, newHeaderText_, EntriesOf(app_.Lists, ListKind::Category),
-                                  colours.forPart(app_.Header.FilePath, report));
-        frmTracker dialog(findings, QString::fromStdString(app_.Header.FilePath), this);
+        const auto& codes = colours.forPart(app_.Header.FilePath, report);
+        const auto categories = EntriesOf(app_.Lists, ListKind::Category);
+        const auto findings = CheckRecordForTracker(app_.Header, newHeaderText_, categories, codes);
+        const auto repair = [&](const std::set<std::string>& ids) { return fixForTracker(ids, categories, codes); };
+        frmTracker dialog(findings, QString::fromStdString(app_.Header.FilePath), this, repair);
         dialog.exec();
     } catch (const std::exception& error) {
         ReportError(services_.dialogs, ErrorOf(error), {"MTrackerCheck_Click", OwnerKind::Formular, "frmMain"});

@@ -11,11 +11,18 @@
 #include <QVBoxLayout>
 #include <algorithm>
 
+#include "TrackerFixes.h"
 #include "TwipLayout.h"
 
 namespace {
 
-enum Column { LevelColumn, IdColumn, LineColumn, MessageColumn };
+enum Column { LevelColumn, IdColumn, LineColumn, FixColumn, MessageColumn };
+
+bool hasRepair(const QString& id)
+{
+    const auto& fixes = TrackerFixes();
+    return std::any_of(fixes.begin(), fixes.end(), [&id](const TrackerFix& fix) { return id == fix.id; });
+}
 
 QString verdict(const std::vector<TrackerFinding>& findings)
 {
@@ -48,8 +55,9 @@ private:
 
 } // namespace
 
-frmTracker::frmTracker(const std::vector<TrackerFinding>& findings, const QString& filePath, QWidget* parent)
-    : QDialog(parent), filePath_(filePath)
+frmTracker::frmTracker(const std::vector<TrackerFinding>& findings, const QString& filePath, QWidget* parent,
+                       Repairer repair)
+    : QDialog(parent), filePath_(filePath), repair_(std::move(repair))
 {
     setObjectName("frmTracker");
     setWindowTitle("Check for the Parts Tracker");
@@ -67,6 +75,7 @@ frmTracker::frmTracker(const std::vector<TrackerFinding>& findings, const QStrin
     cmdClose->setDefault(true);
     auto* buttons = new QHBoxLayout;
     buttons->addStretch();
+    addFixButtons(*buttons);
     buttons->addWidget(cmdCopy);
     buttons->addWidget(cmdClose);
     auto* layout = new QVBoxLayout(this);
@@ -81,8 +90,9 @@ frmTracker::frmTracker(const std::vector<TrackerFinding>& findings, const QStrin
 void frmTracker::fillTable(std::vector<TrackerFinding> findings)
 {
     std::stable_sort(findings.begin(), findings.end(), listedBefore);
-    tbFindings->setColumnCount(4);
-    tbFindings->setHorizontalHeaderLabels({"Level", "Id", "Line", "Message"});
+    tbFindings->setSortingEnabled(false); // rows filled again stay where they are put
+    tbFindings->setColumnCount(5);
+    tbFindings->setHorizontalHeaderLabels({"Level", "Id", "Line", "Fix", "Message"});
     tbFindings->setRowCount(static_cast<int>(findings.size()));
     tbFindings->setEditTriggers(QAbstractItemView::NoEditTriggers);
     tbFindings->setSelectionBehavior(QAbstractItemView::SelectRows);
@@ -97,11 +107,12 @@ void frmTracker::fillTable(std::vector<TrackerFinding> findings)
         tbFindings->setItem(row, LineColumn, new LineItem(finding.line));
         tbFindings->setItem(row, MessageColumn, new QTableWidgetItem(QString::fromStdString(finding.text)));
     }
+    markFixableRows();
     // Sorting by level keeps the order within each level: errors first, then by id.
     tbFindings->horizontalHeader()->setSortIndicator(LevelColumn, Qt::AscendingOrder);
     tbFindings->setSortingEnabled(true);
     // Measured with the sort arrow in place, so that no column title is cut.
-    for (const auto column : {LevelColumn, IdColumn, LineColumn})
+    for (const auto column : {LevelColumn, IdColumn, LineColumn, FixColumn})
         tbFindings->resizeColumnToContents(column);
 }
 
@@ -115,4 +126,46 @@ QString frmTracker::findingsText() const
                 '\n';
     }
     return text;
+}
+
+void frmTracker::addFixButtons(QHBoxLayout& buttons)
+{
+    if (!repair_)
+        return;
+    cmdFix = new QPushButton("Fix", this);
+    cmdFix->setObjectName("cmdFix");
+    cmdFixAll = new QPushButton("Fix All", this);
+    cmdFixAll->setObjectName("cmdFixAll");
+    buttons.addWidget(cmdFix);
+    buttons.addWidget(cmdFixAll);
+    connect(cmdFix, &QPushButton::clicked, this, &frmTracker::cmdFix_Click);
+    connect(cmdFixAll, &QPushButton::clicked, this, &frmTracker::cmdFixAll_Click);
+}
+
+// "yes" in the Fix column of each finding that has a repair, when the dialog can repair.
+void frmTracker::markFixableRows()
+{
+    for (int row = 0; row < tbFindings->rowCount(); ++row) {
+        const bool fixable = repair_ && hasRepair(tbFindings->item(row, IdColumn)->text());
+        tbFindings->setItem(row, FixColumn, new QTableWidgetItem(fixable ? "yes" : ""));
+    }
+}
+
+void frmTracker::cmdFix_Click()
+{
+    std::set<std::string> ids;
+    for (const auto* item : tbFindings->selectedItems())
+        if (item->column() == IdColumn && hasRepair(item->text()))
+            ids.insert(item->text().toStdString());
+    if (!ids.empty())
+        showRepaired(ids);
+}
+
+void frmTracker::cmdFixAll_Click() { showRepaired(DefaultFixIds()); }
+
+void frmTracker::showRepaired(const std::set<std::string>& ids)
+{
+    const auto findings = repair_(ids);
+    lblVerdict->setText(verdict(findings));
+    fillTable(findings);
 }

@@ -7,8 +7,10 @@
 #include <filesystem>
 #include <functional>
 #include <grp.h>
+#include <map>
 #include <nlohmann/json.hpp>
 #include <pty.h>
+#include <set>
 #include <sstream>
 #include <sys/resource.h>
 #include <sys/wait.h>
@@ -17,6 +19,7 @@
 #include "CliRun.h"
 #include "Corpus.h"
 #include "TempDir.h"
+#include "TrackerFixes.h"
 #include "UnifiedDiff.h"
 
 namespace fs = std::filesystem;
@@ -409,6 +412,73 @@ TEST(CliBatch, AProgressLineOnlyOnATerminal)
     EXPECT_NE(onTerminal.find("\r\033[K3 files, 0 refused"), std::string::npos) << onTerminal;
     EXPECT_EQ(standardErrorOfCheck(dir.path().string(), false),
               "3 files, 0 refused, 0 without user name, 0 unreadable\n");
+}
+
+} // namespace
+
+namespace {
+
+// Per file, the ids of check --tracker --json over a folder.
+std::map<std::string, std::set<std::string>> trackerIds(const std::string& output)
+{
+    std::map<std::string, std::set<std::string>> ids;
+    std::istringstream lines(output);
+    for (std::string line; std::getline(lines, line);) {
+        const auto json = nlohmann::json::parse(line);
+        auto& of = ids[json["FilePath"].get<std::string>()];
+        for (const auto& finding : json["tracker"])
+            of.insert(finding["id"].get<std::string>());
+    }
+    return ids;
+}
+
+// A third of the real subparts, copied twice: the dry run's diff applied to one copy gives the bytes that fix
+// writes into the other; afterwards the check finds in each file written no fixed id but those fix
+// says it left, and no id the file did not have; a second fix writes nothing.
+TEST(CliFix, AFolderIsFixedOnceAndTheDryRunsDiffIsWhatFixWrites)
+{
+    TempDir dir;
+    for (const auto* copy : {"lib/s", "copy/lib/s"}) {
+        fs::create_directories(dir.path() / copy);
+        std::error_code missing;
+        int file = 0;
+        for (const auto& entry : fs::directory_iterator(QUILLMARK_CORPUS_DIR "/parts/s", missing)) {
+            if (file++ % 3 != 0)
+                continue; // a third of them is variety enough
+            fs::copy_file(entry.path(), dir.path() / copy / entry.path().filename());
+            fs::permissions(dir.path() / copy / entry.path().filename(), fs::perms::owner_write, fs::perm_options::add);
+        }
+        if (missing)
+            GTEST_SKIP() << "no corpus folder beside the project";
+    }
+    const auto inDir = [&dir] { fs::current_path(dir.path()); };
+    const auto before = trackerIds(RunCliInChild({"check", "--tracker", "--json", "--quiet", "lib"}, inDir).out);
+    const std::vector<std::string> fix = {"fix", "--no-backup", "--allow-missing-username", "lib"};
+    auto dryRun = fix;
+    dryRun.push_back("--dry-run");
+    TempDir::writeTo(dir.file("fixes.diff"), RunCliInChild(dryRun, inDir).out);
+    ASSERT_EQ(std::system(("cd '" + dir.file("copy") + "' && patch -s -p1 <../fixes.diff").c_str()), 0);
+    const auto fixed = RunCliInChild(fix, inDir);
+    for (const auto& entry : fs::directory_iterator(dir.path() / "lib/s"))
+        EXPECT_TRUE(ReadBytes(entry.path()) == ReadBytes(dir.path() / "copy/lib/s" / entry.path().filename()))
+            << entry.path();
+    const auto after = trackerIds(RunCliInChild({"check", "--tracker", "--json", "--quiet", "lib"}, inDir).out);
+    int cleared = 0;
+    for (const auto& [path, ids] : after) {
+        if (fixed.out.find("skipped " + path + ": ") != std::string::npos)
+            continue; // refused by a save check: not written
+        for (const auto& id : ids) {
+            EXPECT_TRUE(before.at(path).contains(id)) << path << " has " << id << " only after the fix";
+            if (DefaultFixIds().contains(id)) {
+                EXPECT_NE(fixed.out.find(path + ": left " + id + ": "), std::string::npos) << path << " " << id;
+            }
+        }
+        cleared += static_cast<int>(before.at(path).size() - ids.size());
+    }
+    EXPECT_GT(cleared, 100) << "the licence alone is old in every file";
+    const auto again = RunCliInChild(fix, inDir);
+    EXPECT_EQ(again.out.find("saved "), std::string::npos) << again.out;
+    EXPECT_NE(again.err.find(" 0 saved,"), std::string::npos) << again.err;
 }
 
 } // namespace

@@ -41,11 +41,34 @@ TEST(LineShapes, MetaLinesHaveTheShapeTheirWordAsks)
     for (const auto* line :
          {"0 // a comment", "0 BFC INVERTNEXT", "0 BFC CLIP CW", "0 BFC nocertify", "0 !: 3 16 0 0 0 1 0 0 0 1 0",
           "0 !TEXMAP START PLANAR 0 0 0 1 0 0 0 1 0 a.png", "0 !TEXMAP END", "0 !HELP use it", "0 Name: 3001.dat",
-          "0 !HISTORY 2024-01-02 {Jo} x", "0", "0 //", "0 !COLOUR Red CODE 4 VALUE #C91A09 EDGE #333333"})
+          "0 !HISTORY 2024-01-02 {Jo} x", "0", "0 //", "0 !COLOUR Red CODE 4 VALUE #C91A09 EDGE #333333",
+          "0 !COLOUR Chrome_Silver CODE 383 VALUE 0xE0E0E0 EDGE #A4A4A4 ALPHA 255 CHROME METAL",
+          "0 !COLOUR Glitter CODE 114 VALUE #DF6695 EDGE #9A2A66 ALPHA 128 MATERIAL GLITTER VALUE #FFFFFF "
+          "FRACTION 0.17 VFRACTION 0.2 SIZE 1",
+          "0 !COLOUR Speckle CODE 132 VALUE #000000 EDGE #898788 MATERIAL SPECKLE FRACTION 1.00 MINSIZE .5 MAXSIZE 3",
+          "0 !AVATAR CATEGORY \"Figure\" DESCRIPTION \"A man\" PART 0 -1.5 0 1 0 0 0 1 0 \"3626.dat\""})
         EXPECT_EQ(onLine(line), Ids{}) << line;
-    for (const auto* line : {"0 a comment without slashes", "0 //comment", "0 bfc certify", "0 BFC certify ccw",
-                             "0 BFC CCW CLIP", "0 !:3 16 0 0 0 1 0 0 0 1 0", "0 !: 0 // inside", "0 !LDCAD GROUP",
-                             "0 WRITE hello", "0 !HELP", "0 Name: a b", "0 !TEXMAP BEGIN", "0 !PREVIEW 16 0 0", "x",
+    for (const auto* line : {"0 a comment without slashes",
+                             "0 //comment",
+                             "0 bfc certify",
+                             "0 BFC certify ccw",
+                             "0 BFC CCW CLIP",
+                             "0 !:3 16 0 0 0 1 0 0 0 1 0",
+                             "0 !: 0 // inside",
+                             "0 !LDCAD GROUP",
+                             "0 WRITE hello",
+                             "0 !HELP",
+                             "0 Name: a b",
+                             "0 !TEXMAP BEGIN",
+                             "0 !PREVIEW 16 0 0",
+                             "x",
+                             "0 !COLOUR Red CODE 4 VALUE #C91A09 EDGE #333333 ALPHA 256",
+                             "0 !COLOUR Red-2 CODE 4 VALUE #C91A09 EDGE #333333",
+                             "0 !COLOUR Red CODE 4 VALUE #C91A09 EDGE #333333 MATERIAL GLITTER FRACTION 1.5",
+                             "0 !COLOUR Red CODE 4 VALUE #C91A09 EDGE #333333 MATERIAL SPECKLE MINSIZE 1",
+                             "0 !COLOUR Red CODE 4 VALUE #C91A09 EDGE #333333 MATERIAL PLASTIC",
+                             "0 !AVATAR CATEGORY \"Figure\" DESCRIPTION \"A man\" PART .5 0 0 1 0 0 0 1 0 \"a.dat\"",
+                             "0 !AVATAR CATEGORY \"Figure\" DESCRIPTION \"A man\" PART 0 0 1 0 0 0 1 0 \"a.dat\"",
                              "\xC2\xA0"
                              "0 // nbsp first"})
         EXPECT_EQ(onLine(line), Ids{"line.invalid"}) << line;
@@ -106,6 +129,7 @@ TEST(Matrix, APlacementMustNotBeSingular)
     EXPECT_EQ(onLine("1 16 0 0 0 1 0 0 0 0 0 0 0 1 stud.dat"), Ids{"line.singular"});
     EXPECT_EQ(onLine("1 16 0 0 0 .0003 0 0 0 .0003 0 0 0 .0003 stud.dat"), Ids{});
     EXPECT_EQ(onLine("1 16 0 0 0 .0002 0 0 0 .0002 0 0 0 .0002 stud.dat"), Ids{"line.singular"});
+    EXPECT_EQ(onLine("1 16 0 0 0 -1 0 0 0 1 0 0 0 1 stud.dat"), Ids{}) << "a mirror is no singular placement";
 }
 
 TEST(Points, IdenticalColinearConvexAndFlat)
@@ -124,6 +148,7 @@ TEST(Points, IdenticalColinearConvexAndFlat)
     EXPECT_EQ(onLine("4 16 0 0 0 2 0 0 0.5 0.5 0 0 2 0"), Ids{"line.notconvex"}) << "dart";
     EXPECT_EQ(onLine("4 16 0 0 0 1 0 0 1 1 0.01 0 1 0"), Ids{}) << "0.81 degrees";
     EXPECT_EQ(onLine("4 16 0 0 0 1 0 0 1 1 0.03 0 1 0"), Ids{"warning.notcoplaner"}) << "2.43 degrees";
+    EXPECT_EQ(onLine("4 16 0 0 0 1 0 0 1 1 0.04 0 1 0"), Ids{"line.notcoplaner"}) << "3.24 degrees";
     EXPECT_EQ(onLine("4 16 0 0 0 1 0 0 1 1 0.1 0 1 0"), Ids{"line.notcoplaner"}) << "8.07 degrees";
 }
 

@@ -15,9 +15,14 @@ TEST(TrackerRules, AMissingOrMalformedHeaderLineStopsEveryOtherRule)
     text.replace(text.find("Jane Doe [jdoe]"), 15, "Jane [j d]");
     const auto findings = CheckForTracker(text, "x3001.dat", Categories, Colours());
     ASSERT_EQ(findings.size(), 1u);
-    EXPECT_EQ(findings[0].id, "missing");
+    EXPECT_EQ(findings[0].id, "authorinvalid");
     EXPECT_EQ(findings[0].level, FindingLevel::Error);
     EXPECT_EQ(idsOf(cleanPart("Brick", "3001.dat", "Mystery")), Ids{"missing"});
+    EXPECT_EQ(idsOf(cleanPart("Brick", "3001.dat", "Part UPDATE 2004-3")), Ids{"missing"}) << "read as a whole";
+    EXPECT_EQ(idsOf(cleanPart("Brick", "3001.dat", "Part\t UPDATE 2004-03")), Ids{}) << "its blanks collapsed";
+    auto commentFirst = cleanPart();
+    commentFirst.replace(0, commentFirst.find("\r\n"), "0 // Brick  2 x  4");
+    EXPECT_EQ(idsOf(commentFirst), Ids{"missing"}) << "line 1 is a header meta, not the description";
     auto userOnly = cleanPart();
     userOnly.replace(userOnly.find("Jane Doe [jdoe]"), 15, "[jdoe]");
     EXPECT_EQ(idsOf(userOnly), Ids{});
@@ -47,6 +52,12 @@ TEST(TrackerRules, TypeQualifiersAndPaths)
     EXPECT_EQ(idsOf(cleanPart("Hose Flex", "73590.dat", "Shortcut Flexible_Section"), "73590.dat"),
               (Ids{"type.flex", "name.flex"}));
     EXPECT_EQ(idsOf(cleanPart(), "3002.dat"), Ids{"name.filename"});
+    EXPECT_EQ(idsOf(cleanPart("Hose Flex", "73590.dat", "Part Flexible_Section", "0 !CATEGORY Tyre\r\n"), "73590.dat"),
+              Ids{"category.invalid"})
+        << "no name rule for a flexible section of an unknown category";
+    EXPECT_EQ(idsOf(cleanPart("~Brick Sub", "s\\x12.dat", "Subpart"), "12.dat"), (Ids{"name.xparts", "name.filename"}))
+        << "the name is read, not the file's";
+    EXPECT_EQ(idsOf(cleanPart("Brick", "s\\t12.dat"), "t12.dat"), Ids{"type.path"}) << "\"\\\" does not split it";
 }
 
 TEST(TrackerRules, DescriptionPrefixesAndCharacters)
@@ -59,6 +70,12 @@ TEST(TrackerRules, DescriptionPrefixesAndCharacters)
     EXPECT_EQ(idsOf(cleanPart("Brick", "3001.dat", "Part", "0 !CATEGORY Moved\r\n")),
               Ids{"description.movedorobsolete"});
     EXPECT_EQ(idsOf(cleanPart("Brick\t2")), (Ids{"description.invalidchars", "warning.descriptionnumbers"}));
+    for (const auto* other : {"\u200B", "\uE000", "\u0378"}) { // format, private use, unassigned
+        EXPECT_EQ(idsOf(cleanPart(std::string("Brick x") + other + "x")), Ids{"description.invalidchars"}) << other;
+        EXPECT_EQ(idsOf(cleanPart("Brick", std::string("3001") + other + ".dat")),
+                  (Ids{"name.invalidchars", "name.filename"}))
+            << other;
+    }
     EXPECT_EQ(idsOf(cleanPart("Brick 1 x 2")), Ids{"warning.descriptionnumbers"});
     EXPECT_EQ(idsOf(cleanPart("Technic Ball Joint Type 2")), Ids{});
     EXPECT_EQ(idsOf(cleanPart("Brick with 1 White Stripe")), Ids{}) << "before White";
@@ -67,6 +84,7 @@ TEST(TrackerRules, DescriptionPrefixesAndCharacters)
 TEST(TrackerRules, CategoriesAndObsoleteParts)
 {
     EXPECT_EQ(idsOf(cleanPart("Brick", "3001.dat", "Part", "0 !CATEGORY Tyre\r\n")), Ids{"category.invalid"});
+    EXPECT_EQ(idsOf(cleanPart("Hat", "3001.dat", "Part", "0 !CATEGORY Minifig  \t Accessory\r\n")), Ids{});
     EXPECT_EQ(idsOf(cleanPart("Minifig Hat")), Ids{"warning.minifigcategory"});
     EXPECT_EQ(idsOf(cleanPart("~Brick (Obsolete)")), Ids{"obsoleteimproper"});
     EXPECT_EQ(idsOf(cleanPart("~Brick (Obsolete)", "3001.dat", "Part", "0 !CATEGORY Obsolete\r\n")), Ids{});

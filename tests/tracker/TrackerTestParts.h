@@ -9,7 +9,8 @@
 #include "TrackerCheck.h"
 
 inline const StringList Categories = {
-    "<none>", "Brick", "Hose", "Technic", "Moved", "Obsolete", "Cylinder", "Minifig Accessory", "Sticker Shortcut"};
+    "<none>",           "Brick",  "Hose", "Technic", "Moved", "Obsolete", "Cylinder", "Minifig Accessory",
+    "Sticker Shortcut", "Vehicle"};
 
 // The colour codes 0 to 511, as a small LDConfig.ldr would give them.
 const ColourCodes& Colours();

@@ -237,3 +237,41 @@ TEST_F(WindowTest, RelativePathsFromTheCommandLineAndDropsAreMadeFull)
 }
 
 } // namespace
+
+namespace {
+
+// Fix on a row and Fix All in the Tracker dialog change the open document only, the body too;
+// saved, it holds what quillmark-cli fix writes into a copy of the file.
+TEST_F(WindowTest, FixAllInTheTrackerDialogThenSaveWritesWhatFixWrites)
+{
+    auto old = GoodPart + "3 16 1.0 0 0 0 1 0 0 0 1.1234567\r\n";
+    old.replace(old.find("Licensed under CC BY 4.0"), 24, "Redistributable under CCAL version 2.0");
+    startUp();
+    std::filesystem::create_directory(work.file("copy"));
+    const auto path = part("3001.dat", old), copy = part("copy/3001.dat", old);
+    openThroughPendingFile(path);
+    whenDialogShows<frmTracker>([](frmTracker& dialog) { // the body alone, by Fix on its row
+        auto* table = dialog.findChild<QTableWidget*>("tbFindings");
+        EXPECT_EQ(table->rowCount(), 4);
+        EXPECT_EQ(table->item(0, 3)->text(), "yes");
+        table->selectRow(static_cast<int>(table->findItems("numbers.trailingzeros", Qt::MatchExactly)[0]->row()));
+        dialog.findChild<QPushButton*>("cmdFix")->click();
+        EXPECT_EQ(table->rowCount(), 3);
+        dialog.findChild<QPushButton*>("cmdClose")->click();
+    });
+    child<QAction>("MTrackerCheck")->trigger();
+    EXPECT_NE(caption().find('*'), std::string::npos);
+    whenDialogShows<frmTracker>([](frmTracker& dialog) {
+        dialog.findChild<QPushButton*>("cmdFixAll")->click();
+        EXPECT_EQ(dialog.findChild<QTableWidget*>("tbFindings")->rowCount(), 0);
+        dialog.findChild<QPushButton*>("cmdClose")->click();
+    });
+    child<QAction>("MTrackerCheck")->trigger();
+    EXPECT_EQ(ReadBytes(path), old) << "nothing saved before Save";
+    window->MDateiSpeichern_Click();
+    const auto fix = QUILLMARK_PROGRAM_FOLDER "/quillmark-cli fix --no-backup --quiet '" + copy + "' >/dev/null";
+    ASSERT_EQ(std::system(fix.c_str()), 0);
+    EXPECT_EQ(ReadBytes(path), ReadBytes(copy));
+}
+
+} // namespace
