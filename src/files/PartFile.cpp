@@ -56,7 +56,7 @@ FileBytes::FileBytes(const std::string& path)
     if (::fstat(file.get(), &info) != 0)
         throw OsError(errno, path);
     if (!S_ISREG(info.st_mode))
-        throw PathFileAccessError();
+        throw NoRegularFileError(path, S_ISDIR(info.st_mode));
     stamp_ = StampOf(info);
     const auto expected = static_cast<std::size_t>(info.st_size);
     reserveFor(bytes_, expected);
