@@ -61,5 +61,6 @@ int main(int argc, char** argv)
     // The icon the desktop's theme has for the entry, so window, dock and menu look alike.
     window.setWindowIcon(QIcon::fromTheme(QUILLMARK_APP_ID, window.windowIcon()));
     window.StartUp(application.arguments().mid(1));
+    window.OfferPreferencesWithoutNames();
     return application.exec();
 }

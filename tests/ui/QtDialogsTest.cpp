@@ -42,7 +42,9 @@ TEST_F(WindowTest, QtMessageBoxesShowWhatWasAskedAndAnswerWhatWasPressed)
          QMessageBox::Question, QMessageBox::Yes, QMessageBox::NoButton, Answer::Cancel},
     };
     for (const auto& c : cases) {
-        whenDialogShows<QMessageBox>([&c](QMessageBox& box) {
+        whenDialogShows<QMessageBox>([&](QMessageBox& box) {
+            EXPECT_LE((box.frameGeometry().center() - window->frameGeometry().center()).manhattanLength(), 8)
+                << "a box shows over its window";
             EXPECT_EQ(box.text(), "Text");
             EXPECT_EQ(box.windowTitle(), "Title");
             EXPECT_EQ(box.standardButtons(), c.shownButtons);
@@ -62,13 +64,17 @@ TEST_F(WindowTest, QtInputBoxGivesTheTypedTextOrNothingWhenCancelled)
     startUp();
     QtDialogs qt(window.get());
     for (const bool accept : {true, false}) {
-        whenDialogShows<QInputDialog>([accept](QInputDialog& box) {
+        whenDialogShows<QInputDialog>([&](QInputDialog& box) {
+            EXPECT_LE((box.frameGeometry().center() - window->frameGeometry().center()).manhattanLength(), 8);
             EXPECT_EQ(box.labelText(), "Prompt");
-            EXPECT_EQ(box.textValue(), "default");
+            EXPECT_EQ(box.textValue(), "default ");
+            const auto* field = box.findChild<QLineEdit*>();
+            EXPECT_EQ(field->selectedText(), "") << "typing adds to the text";
+            EXPECT_EQ(field->cursorPosition(), 8);
             box.setTextValue("typed");
             accept ? box.accept() : box.reject();
         });
-        EXPECT_EQ(qt.input("Prompt", "Title", "default"), accept ? "typed" : "");
+        EXPECT_EQ(qt.input("Prompt", "Title", "default "), accept ? "typed" : "");
     }
 }
 
