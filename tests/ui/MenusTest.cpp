@@ -140,12 +140,7 @@ bool overlap(const QWidget& a, const QWidget& b)
 // other, and the main window stays on the screen.
 TEST_F(WindowTest, EveryCaptionOfTheThreeWindowsShowsWholeAtAnyFontSize)
 {
-    const QFont designFont = QApplication::font();
-    for (const double points : {8.0, 14.0}) {
-        QFont font = designFont;
-        font.setPointSizeF(points);
-        QApplication::setFont(font);
-        startUp();
+    atDesignAndLargeFont([this](double points) {
         frmList list(ListKind::Category, {"<none>"}, app.ProgramFolder, dialogs);
         frmOption options(PreferencesForm{}, {});
         for (const QWidget* shown : std::initializer_list<const QWidget*>{window.get(), &list, &options}) {
@@ -174,20 +169,14 @@ TEST_F(WindowTest, EveryCaptionOfTheThreeWindowsShowsWholeAtAnyFontSize)
         const QSize screen = window->screen()->availableGeometry().size();
         EXPECT_LE(window->height(), screen.height()) << points << " pt";
         EXPECT_LE(window->width(), screen.width()) << points << " pt";
-    }
-    QApplication::setFont(designFont);
+    });
 }
 
 // The window grows from its design size: the lists and the old header take the room, the controls
 // beside and below them move along, the others keep their places, and nothing covers anything.
 TEST_F(WindowTest, AGrownWindowGivesItsRoomToTheListsAndTheOldHeader)
 {
-    const QFont designFont = QApplication::font();
-    for (const double points : {8.0, 14.0}) {
-        QFont font = designFont;
-        font.setPointSizeF(points);
-        QApplication::setFont(font);
-        startUp();
+    atDesignAndLargeFont([this](double points) {
         const auto* client = child<QWidget>("client");
         const auto controls = client->findChildren<QWidget*>(QRegularExpression("^(Label|lbl|tx|cb|ls|cmd)"));
         window->resize(client->minimumSize() + QSize(0, window->menuBar()->height()));
@@ -218,8 +207,7 @@ TEST_F(WindowTest, AGrownWindowGivesItsRoomToTheListsAndTheOldHeader)
         EXPECT_GT(child<QWidget>("lsComments")->x(), child<QWidget>("cmdEdit")->geometry().right());
         window->resize(100, 100);
         EXPECT_EQ(window->size(), window->minimumSize()) << "no smaller than its design, or the screen";
-    }
-    QApplication::setFont(designFont);
+    });
 }
 
 TEST_F(WindowTest, PreferencesWindowWithAnEmptyStore)

@@ -41,6 +41,19 @@ void WindowTest::openThroughPendingFile(const std::string& path)
     window->MDateiOeffnen_Click();
 }
 
+void WindowTest::atDesignAndLargeFont(const std::function<void(double points)>& check)
+{
+    const QFont designFont = QApplication::font();
+    for (const double points : {8.0, 14.0}) {
+        QFont font = designFont;
+        font.setPointSizeF(points);
+        QApplication::setFont(font);
+        startUp();
+        check(points);
+    }
+    QApplication::setFont(designFont);
+}
+
 void Drop(QWidget& target, QMimeData& data)
 {
     QDragEnterEvent enter(QPoint(10, 10), Qt::CopyAction, &data, Qt::LeftButton, Qt::NoModifier);
