@@ -56,31 +56,46 @@ Answer answerOf(int button, Buttons buttons)
 }
 
 // Shows a dialog centred on the window it belongs to, wherever the window manager would put it:
-// a box far from the window that caused it is easily missed. An input box shows its default text
-// with the cursor at its end and nothing selected, so that typing adds to it.
+// a box far from the window that caused it is easily missed. A window that the window manager
+// places only after the box shows (at start-up) takes the box along. An input box shows its
+// default text with the cursor at its end and nothing selected, so that typing adds to it.
 class PlacedOnShow : public QObject {
 public:
-    PlacedOnShow(QDialog& dialog, const QWidget* window) : QObject(&dialog), dialog_(dialog), window_(window)
+    PlacedOnShow(QDialog& dialog, QWidget* window) : QObject(&dialog), dialog_(dialog), window_(window)
     {
         dialog.installEventFilter(this);
+        if (window != nullptr)
+            window->installEventFilter(this);
     }
+    ~PlacedOnShow() override
+    {
+        if (window_ != nullptr)
+            window_->removeEventFilter(this);
+    }
+    PlacedOnShow(const PlacedOnShow&) = delete;
+    PlacedOnShow& operator=(const PlacedOnShow&) = delete;
 
     bool eventFilter(QObject* watched, QEvent* event) override
     {
-        if (watched == &dialog_ && event->type() == QEvent::Show) {
-            if (window_ != nullptr)
-                dialog_.move(window_->frameGeometry().center() - dialog_.rect().center());
-            // The input box selects its text once it shows.
-            if (auto* field = dialog_.findChild<QLineEdit*>())
-                QMetaObject::invokeMethod(
-                    field, [field] { field->end(false); }, Qt::QueuedConnection);
-        }
+        const bool shown = watched == &dialog_ && event->type() == QEvent::Show;
+        if (shown || (watched == window_ && event->type() == QEvent::Move && dialog_.isVisible()))
+            centre();
+        // The input box selects its text once it shows.
+        if (auto* field = dialog_.findChild<QLineEdit*>(); shown && field != nullptr)
+            QMetaObject::invokeMethod(
+                field, [field] { field->end(false); }, Qt::QueuedConnection);
         return false;
     }
 
 private:
+    void centre()
+    {
+        if (window_ != nullptr)
+            dialog_.move(window_->frameGeometry().center() - dialog_.rect().center());
+    }
+
     QDialog& dialog_;
-    const QWidget* window_;
+    QWidget* window_;
 };
 
 } // namespace

@@ -14,6 +14,7 @@
 #include <QPushButton>
 #include <QScreen>
 #include <QScrollArea>
+#include <QTimer>
 
 #include "Dialogs.h"
 #include "OpenRoad.h"
@@ -278,13 +279,16 @@ void frmMain::placeControls()
 // see moveEvent.
 void frmMain::fitOnScreen()
 {
-    QSize room = client_->minimumSize() + QSize(0, menuBar()->sizeHint().height());
+    QSize room = client_->minimumSize();
     if (const QScreen* shownOn = screen())
-        room = room.boundedTo(shownOn->availableGeometry().size() - fitFrame_);
-    const bool first = minimumSize() == QSize(0, 0);
-    setMinimumSize(room);
-    if (first)
-        resize(room);
+        room =
+            room.boundedTo(shownOn->availableGeometry().size() - fitFrame_ - QSize(0, menuBar()->sizeHint().height()));
+    const bool first = scroller_->minimumSize() == QSize(0, 0);
+    scroller_->setMinimumSize(room); // the window's layout adds the menu bar, as it is drawn
+    if (first) {
+        layout()->activate();
+        resize(minimumSize());
+    }
 }
 
 // The window manager frames the window only after it shows, and moves it then; a move that leaves
@@ -334,8 +338,9 @@ void frmMain::StartUp(const QStringList& arguments)
     app_.PendingFile =
         arguments.isEmpty() ? std::string() : AbsolutePath(QFile::encodeName(arguments.first()).toStdString());
     show();
+    // Once the window manager has placed the window, so that what the open tells shows over it.
     if (!app_.PendingFile.empty())
-        MDateiOeffnen_Click();
+        QTimer::singleShot(0, this, [this] { MDateiOeffnen_Click(); });
 }
 
 void frmMain::MInfo_Click()

@@ -57,6 +57,20 @@ TEST_F(WindowTest, QtMessageBoxesShowWhatWasAskedAndAnswerWhatWasPressed)
     }
 }
 
+// A box stays over its window, also when the window manager places the window only after the box
+// showed.
+TEST_F(WindowTest, QtBoxesFollowTheirWindow)
+{
+    startUp();
+    QtDialogs qt(window.get());
+    whenDialogShows<QMessageBox>([this](QMessageBox& box) {
+        window->move(window->pos() + QPoint(120, 80));
+        EXPECT_LE((box.frameGeometry().center() - window->frameGeometry().center()).manhattanLength(), 8);
+        box.accept();
+    });
+    qt.message(StopBox("Text"));
+}
+
 TEST_F(WindowTest, QtInputBoxGivesTheTypedTextOrNothingWhenCancelled)
 {
     startUp();

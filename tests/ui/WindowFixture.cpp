@@ -33,6 +33,7 @@ void WindowTest::startUp(const QStringList& arguments)
 {
     window = std::make_unique<frmMain>(app, services);
     window->StartUp(arguments);
+    QApplication::processEvents(); // the file named by the arguments opens once the window shows
 }
 
 void WindowTest::openThroughPendingFile(const std::string& path)
