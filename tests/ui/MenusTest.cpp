@@ -210,6 +210,21 @@ TEST_F(WindowTest, AGrownWindowGivesItsRoomToTheListsAndTheOldHeader)
     });
 }
 
+TEST_F(WindowTest, AGrownListDialogGivesItsRoomToTheList)
+{
+    frmList dialog(ListKind::Bfc, {"CERTIFY CCW"}, app.ProgramFolder, dialogs);
+    dialog.show();
+    QApplication::processEvents();
+    auto* values = dialog.findChild<QListWidget*>("lsValues");
+    auto* close = dialog.findChild<QPushButton*>("cmdClose");
+    const QSize before = values->size();
+    const int closeLeft = close->x();
+    dialog.resize(dialog.size() + QSize(200, 150));
+    QApplication::processEvents();
+    EXPECT_EQ(values->size(), before + QSize(200, 150));
+    EXPECT_EQ(close->x(), closeLeft + 200) << "the buttons keep to the list's right";
+}
+
 TEST_F(WindowTest, PreferencesWindowWithAnEmptyStore)
 {
     startUp();
