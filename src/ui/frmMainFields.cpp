@@ -35,11 +35,13 @@ bool leftForAnotherControl(QEvent* event)
     return reason != Qt::ActiveWindowFocusReason && reason != Qt::PopupFocusReason && reason != Qt::MenuBarFocusReason;
 }
 
-// A key pressed with Alt asks for a menu or a button. Ctrl+Alt is AltGr on some keyboards, which
-// types characters.
+// A character key pressed with Alt asks for a menu or a button: it neither types nor picks a
+// list entry. Ctrl+Alt is AltGr on some keyboards, which types characters; Alt+Down still opens a
+// drop-down list.
 bool commandKey(const QKeyEvent& key)
 {
-    return key.modifiers().testFlag(Qt::AltModifier) && !key.modifiers().testFlag(Qt::ControlModifier);
+    return key.modifiers().testFlag(Qt::AltModifier) && !key.modifiers().testFlag(Qt::ControlModifier) &&
+           !key.text().isEmpty() && key.text().front().isPrint();
 }
 
 } // namespace
