@@ -14,7 +14,7 @@ public:
 };
 
 // How far into a file the checks below look: enough for any header, and cheap for any file.
-inline constexpr std::size_t LookedAtBytes = 64 * 1024;
+inline constexpr std::size_t LookedAtBytes = std::size_t{64} * 1024;
 
 // True when content is no text file: a NUL byte among its first 64 KiB, which no text file holds
 // and nearly every binary file does.
