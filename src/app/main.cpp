@@ -2,6 +2,7 @@
 // Quillmark: the window program.
 #include <QApplication>
 #include <QIcon>
+#include <QTimer>
 #include <cstring>
 #include <iostream>
 
@@ -61,5 +62,7 @@ int main(int argc, char** argv)
     // The icon the desktop's theme has for the entry, so window, dock and menu look alike.
     window.setWindowIcon(QIcon::fromTheme(QUILLMARK_APP_ID, window.windowIcon()));
     window.StartUp(application.arguments().mid(1));
+    // Once the window manager has placed the window, so that the preferences show over it.
+    QTimer::singleShot(0, &window, [&window] { window.OfferPreferencesWithoutNames(); });
     return application.exec();
 }

@@ -29,7 +29,7 @@ std::shared_ptr<OpenPart> OpenPart::openIn(std::shared_ptr<const OpenFolder> fol
     if (::fstat(fd.get(), &info) != 0)
         throw OsError(errno, shownPath);
     if (!S_ISREG(info.st_mode))
-        throw PathFileAccessError();
+        throw NoRegularFileError(shownPath, S_ISDIR(info.st_mode));
     return std::make_shared<OpenPart>(std::move(folder), std::move(name), std::move(shownPath), std::move(fd));
 }
 

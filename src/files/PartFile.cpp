@@ -99,7 +99,7 @@ FileBytes::FileBytes(int fd, const std::string& path, const HeadCheck& headCheck
     if (::fstat(fd, &info) != 0)
         throw OsError(errno, path);
     if (!S_ISREG(info.st_mode))
-        throw PathFileAccessError();
+        throw NoRegularFileError(path, S_ISDIR(info.st_mode));
     stamp_ = StampOf(info);
     const auto expected = static_cast<std::size_t>(info.st_size);
     if (headCheck) {

@@ -4,6 +4,7 @@
 #include <cerrno>
 #include <new>
 #include <sys/stat.h>
+#include <system_error>
 
 #include "Folders.h"
 
@@ -15,10 +16,13 @@ bool folderOfPathExists(const std::string& path)
     return ::stat(FolderOf(path).c_str(), &info) == 0 && S_ISDIR(info.st_mode);
 }
 
+// The system's own words for an errno value ("No such file or directory"), safe on any thread.
+std::string systemReason(int errnoValue) { return std::generic_category().message(errnoValue); }
+
 } // namespace
 
-QmError::QmError(int number, std::string description)
-    : std::runtime_error(description), number_(number), description_(std::move(description))
+QmError::QmError(int number, std::string description, std::string detail)
+    : std::runtime_error(description), number_(number), description_(std::move(description)), detail_(std::move(detail))
 {
 }
 
@@ -37,23 +41,32 @@ QmError InputPastEndOfFileError() { return {ErrorNumber::InputPastEndOfFile, "In
 
 QmError OutOfMemoryError() { return {ErrorNumber::OutOfMemory, "Out of memory"}; }
 
-QmError PathFileAccessError() { return {ErrorNumber::PathFileAccessError, "Path/File access error"}; }
+QmError PathFileAccessError(std::string detail)
+{
+    return {ErrorNumber::PathFileAccessError, "Path/File access error", std::move(detail)};
+}
+
+QmError NoRegularFileError(const std::string& path, bool folder)
+{
+    return PathFileAccessError(path + ": " + (folder ? systemReason(EISDIR) : std::string("Not a regular file")));
+}
 
 QmError OsError(int errnoValue, const std::string& path)
 {
+    auto detail = path + ": " + systemReason(errnoValue);
     switch (errnoValue) {
     case ENOENT:
         if (folderOfPathExists(path))
-            return {ErrorNumber::FileNotFound, "File not found"};
-        return {ErrorNumber::PathNotFound, "Path not found"};
-    case ENOTDIR: return {ErrorNumber::PathNotFound, "Path not found"};
-    case EEXIST: return {ErrorNumber::FileAlreadyExists, "File already exists"};
+            return {ErrorNumber::FileNotFound, "File not found", std::move(detail)};
+        return {ErrorNumber::PathNotFound, "Path not found", std::move(detail)};
+    case ENOTDIR: return {ErrorNumber::PathNotFound, "Path not found", std::move(detail)};
+    case EEXIST: return {ErrorNumber::FileAlreadyExists, "File already exists", std::move(detail)};
     case EACCES:
     case EPERM:
-    case EROFS: return {ErrorNumber::PermissionDenied, "Permission denied"};
+    case EROFS: return {ErrorNumber::PermissionDenied, "Permission denied", std::move(detail)};
     case ENOSPC:
-    case EDQUOT: return {ErrorNumber::DiskFull, "Disk full"};
-    case EIO: return {ErrorNumber::DeviceIoError, "Device I/O error"};
-    default: return PathFileAccessError();
+    case EDQUOT: return {ErrorNumber::DiskFull, "Disk full", std::move(detail)};
+    case EIO: return {ErrorNumber::DeviceIoError, "Device I/O error", std::move(detail)};
+    default: return PathFileAccessError(std::move(detail));
     }
 }

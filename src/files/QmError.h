@@ -7,14 +7,18 @@
 // A failure with the classic error number and description that the error reports show.
 class QmError : public std::runtime_error {
 public:
-    QmError(int number, std::string description);
+    // detail names what failed and the system's reason ("/parts/x.dat: Is a directory"); empty
+    // where there is no file to name.
+    QmError(int number, std::string description, std::string detail = {});
 
     int number() const { return number_; }
     const std::string& description() const { return description_; }
+    const std::string& detail() const { return detail_; }
 
 private:
     int number_;
     std::string description_;
+    std::string detail_;
 };
 
 namespace ErrorNumber {
@@ -39,7 +43,9 @@ QmError ErrorOf(const std::exception& failure);
 QmError InputPastEndOfFileError();
 QmError OutOfMemoryError();
 // 75: what the program cannot work on, such as a folder or a device where a file should be.
-QmError PathFileAccessError();
+QmError PathFileAccessError(std::string detail = {});
+// 75 for path, which is a folder, a device or anything else that is no regular file.
+QmError NoRegularFileError(const std::string& path, bool folder);
 
 // Maps an OS error (errno) met while working on path to the classic number and description.
 QmError OsError(int errnoValue, const std::string& path);

@@ -19,8 +19,11 @@ const char* ownerWord(OwnerKind kind)
 
 std::string ErrorReportText(const QmError& error, const Procedure& procedure)
 {
-    return "Error " + std::to_string(error.number()) + " (" + error.description() + ") in procedure " + procedure.name +
-           ownerWord(procedure.kind) + procedure.owner;
+    auto text = "Error " + std::to_string(error.number()) + " (" + error.description() + ") in procedure " +
+                procedure.name + ownerWord(procedure.kind) + procedure.owner;
+    if (!error.detail().empty()) // what an author can act on: which file, and why
+        text += "\r\n" + error.detail();
+    return text;
 }
 
 void ReportError(Dialogs& dialogs, const QmError& error, const Procedure& procedure)

@@ -17,7 +17,8 @@ struct Procedure {
     const char* owner;
 };
 
-// "Error N (description) in procedure P of Modul M": the one place that builds the text.
+// "Error N (description) in procedure P of Modul M": the one place that builds the text. The
+// error's detail, when it has one, follows on a line of its own.
 std::string ErrorReportText(const QmError& error, const Procedure& procedure);
 
 // Shows the report in an OK-only box titled with the program's name.

@@ -294,6 +294,16 @@ private:
     ParseProgress& progress_;
 };
 
+// Text that holds no LDraw line opens only when the user says so. An empty or a binary file is
+// left to the reports that it gets anyway.
+bool mayOpenAsPart(std::string_view content, const std::string& path, Dialogs& dialogs)
+{
+    if (content.empty() || LooksBinary(content) || LooksLikeLDraw(content))
+        return true;
+    return dialogs.message({path + " does not look like an LDraw file. Open it anyway?", ProgramTitle, Buttons::YesNo,
+                            Icon::Question, Answer::No}) == Answer::Yes;
+}
+
 } // namespace
 
 std::string ProgressCaption(std::size_t linesRead)
@@ -382,17 +392,13 @@ bool GetGlobalContent(HeaderData& header, Dialogs& dialogs, ParseProgress& progr
         dialogs.message({notText.what(), ProgramTitle, Buttons::Ok, Icon::Exclamation, Answer::Ok});
         return false;
     } catch (const QmError& error) {
+        // One box for one failure, naming the file and the system's reason.
         ReportError(dialogs, error, IsUnixLineEndProcedure);
-        const bool missing = error.number() == ErrorNumber::FileNotFound || error.number() == ErrorNumber::PathNotFound;
-        if (missing)
-            dialogs.message(
-                {"File " + header.FilePath + " not found!", "Error", Buttons::Ok, Icon::Exclamation, Answer::Ok});
-        else
-            ReportError(dialogs, error, GetGlobalContentProcedure);
         return false;
     }
     try {
-        if (!ParsePartFileContent(header, content->takeBytes(), dialogs, progress))
+        if (!mayOpenAsPart(content->view(), header.FilePath, dialogs) ||
+            !ParsePartFileContent(header, content->takeBytes(), dialogs, progress))
             return false;
         header.Part = std::move(part);
         header.ReadStamp = content->stamp();

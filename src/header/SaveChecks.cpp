@@ -93,7 +93,10 @@ SaveResult CheckHeaderAndSave(HeaderData& h, const SaveContext& context)
         if (!applies(check, context.limitDescription) || !check.fails(h))
             continue;
         if (check.sentence != nullptr) {
-            dialogs.message(StopBox(RefusalText(check.sentence)));
+            auto refusal = RefusalText(check.sentence);
+            if (check.outcome == SaveOutcome::DescriptionTooLong && !context.limitSwitch.empty())
+                refusal += "\r\n" + context.limitSwitch + " lifts this limit when it is cleared.";
+            dialogs.message(StopBox(refusal));
             return {check.outcome, {}};
         }
         if (!askedYes(dialogs, "You have not set your username. Do you want to save anyway?", MissingUserNameTitle))

@@ -65,6 +65,8 @@ struct SaveContext {
     std::function<std::string()> newHeader;
     std::function<void()> recompose;
     bool limitDescription = true; // off: the description may be of any length
+    // Where the user turns the description's limit off, told below its refusal; empty: not told.
+    std::string limitSwitch = {};
     // On: a save that would write what the file holds already writes nothing.
     bool skipUnchanged = false;
     bool dryRun = false;     // everything but the writing

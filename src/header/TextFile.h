@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 #pragma once
 
+#include <cstddef>
 #include <stdexcept>
 #include <string>
 #include <string_view>
@@ -12,6 +13,17 @@ public:
     explicit NotTextFileError(const std::string& path);
 };
 
-// Throws NotTextFileError naming path when content is no text file: a NUL byte among its first
-// 64 KiB, which no text file holds and nearly every binary file does.
+// How far into a file the checks below look: enough for any header, and cheap for any file.
+inline constexpr std::size_t LookedAtBytes = std::size_t{64} * 1024;
+
+// True when content is no text file: a NUL byte among its first 64 KiB, which no text file holds
+// and nearly every binary file does.
+bool LooksBinary(std::string_view content);
+
+// Throws NotTextFileError naming path when content looks binary.
 void EnsureTextFile(std::string_view content, const std::string& path);
+
+// True when the first 64 KiB of content hold an LDraw line: "0", spaces or tabs and a word, or a
+// geometry line of type 1 to 5. Notes or a letter saved as ".dat" hold none, and would open as an empty
+// part whose save puts a part header in front of them.
+bool LooksLikeLDraw(std::string_view content);

@@ -41,6 +41,11 @@ bool MayEditList(ListKind kind, Dialogs& dialogs)
 
 bool TakePreferencesIntoRecord(AppState& app, Services& services, const ToFileText& toFile)
 {
+    if (PreferencesHoldNoName(services.store)) {
+        services.dialogs.message(InformationBox("Your preferences hold no name yet, so the names in this file stay "
+                                                "as they are. Enter yours in Option › Preferences."));
+        return false;
+    }
     const auto answer = services.dialogs.message(QuestionBox(
         "Are you sure to subsitute the existing Real Name, Username and License Type with your values set in the "
         "preferences?",
@@ -51,8 +56,9 @@ bool TakePreferencesIntoRecord(AppState& app, Services& services, const ToFileTe
     auto& h = app.Header;
     for (const auto& [value, field] : {std::pair{&app.Prefs.DefaultRealName, &h.AuthorRealName},
                                        std::pair{&app.Prefs.DefaultUserName, &h.AuthorUserName}})
-        if (const auto bytes = toFile(*value))
-            *field = *bytes;
+        if (!value->empty()) // a name the preferences lack never empties the file's
+            if (const auto bytes = toFile(*value))
+                *field = *bytes;
     const auto& licenses = app.Lists.Licenses;
     if (const auto license = toFile(app.Prefs.DefaultLicense);
         license && std::find(licenses.begin(), licenses.end(), *license) != licenses.end())

@@ -25,8 +25,9 @@ bool MayOpenAnotherFile(const AppState& app, Dialogs& dialogs, const std::functi
 // warning that changing categories may break the library's rules.
 bool MayEditList(ListKind kind, Dialogs& dialogs);
 
-// The "Set Preferences" question. On Yes the preferences are read again and the record takes the
-// stored real name and user name (toFile turns them into the file's encoding, or refuses), and
-// the stored licence when the licence list holds it. False when the user said No.
+// "Set Preferences": the preferences are read again; while they hold no name the user is told so
+// and nothing changes. Otherwise, on Yes to the question, the record takes each stored name that
+// is not empty (toFile turns it into the file's encoding, or refuses), and the stored licence when
+// the licence list holds it. False when nothing was taken.
 using ToFileText = std::function<std::optional<std::string>(const std::string& utf8)>;
 bool TakePreferencesIntoRecord(AppState& app, Services& services, const ToFileText& toFile);

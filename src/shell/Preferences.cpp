@@ -32,6 +32,11 @@ void LadeDefaults(Preferences& preferences, const SettingsStore& store)
     preferences.DefaultLicense = storedText(store, Setting::License);
 }
 
+bool PreferencesHoldNoName(const SettingsStore& store)
+{
+    return storedText(store, Setting::RealName).empty() && storedText(store, Setting::UserName).empty();
+}
+
 bool StoredBackupChoice(const SettingsStore& store) { return storedChoice(store, Setting::Backup); }
 
 bool StoredDescriptionLimit(const SettingsStore& store) { return storedChoice(store, Setting::DescriptionLimit); }

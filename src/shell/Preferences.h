@@ -17,6 +17,9 @@ struct Preferences {
 // Refreshes the three default texts from the store; a value that is blank after trimming is empty.
 void LadeDefaults(Preferences& preferences, const SettingsStore& store);
 
+// True while the store holds neither a real name nor a user name (blank ones count as none).
+bool PreferencesHoldNoName(const SettingsStore& store);
+
 // The stored "Backup" choice: "True" or "Wahr" after trimming means on, a missing key too.
 bool StoredBackupChoice(const SettingsStore& store);
 // The stored "DescriptionLimit" choice, read as "Backup" is.

@@ -1,8 +1,10 @@
 // SPDX-License-Identifier: MIT
 #include "QtDialogs.h"
 
+#include <QEvent>
 #include <QFileDialog>
 #include <QInputDialog>
+#include <QLineEdit>
 #include <QMessageBox>
 
 namespace {
@@ -53,21 +55,67 @@ Answer answerOf(int button, Buttons buttons)
     }
 }
 
+// Shows a dialog centred on the window it belongs to, wherever the window manager would put it:
+// a box far from the window that caused it is easily missed. A window that the window manager
+// places only after the box shows (at start-up) takes the box along. An input box shows its
+// default text with the cursor at its end and nothing selected, so that typing adds to it.
+class PlacedOnShow : public QObject {
+public:
+    PlacedOnShow(QDialog& dialog, QWidget* window) : QObject(&dialog), dialog_(dialog), window_(window)
+    {
+        dialog.installEventFilter(this);
+        if (window != nullptr)
+            window->installEventFilter(this);
+    }
+    ~PlacedOnShow() override
+    {
+        if (window_ != nullptr)
+            window_->removeEventFilter(this);
+    }
+    PlacedOnShow(const PlacedOnShow&) = delete;
+    PlacedOnShow& operator=(const PlacedOnShow&) = delete;
+
+    bool eventFilter(QObject* watched, QEvent* event) override
+    {
+        const bool shown = watched == &dialog_ && event->type() == QEvent::Show;
+        if (shown || (watched == window_ && event->type() == QEvent::Move && dialog_.isVisible()))
+            centre();
+        // The input box selects its text once it shows.
+        if (auto* field = dialog_.findChild<QLineEdit*>(); shown && field != nullptr)
+            QMetaObject::invokeMethod(
+                field, [field] { field->end(false); }, Qt::QueuedConnection);
+        return false;
+    }
+
+private:
+    void centre()
+    {
+        if (window_ != nullptr)
+            dialog_.move(window_->frameGeometry().center() - dialog_.rect().center());
+    }
+
+    QDialog& dialog_;
+    QWidget* window_;
+};
+
 } // namespace
 
 Answer QtDialogs::message(const MessageBox& box)
 {
     QMessageBox dialog(qtIcon(box.icon), text(box.title), text(box.text), qtButtons(box.buttons), parent_);
     dialog.setDefaultButton(qtButton(box.defaultButton));
+    new PlacedOnShow(dialog, parent_); // owned by the dialog
     return answerOf(dialog.exec(), box.buttons);
 }
 
 std::string QtDialogs::input(const std::string& prompt, const std::string& title, const std::string& defaultText)
 {
-    bool accepted = false;
-    const auto typed =
-        QInputDialog::getText(parent_, text(title), text(prompt), QLineEdit::Normal, text(defaultText), &accepted);
-    return accepted ? typed.toStdString() : std::string();
+    QInputDialog dialog(parent_);
+    dialog.setWindowTitle(text(title));
+    dialog.setLabelText(text(prompt));
+    dialog.setTextValue(text(defaultText));
+    new PlacedOnShow(dialog, parent_); // owned by the dialog
+    return dialog.exec() == QDialog::Accepted ? dialog.textValue().toStdString() : std::string();
 }
 
 std::optional<std::string> QtDialogs::openFile(const OpenFileRequest& request)

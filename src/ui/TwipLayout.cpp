@@ -39,14 +39,27 @@ double LayoutScale(const QFont& font)
     return std::max(scale, 1.0);
 }
 
-void WidenToShowCaption(QWidget& control)
+void WidenToShowCaption(QWidget& control, int rightEdge)
 {
     const int needed = widthForCaption(control);
     if (needed <= control.width())
         return;
     // It grows to the right, but where that would pass its window's edge, to the left instead.
     int left = control.x();
-    if (const auto* parent = control.parentWidget())
-        left = std::max(0, std::min(left, parent->width() - needed));
+    if (const auto* parent = control.parentWidget(); parent != nullptr && rightEdge < 0)
+        rightEdge = parent->width();
+    if (rightEdge >= 0)
+        left = std::max(0, std::min(left, rightEdge - needed));
     control.setGeometry(left, control.y(), needed, control.height());
+}
+
+void ShareRoom(std::initializer_list<RoomShare> shares, QSize room)
+{
+    const auto part = [](double share, int extra) { return static_cast<int>(share * extra); };
+    for (const auto& share : shares) {
+        const QRect place = share.control->geometry();
+        share.control->setGeometry(
+            place.x() + part(share.right, room.width()), place.y() + part(share.down, room.height()),
+            place.width() + part(share.wider, room.width()), place.height() + part(share.taller, room.height()));
+    }
 }

@@ -33,9 +33,9 @@ Widget* PlaceChild(QWidget* parent, const char* name, int left, int top, int wid
 }
 
 // Widens a label, button or check box whose twip width is too small for its caption in the
-// window font, just enough to show it whole and never past its parent's right edge; the other
-// controls stay.
-void WidenToShowCaption(QWidget& control);
+// window font, just enough to show it whole and never past its parent's right edge (or past
+// rightEdge, where the parent may grow beyond its design); the other controls stay.
+void WidenToShowCaption(QWidget& control, int rightEdge = -1);
 
 // The same for a control that shows a caption (label, button, check box, frame).
 template <typename Widget>
@@ -86,9 +86,9 @@ void BuildControls(Window& window, QWidget* parent, const Rows& rows)
 }
 
 // Places the controls that BuildControls built from rows again, grown by scale: for a window
-// whose font changed after it was built.
+// whose font changed after it was built. rightEdge as for WidenToShowCaption.
 template <typename Window, typename Rows>
-void LayOutControls(Window& window, const Rows& rows, double scale)
+void LayOutControls(Window& window, const Rows& rows, double scale, int rightEdge = -1)
 {
     for (const auto& row : rows)
         std::visit(
@@ -96,10 +96,20 @@ void LayOutControls(Window& window, const Rows& rows, double scale)
                 QWidget& control = *(window.*member);
                 PlaceAt(control, row.left, row.top, row.width, row.height, scale);
                 if (row.caption != nullptr)
-                    WidenToShowCaption(control);
+                    WidenToShowCaption(control, rightEdge);
             },
             row.member);
 }
+
+// A control's part of the room that a resizable window has beyond its design size: how far it
+// moves right and down, and how much wider and taller it grows, each as a part of that room.
+struct RoomShare {
+    QWidget* control;
+    double right, down, wider, taller;
+};
+
+// Moves and grows each control by its share of room, the extra width and height.
+void ShareRoom(std::initializer_list<RoomShare> shares, QSize room);
 
 // The order in which Tab moves through the controls.
 inline void ChainTabOrder(std::initializer_list<QWidget*> order)

@@ -6,6 +6,7 @@
 #include <QLineEdit>
 #include <QListWidget>
 #include <QPushButton>
+#include <QResizeEvent>
 
 #include "FileText.h"
 #include "TwipLayout.h"
@@ -18,7 +19,8 @@ frmList::frmList(ListKind kind, const StringList& entries, const std::string& pr
     setWindowTitle(QString("List") + InfoOf(kind).captionSuffix);
     setModal(true);
     const double scale = LayoutScale(font());
-    setFixedSize(Pixels(6645, scale), Pixels(4155, scale));
+    setMinimumSize(Pixels(6645, scale), Pixels(4155, scale));
+    resize(minimumSize());
     using Row = ControlRow<frmList, QGroupBox, QListWidget, QPushButton, QLineEdit>;
     static const Row rows[] = {
         {&frmList::Frame1, "Frame1", "Current Values", 120, 840, 4935, 3255},
@@ -85,4 +87,20 @@ void frmList::keyPressEvent(QKeyEvent* event)
         return;
     }
     QDialog::keyPressEvent(event);
+}
+
+// The list takes the room beyond the design size; the buttons keep to its right.
+void frmList::resizeEvent(QResizeEvent* event)
+{
+    QDialog::resizeEvent(event);
+    if (!event->oldSize().isValid())
+        return; // the first size is the design's
+    ShareRoom({{Frame1, 0, 0, 1, 1},
+               {lsValues, 0, 0, 1, 1},
+               {txUpdate, 0, 0, 1, 0},
+               {cmdChange, 1, 0, 0, 0},
+               {cmdAdd, 1, 0, 0, 0},
+               {cmdDelete, 1, 0, 0, 0},
+               {cmdClose, 1, 0, 0, 0}},
+              event->size() - event->oldSize());
 }

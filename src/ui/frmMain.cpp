@@ -14,6 +14,7 @@
 #include <QPushButton>
 #include <QScreen>
 #include <QScrollArea>
+#include <QTimer>
 
 #include "Dialogs.h"
 #include "OpenRoad.h"
@@ -71,7 +72,8 @@ frmMain::frmMain(AppState& app, Services& services, QWidget* parent)
     for (QWidget* field : std::initializer_list<QWidget*>{txPartDescription, txAuthorRealName, txAuthorUserName,
                                                           cbPartTypes, cbLicenses, cbBFCStatement, cbCategory})
         field->installEventFilter(this);
-    layout()->setSizeConstraint(QLayout::SetFixedSize);
+    scroller_->setWidgetResizable(true); // the client fills the window, and scrolls below its design size
+    client_->installEventFilter(this);   // its growth goes to the lists: see placeControls
     layOut();
 }
 
@@ -124,7 +126,8 @@ void frmMain::createControls()
         {&frmMain::Line2, "Line2", nullptr, 0, 10, 9240, 15},
     };
     BuildControls(*this, client_, rows);
-    layOutControls_ = [this](double scale) { LayOutControls(*this, rows, scale); };
+    // Captions widen within the design's width, wherever the window has grown to.
+    layOutControls_ = [this](double scale) { LayOutControls(*this, rows, scale, client_->minimumWidth()); };
     lblLength->setAutoFillBackground(true);
     for (QPlainTextEdit* box : {txNewHeader, txOldHeader}) {
         box->setReadOnly(true);
@@ -146,6 +149,7 @@ void frmMain::createMenus()
         const char* caption;
         void (frmMain::*handler)();
         QKeySequence::StandardKey shortcut = QKeySequence::UnknownKey; // beside the access keys
+        QKeySequence ownShortcut = {};                                 // where no standard key fits
     };
     static const std::pair<const char*, const char*> menus[] = {
         {"MDatei", "F&ile"}, {"MEdit", "&Edit"}, {"MEinstellungen", "&Option"}};
@@ -155,7 +159,7 @@ void frmMain::createMenus()
         {"MDatei", &frmMain::MDateiSpeichern, "MDateiSpeichern", "&Save", &frmMain::MDateiSpeichern_Click,
          QKeySequence::Save},
         {"MDatei", &frmMain::MTrackerCheck, "MTrackerCheck", "Check for the Parts &Tracker",
-         &frmMain::MTrackerCheck_Click},
+         &frmMain::MTrackerCheck_Click, QKeySequence::UnknownKey, QKeySequence(Qt::CTRL | Qt::Key_T)},
         {"MDatei", nullptr, "MDateiTrenner2", nullptr, nullptr},
         {"MDatei", &frmMain::MDateiBeenden, "MDateiBeenden", "E&xit", &frmMain::MDateiBeenden_Click,
          QKeySequence::Quit},
@@ -178,11 +182,26 @@ void frmMain::createMenus()
         }
         auto* action = menu ? menu->addAction(item.caption) : menuBar()->addAction(item.caption);
         action->setObjectName(item.name);
-        action->setShortcuts(shortcutsFor(item.shortcut));
+        auto keys = shortcutsFor(item.shortcut);
+        if (!item.ownShortcut.isEmpty())
+            keys << item.ownShortcut;
+        action->setShortcuts(keys);
         connect(action, &QAction::triggered, this, item.handler);
         this->*item.member = action;
     }
     addRecentFileItems(*menuBar()->findChild<QMenu*>("MDatei"));
+    openFileMenuWithAltF();
+}
+
+// Alt+F opens the File menu as in most programs, beside its own access key Alt+I.
+void frmMain::openFileMenuWithAltF()
+{
+    auto* altF = new QAction(this);
+    altF->setObjectName("MDateiAltF");
+    altF->setShortcut(QKeySequence(Qt::ALT | Qt::Key_F));
+    addAction(altF);
+    connect(altF, &QAction::triggered, this,
+            [this] { menuBar()->setActiveAction(menuBar()->findChild<QMenu*>("MDatei")->menuAction()); });
 }
 
 // The separator and the ten recent-file items at the end of the File menu, hidden until used.
@@ -216,29 +235,60 @@ void frmMain::setTabOrder()
 // theme may set its font once the window exists).
 void frmMain::layOut()
 {
-    const double scale = LayoutScale(font());
-    client_->setFixedSize(Pixels(ClientWidth, scale), Pixels(ClientHeight, scale)); // first: captions grow inside it
-    layOutControls_(scale);
+    scale_ = LayoutScale(font());
+    client_->setMinimumSize(Pixels(ClientWidth, scale_), Pixels(ClientHeight, scale_));
+    placeControls();
+    fitOnScreen();
+}
+
+// The controls at their design places, and the room the window has beyond its design size shared
+// out: the keyword, history and comment lists and the old header grow into it, the controls
+// beside and below them move along, and everything else stays where it is.
+void frmMain::placeControls()
+{
+    layOutControls_(scale_);
+    // Half of the width to the keyword and history lists, half to the comment list; a quarter of
+    // the height to each of the keyword and history lists, half to the comments and the old header.
+    ShareRoom({{lsKeyWords, 0, 0, 0.5, 0.25},
+               {cmdEdit, 0.5, 0, 0, 0},
+               {cmdAdd, 0.5, 0, 0, 0},
+               {cmdDelete, 0.5, 0, 0, 0},
+               {Label10, 0, 0.25, 0, 0},
+               {lsHistory, 0, 0.25, 0.5, 0.25},
+               {cmdHistoryEdit, 0.5, 0.25, 0, 0},
+               {cmdHistoryAdd, 0.5, 0.25, 0, 0},
+               {cmdHistoryDelete, 0.5, 0.25, 0, 0},
+               {Label11, 0.5, 0, 0, 0},
+               {lsComments, 0.5, 0, 0.5, 0.5},
+               {cmdCommentsEdit, 0.5, 0.5, 0, 0},
+               {cmdCommentsAdd, 0.5, 0.5, 0, 0},
+               {cmdCommentsDelete, 0.5, 0.5, 0, 0},
+               {Label7, 0, 0.5, 0, 0},
+               {txNewHeader, 0, 0.5, 0, 0},
+               {Label5, 0, 0.5, 0, 0},
+               {txOldHeader, 0, 0.5, 1, 0.5}},
+              (client_->size() - client_->minimumSize()).expandedTo(QSize(0, 0)));
     const int width = client_->width();
     Line1->setGeometry(0, 0, width, 1);
     Line2->setGeometry(0, 1, width, 1);
     lblStatuszeile->setGeometry(0, client_->height() - lblStatuszeile->height(), width, lblStatuszeile->height());
-    fitOnScreen();
 }
 
-// A window larger than the screen opens at the screen's size, its client area scrolling. The
-// window manager's frame counts once it is known: see moveEvent.
+// The design size is the window's smallest, and its first; on a screen too small for it, the
+// screen's size, the client area scrolling. The window manager's frame counts once it is known:
+// see moveEvent.
 void frmMain::fitOnScreen()
 {
-    QSize room = client_->size();
-    if (const QScreen* shownOn = screen()) {
-        const QSize decoration(fitFrame_.width(), fitFrame_.height() + menuBar()->sizeHint().height());
-        room = room.boundedTo(shownOn->availableGeometry().size() - decoration);
+    QSize room = client_->minimumSize();
+    if (const QScreen* shownOn = screen())
+        room =
+            room.boundedTo(shownOn->availableGeometry().size() - fitFrame_ - QSize(0, menuBar()->sizeHint().height()));
+    const bool first = scroller_->minimumSize() == QSize(0, 0);
+    scroller_->setMinimumSize(room); // the window's layout adds the menu bar, as it is drawn
+    if (first) {
+        layout()->activate();
+        resize(minimumSize());
     }
-    scroller_->setFixedSize(room);
-    const auto bars = room == client_->size() ? Qt::ScrollBarAlwaysOff : Qt::ScrollBarAsNeeded;
-    scroller_->setHorizontalScrollBarPolicy(bars);
-    scroller_->setVerticalScrollBarPolicy(bars);
 }
 
 // The window manager frames the window only after it shows, and moves it then; a move that leaves
@@ -288,8 +338,9 @@ void frmMain::StartUp(const QStringList& arguments)
     app_.PendingFile =
         arguments.isEmpty() ? std::string() : AbsolutePath(QFile::encodeName(arguments.first()).toStdString());
     show();
+    // Once the window manager has placed the window, so that what the open tells shows over it.
     if (!app_.PendingFile.empty())
-        MDateiOeffnen_Click();
+        QTimer::singleShot(0, this, [this] { MDateiOeffnen_Click(); });
 }
 
 void frmMain::MInfo_Click()

@@ -52,6 +52,9 @@ public:
     void MEditBFCStatement_Click();
     void MEditLicense_Click();
     void MEinstellDefault_Click();
+    // While the preferences hold no real name and no user name: the preferences window, saying
+    // what the names are for. Run once the window shows.
+    void OfferPreferencesWithoutNames();
     void cmdSetPreferences_Click();
 
     // Recomposes the new header from the record, refreshes the length display, marks the change.
@@ -75,9 +78,11 @@ private:
     void createControls();
     void createMenus();
     void addRecentFileItems(QMenu& menu);
+    void openFileMenuWithAltF();
     void setTabOrder();
     void connectHandlers();
     void layOut();
+    void placeControls();
     void fitOnScreen();
 
     // Opening.
@@ -120,18 +125,33 @@ private:
     void FillKeywordList();
     void FillCommentList();
     void FillHistoryList();
-    void addLine(EntryList& list, const char* prompt, const char* title, const std::string& defaultText);
+    // The input box of a list's Add and Edit; history lines are held to the Parts Tracker's form.
+    struct LineForm {
+        const char* prompt;
+        const char* title;
+        bool history = false;
+    };
+    std::string askForLine(const LineForm& form, const std::string& defaultText);
+    void addLine(EntryList& list, const LineForm& form, const std::string& defaultText);
     void fillLineList(QListWidget& box, const EntryList& list);
-    void editLine(EntryList& list, QListWidget& box, const char* prompt, const char* title);
+    void editLine(EntryList& list, QListWidget& box, const LineForm& form);
     void deleteLine(EntryList& list, QListWidget& box);
     void refillLists();
 
+    // The Parts Tracker's view of the file as it would be saved.
+    std::vector<TrackerFinding> trackerFindings(const std::function<void(const std::string&)>& report);
+    QWidget* fieldOf(const TrackerFinding& finding) const;
+    bool focusFieldOf(const TrackerFinding& finding);
+    QString trackerSummary();
+
+    void showPreferences(bool explainNames);
     void editStandardList(ListKind kind, QComboBox& combo, const char* handler);
     std::optional<std::string> toFile(const std::string& utf8);
 
     AppState& app_;
     Services& services_;
     std::function<void(double scale)> layOutControls_; // places the controls for a font
+    double scale_ = 1;                                 // the layout's growth with the window font
     QSize fitFrame_{0, 0};                             // the window manager's frame as fitOnScreen knew it
     std::string baseTitle_;
     std::string newHeaderText_;
@@ -181,7 +201,7 @@ private:
     QFrame* Line1;
     QFrame* Line2;
     QWidget* client_;       // every control above lies on it
-    QScrollArea* scroller_; // around the client, scrolling only on a screen too small for it
+    QScrollArea* scroller_; // around the client, scrolling only in a window smaller than its design
 
     QAction* MDateiOeffnen;
     QAction* MDateiSpeichern;

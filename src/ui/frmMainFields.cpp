@@ -35,6 +35,15 @@ bool leftForAnotherControl(QEvent* event)
     return reason != Qt::ActiveWindowFocusReason && reason != Qt::PopupFocusReason && reason != Qt::MenuBarFocusReason;
 }
 
+// A character key pressed with Alt asks for a menu or a button: it neither types nor picks a
+// list entry. Ctrl+Alt is AltGr on some keyboards, which types characters; Alt+Down still opens a
+// drop-down list.
+bool commandKey(const QKeyEvent& key)
+{
+    return key.modifiers().testFlag(Qt::AltModifier) && !key.modifiers().testFlag(Qt::ControlModifier) &&
+           !key.text().isEmpty() && key.text().front().isPrint();
+}
+
 } // namespace
 
 void frmMain::connectHandlers()
@@ -48,24 +57,23 @@ void frmMain::connectHandlers()
             if (index >= 0)
                 updateComboField(*combo, app_.Header.*field);
         });
-    connect(cmdAdd, &QPushButton::clicked, this, [this] {
-        addLine(app_.Header.Keywords, "Please enter your Keyword with comma separated.", "Keywords", "");
-    });
-    connect(cmdEdit, &QPushButton::clicked, this, [this] {
-        editLine(app_.Header.Keywords, *lsKeyWords, "Please change your Keywords like you wish.", "Keywords");
-    });
+    static const LineForm keywordAdd{"Please enter your Keyword with comma separated.", "Keywords"};
+    static const LineForm keywordEdit{"Please change your Keywords like you wish.", "Keywords"};
+    static const LineForm commentAdd{"Please enter your Comment", "Comment"};
+    static const LineForm commentEdit{"Please enter Comments", "Comments"};
+    static const LineForm history{HistoryPrompt, "History", true};
+    connect(cmdAdd, &QPushButton::clicked, this, [this] { addLine(app_.Header.Keywords, keywordAdd, ""); });
+    connect(cmdEdit, &QPushButton::clicked, this, [this] { editLine(app_.Header.Keywords, *lsKeyWords, keywordEdit); });
     connect(cmdDelete, &QPushButton::clicked, this, [this] { deleteLine(app_.Header.Keywords, *lsKeyWords); });
-    connect(cmdCommentsAdd, &QPushButton::clicked, this,
-            [this] { addLine(app_.Header.Comments, "Please enter your Comment", "Comment", ""); });
+    connect(cmdCommentsAdd, &QPushButton::clicked, this, [this] { addLine(app_.Header.Comments, commentAdd, ""); });
     connect(cmdCommentsEdit, &QPushButton::clicked, this,
-            [this] { editLine(app_.Header.Comments, *lsComments, "Please enter Comments", "Comments"); });
+            [this] { editLine(app_.Header.Comments, *lsComments, commentEdit); });
     connect(cmdCommentsDelete, &QPushButton::clicked, this, [this] { deleteLine(app_.Header.Comments, *lsComments); });
     connect(cmdHistoryAdd, &QPushButton::clicked, this, [this] {
-        addLine(app_.Header.History, HistoryPrompt, "History",
-                HistoryStub(services_.clock.now(), app_.Prefs.DefaultUserName));
+        addLine(app_.Header.History, history, HistoryStub(services_.clock.now(), app_.Prefs.DefaultUserName));
     });
     connect(cmdHistoryEdit, &QPushButton::clicked, this,
-            [this] { editLine(app_.Header.History, *lsHistory, HistoryPrompt, "History"); });
+            [this] { editLine(app_.Header.History, *lsHistory, history); });
     connect(cmdHistoryDelete, &QPushButton::clicked, this, [this] { deleteLine(app_.Header.History, *lsHistory); });
     connect(lsKeyWords, &QListWidget::itemDoubleClicked, cmdEdit, [this] { cmdEdit->click(); });
     connect(lsComments, &QListWidget::itemDoubleClicked, cmdCommentsEdit, [this] { cmdCommentsEdit->click(); });
@@ -75,10 +83,16 @@ void frmMain::connectHandlers()
 
 bool frmMain::eventFilter(QObject* watched, QEvent* event)
 {
+    if (watched == client_ && event->type() == QEvent::Resize && layOutControls_) {
+        placeControls();
+        return false;
+    }
     const std::pair<QLineEdit*, std::string HeaderData::*> boxes[] = {{txPartDescription, &HeaderData::PartDescription},
                                                                       {txAuthorRealName, &HeaderData::AuthorRealName},
                                                                       {txAuthorUserName, &HeaderData::AuthorUserName}};
     if (event->type() == QEvent::KeyPress) {
+        if (commandKey(*static_cast<QKeyEvent*>(event)))
+            return true; // a key meant for a menu or a button, which found none, types nothing either
         const auto key = static_cast<QKeyEvent*>(event)->key();
         keysPressedInBox_.insert({watched, key});
         if (key == Qt::Key_Return || key == Qt::Key_Enter)

@@ -3,7 +3,6 @@
 #include <QComboBox>
 #include <QLineEdit>
 
-#include "ColourSource.h"
 #include "Dialogs.h"
 #include "DocumentQuestions.h"
 #include "ErrorReport.h"
@@ -12,7 +11,6 @@
 #include "frmList.h"
 #include "frmMain.h"
 #include "frmOption.h"
-#include "frmTracker.h"
 
 namespace {
 
@@ -46,33 +44,24 @@ void frmMain::editStandardList(ListKind kind, QComboBox& combo, const char* hand
     }
 }
 
-void frmMain::MTrackerCheck_Click()
-{
-    if (openInProgress())
-        return;
-    try {
-        const auto report = [this](const std::string& text) {
-            services_.dialogs.message({text, ProgramTitle, Buttons::Ok, Icon::Exclamation, Answer::Ok});
-        };
-        const auto builtIn = ReadBuiltInColours(DataFileOfThisProgram(app_.ProgramFolder, BuiltInColoursFile));
-        ColourSource colours(builtIn, "", report);
-        const auto& codes = colours.forPart(app_.Header.FilePath, report);
-        const auto categories = EntriesOf(app_.Lists, ListKind::Category);
-        const auto findings = CheckRecordForTracker(app_.Header, newHeaderText_, categories, codes);
-        const auto repair = [&](const std::set<std::string>& ids) { return fixForTracker(ids, categories, codes); };
-        frmTracker dialog(findings, QString::fromStdString(app_.Header.FilePath), this, repair);
-        dialog.exec();
-    } catch (const std::exception& error) {
-        ReportError(services_.dialogs, ErrorOf(error), {"MTrackerCheck_Click", OwnerKind::Formular, "frmMain"});
-    }
-}
-
 void frmMain::MEinstellDefault_Click()
 {
-    if (openInProgress())
-        return;
+    if (!openInProgress())
+        showPreferences(false);
+}
+
+void frmMain::OfferPreferencesWithoutNames()
+{
+    if (PreferencesHoldNoName(services_.store))
+        showPreferences(true);
+}
+
+void frmMain::showPreferences(bool explainNames)
+{
     const auto form = OpenPreferencesForm(app_.Prefs, services_.store);
     frmOption dialog(form, displayTexts(app_.Lists.Licenses), this);
+    if (explainNames)
+        dialog.explainNames();
     if (dialog.exec() == QDialog::Accepted)
         SavePreferencesForm(dialog.form(), app_.Prefs, services_.store);
     showLength(); // the limit may have changed

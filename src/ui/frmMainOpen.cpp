@@ -23,6 +23,7 @@
 #include "Paths.h"
 #include "WindowProgress.h"
 #include "frmMain.h"
+#include "frmOption.h"
 
 namespace {
 
@@ -235,9 +236,13 @@ void frmMain::MDateiSpeichern_Click()
 
 SaveResult frmMain::checkHeaderAndSave()
 {
-    const SaveContext context{services_.dialogs,           services_.clock,
-                              app_.Prefs.MakeBackup,       [this] { return newHeaderText_; },
-                              [this] { MakeNewHeader(); }, app_.Prefs.LimitDescription};
+    const SaveContext context{services_.dialogs,
+                              services_.clock,
+                              app_.Prefs.MakeBackup,
+                              [this] { return newHeaderText_; },
+                              [this] { MakeNewHeader(); },
+                              app_.Prefs.LimitDescription,
+                              std::string("Option › Preferences › ") + DescriptionLimitCaption};
     auto result = CheckHeaderAndSave(app_.Header, context);
     if (result.outcome == SaveOutcome::DescriptionTooLong)
         showDescriptionTooLong();
@@ -251,7 +256,7 @@ void frmMain::showSaved(const std::string& backupPath)
     std::string status = "Saved " + app_.Header.FilePath;
     if (!backupPath.empty())
         status += " (backup " + DateiNurName(backupPath, services_.dialogs) + ")";
-    lblStatuszeile->setText(QFile::decodeName(QByteArray::fromStdString(status)));
+    lblStatuszeile->setText(QFile::decodeName(QByteArray::fromStdString(status)) + "; " + trackerSummary());
     showModified();
 }
 

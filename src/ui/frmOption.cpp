@@ -27,8 +27,7 @@ frmOption::frmOption(const PreferencesForm& form, const QStringList& sortedLicen
         {&frmOption::cbLicenses, "cbLicenses", nullptr, 1560, 960, 4455, 315},
         {&frmOption::Label2_3, "Label2_3", "Liscense Type:", 120, 960, 1335, 255},
         {&frmOption::chkBackup, "chkBackup", "Backup file", 120, 1440, 1695, 255},
-        {&frmOption::chkDescriptionLimit, "chkDescriptionLimit", "Limit Part Description to 64 characters", 120, 1800,
-         4455, 255},
+        {&frmOption::chkDescriptionLimit, "chkDescriptionLimit", DescriptionLimitCaption, 120, 1800, 4455, 255},
     };
     BuildControls(*this, this, rows);
     cmdSave->setDefault(true);
@@ -53,4 +52,13 @@ PreferencesForm frmOption::form() const
     return {txRealName->text().toStdString(), txUserName->text().toStdString(),
             cbLicenses->currentIndex() < 0 ? std::string() : cbLicenses->currentText().toStdString(),
             chkBackup->isChecked(), chkDescriptionLimit->isChecked()};
+}
+
+void frmOption::explainNames()
+{
+    const double scale = LayoutScale(font());
+    PlaceCaptioned<QLabel>(this, "lblNamesUse",
+                           "Your names go into the Author line of the parts you save and into new History lines.", 120,
+                           2160, 7215, 255, scale);
+    setFixedSize(width(), Pixels(2520, scale));
 }

@@ -11,6 +11,9 @@ class QLabel;
 class QLineEdit;
 class QPushButton;
 
+// The check box that limits the description, named where a refusal tells how to lift the limit.
+inline constexpr const char* DescriptionLimitCaption = "Limit Part Description to 64 characters";
+
 // The preferences window: the author's names, default licence, backup and description-limit choices.
 class frmOption : public QDialog {
     Q_OBJECT
@@ -20,6 +23,9 @@ public:
 
     // What the window holds now, for saving.
     PreferencesForm form() const;
+
+    // One line more, under the others: what the names are used for.
+    void explainNames();
 
 private:
     QLabel* Label1;

@@ -5,6 +5,7 @@
 #include <QGuiApplication>
 #include <QHBoxLayout>
 #include <QHeaderView>
+#include <QKeyEvent>
 #include <QLabel>
 #include <QPushButton>
 #include <QTableWidget>
@@ -85,11 +86,47 @@ frmTracker::frmTracker(const std::vector<TrackerFinding>& findings, const QStrin
     fillTable(findings);
     connect(cmdCopy, &QPushButton::clicked, this, [this] { QGuiApplication::clipboard()->setText(findingsText()); });
     connect(cmdClose, &QPushButton::clicked, this, &QDialog::accept);
+    tbFindings->installEventFilter(this);
+    connect(tbFindings, &QTableWidget::cellDoubleClicked, this, [this](int row) { findingDoubleClicked(row); });
+}
+
+void frmTracker::leadToFields(std::function<bool(const TrackerFinding&)> showField)
+{
+    showField_ = std::move(showField);
+}
+
+void frmTracker::findingDoubleClicked(int row)
+{
+    const auto index = tbFindings->item(row, LevelColumn)->data(Qt::UserRole).toULongLong();
+    const auto& finding = findings_[static_cast<std::size_t>(index)];
+    if (finding.line == 0 && showField_ && showField_(finding))
+        accept();
+}
+
+bool frmTracker::eventFilter(QObject* watched, QEvent* event)
+{
+    // The table's own Ctrl+C copies one cell.
+    if (watched == tbFindings && event->type() == QEvent::KeyPress &&
+        static_cast<QKeyEvent*>(event)->matches(QKeySequence::Copy)) {
+        copySelectedRows();
+        return true;
+    }
+    return QDialog::eventFilter(watched, event);
+}
+
+void frmTracker::copySelectedRows() const
+{
+    QList<int> rows;
+    for (const auto& selected : tbFindings->selectionModel()->selectedRows())
+        rows << selected.row();
+    std::sort(rows.begin(), rows.end());
+    QGuiApplication::clipboard()->setText(rowsText(rows));
 }
 
 void frmTracker::fillTable(std::vector<TrackerFinding> findings)
 {
     std::stable_sort(findings.begin(), findings.end(), listedBefore);
+    findings_ = findings;
     tbFindings->setSortingEnabled(false); // rows filled again stay where they are put
     tbFindings->setColumnCount(5);
     tbFindings->setHorizontalHeaderLabels({"Level", "Id", "Line", "Fix", "Message"});
@@ -102,7 +139,9 @@ void frmTracker::fillTable(std::vector<TrackerFinding> findings)
     tbFindings->horizontalHeader()->setStretchLastSection(true);
     for (int row = 0; row < tbFindings->rowCount(); ++row) {
         const auto& finding = findings[static_cast<std::size_t>(row)];
-        tbFindings->setItem(row, LevelColumn, new QTableWidgetItem(LevelText(finding.level)));
+        auto* level = new QTableWidgetItem(LevelText(finding.level));
+        level->setData(Qt::UserRole, row); // the row's finding, wherever sorting moves the row
+        tbFindings->setItem(row, LevelColumn, level);
         tbFindings->setItem(row, IdColumn, new QTableWidgetItem(QString::fromStdString(finding.id)));
         tbFindings->setItem(row, LineColumn, new LineItem(finding.line));
         tbFindings->setItem(row, MessageColumn, new QTableWidgetItem(QString::fromStdString(finding.text)));
@@ -118,8 +157,16 @@ void frmTracker::fillTable(std::vector<TrackerFinding> findings)
 
 QString frmTracker::findingsText() const
 {
+    QList<int> rows;
+    for (int row = 0; row < tbFindings->rowCount(); ++row)
+        rows << row;
+    return rowsText(rows);
+}
+
+QString frmTracker::rowsText(const QList<int>& rows) const
+{
     QString text = filePath_ + '\n';
-    for (int row = 0; row < tbFindings->rowCount(); ++row) {
+    for (const int row : rows) {
         const auto line = tbFindings->item(row, LineColumn)->text();
         text += tbFindings->item(row, LevelColumn)->text() + ' ' + tbFindings->item(row, IdColumn)->text() + ": " +
                 (line.isEmpty() ? QString() : "line " + line + ": ") + tbFindings->item(row, MessageColumn)->text() +

@@ -31,6 +31,13 @@ public:
     // The file's path, then one line per finding in the table's order: level, id, message.
     QString findingsText() const;
 
+    // A double-click on a finding about the whole file hands it to showField; the dialog closes
+    // when showField found where to lead the user.
+    void leadToFields(std::function<bool(const TrackerFinding&)> showField);
+
+protected:
+    bool eventFilter(QObject* watched, QEvent* event) override;
+
 private:
     void fillTable(std::vector<TrackerFinding> findings);
     void addFixButtons(QHBoxLayout& buttons);
@@ -38,7 +45,13 @@ private:
     void cmdFix_Click();
     void cmdFixAll_Click();
     void showRepaired(const std::set<std::string>& ids);
+    QString rowsText(const QList<int>& rows) const;
+    // Ctrl+C in the table: the selected rows, worded as Copy words them.
+    void copySelectedRows() const;
+    void findingDoubleClicked(int row);
 
+    std::vector<TrackerFinding> findings_; // in the order of filling; each row keeps its index
+    std::function<bool(const TrackerFinding&)> showField_;
     QString filePath_;
     QLabel* lblVerdict;
     QTableWidget* tbFindings;

@@ -47,6 +47,7 @@ TEST_F(PartFileParse, TheFirstLineEndDecidesHowTheFileIsRead)
     EXPECT_EQ(open("0 Brick\r0 Name: b.dat\r1 x").Body, "1 x");
     EXPECT_EQ(header.PartName, "b.dat");
     for (const auto* lineEndsOnly : {"\r\n\r\n\r", "\n\n"}) {
+        dialogs.expectMessage(Answer::Yes); // no LDraw line: opened on request
         EXPECT_EQ(open(lineEndsOnly).OldHeader, "");
         EXPECT_EQ(header.Body, "");
     }
@@ -62,7 +63,7 @@ TEST_F(PartFileParse, EmptyFileGivesEmptyRecordAndTheLineEndCheckReport)
               "Error 62 (Input past end of file) in procedure IsUnixLineEnd of Modul modUNIX");
 }
 
-TEST_F(PartFileParse, MissingFileIsReportedByTheLineEndCheckAndAsNotFound)
+TEST_F(PartFileParse, MissingFileIsReportedOnceWithItsPathAndTheSystemsReason)
 {
     const std::pair<const char*, std::string> cases[] = {{"missing.dat", "Error 53 (File not found)"},
                                                          {"gone/missing.dat", "Error 76 (Path not found)"}};
@@ -70,11 +71,10 @@ TEST_F(PartFileParse, MissingFileIsReportedByTheLineEndCheckAndAsNotFound)
         header.FilePath = dir.file(name);
         dialogs = ScriptedDialogs();
         dialogs.expectMessage(Answer::Ok);
-        dialogs.expectMessage(Answer::Ok);
         GetGlobalContent(header, dialogs, progress);
-        ASSERT_EQ(dialogs.messages.size(), 2u);
-        EXPECT_EQ(dialogs.messages[0].text, report + " in procedure IsUnixLineEnd of Modul modUNIX");
-        EXPECT_EQ(dialogs.messages[1].text, "File " + header.FilePath + " not found!");
+        ASSERT_EQ(dialogs.messages.size(), 1u);
+        EXPECT_EQ(dialogs.messages[0].text, report + " in procedure IsUnixLineEnd of Modul modUNIX\r\n" +
+                                                header.FilePath + ": No such file or directory");
     }
 }
 

@@ -158,7 +158,8 @@ TEST_F(ListEditing, UnwritableFileIsReportedAndTheDialogStays)
     dialogs.expectMessage(Answer::Ok);
     EXPECT_FALSE(list.close());
     EXPECT_EQ(dialogs.messages.back().text,
-              "Error 70 (Permission denied) in procedure cmdClose_Click of Formular frmList");
+              "Error 70 (Permission denied) in procedure cmdClose_Click of Formular frmList\r\n" + path +
+                  ": Permission denied");
     EXPECT_EQ(ReadBytes(path), "A\r\n");
     EXPECT_TRUE(list.ListChanged());
 }

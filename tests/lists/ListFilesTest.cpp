@@ -34,7 +34,8 @@ TEST(ListFiles, MissingOrHugeFileIsReportedAndGivesAnEmptyList)
     ASSERT_EQ(dialogs.messages.size(), 3u);
     EXPECT_EQ(dialogs.messages[0].text, "Error 75 (The list file " + huge +
                                             " is larger than 1 MB) in procedure LoadPartTypes of Modul modCategory");
-    EXPECT_EQ(dialogs.messages[1].text, "Error 53 (File not found) in procedure LoadBFC of Modul modCategory");
+    EXPECT_EQ(dialogs.messages[1].text, "Error 53 (File not found) in procedure LoadBFC of Modul modCategory\r\n" +
+                                            (dir.path() / "bfc.txt").string() + ": No such file or directory");
 }
 
 TEST(ListFiles, WriterPutsCrLfAfterEveryEntry)

@@ -97,7 +97,7 @@ TEST_F(DocumentQuestions, SetPreferencesTakesTheStoredValuesOnYes)
     dialogs.expectMessage(Answer::Yes);
     EXPECT_TRUE(TakePreferencesIntoRecord(app, services, asIs));
     EXPECT_EQ(app.Header.AuthorRealName, "Jane Doe");
-    EXPECT_EQ(app.Header.AuthorUserName, "");
+    EXPECT_EQ(app.Header.AuthorUserName, "sam") << "a user name the preferences lack leaves the record's";
     EXPECT_EQ(app.Header.License, "L") << "a licence that no entry matches leaves the record's";
 }
 

@@ -199,6 +199,7 @@ TEST_F(LineListTest, EditAndDeleteActOnTheSelectedRowOnly)
     EXPECT_FALSE(app.Header.FileChanged) << "nothing selected, nothing happens";
     history->setCurrentRow(2);
     dialogs.expectInput("  Z ");
+    dialogs.expectMessage(Answer::Yes); // kept, though the Parts Tracker would refuse it
     child<QPushButton>("cmdHistoryEdit")->click();
     EXPECT_EQ(dialogs.inputsShown[0].defaultText, "X");
     EXPECT_EQ(app.Header.History, (EntryList{"X", "Y", "Z"}));
@@ -213,10 +214,10 @@ TEST_F(LineListTest, AddTakesOneEntryAndHistoryOffersTodaysStub)
 {
     app.Prefs.DefaultUserName = "jdoe";
     clock.set({2008, 3, 5, 10, 0, 0});
-    dialogs.expectInput("2008-03-05 [jdoe] ");
+    dialogs.expectInput("2008-03-05 [jdoe] Changed licence");
     child<QPushButton>("cmdHistoryAdd")->click();
     EXPECT_EQ(dialogs.inputsShown[0].defaultText, "2008-03-05 [jdoe] ");
-    EXPECT_EQ(app.Header.History[app.Header.History.size() - 1], "2008-03-05 [jdoe]");
+    EXPECT_EQ(app.Header.History[app.Header.History.size() - 1], "2008-03-05 [jdoe] Changed licence");
     dialogs.expectInput("a, b, c");
     child<QPushButton>("cmdAdd")->click();
     dialogs.expectInput("   ");
@@ -225,6 +226,27 @@ TEST_F(LineListTest, AddTakesOneEntryAndHistoryOffersTodaysStub)
     EXPECT_TRUE(app.Header.Comments.empty());
 }
 
+// A history line out of the form the Parts Tracker takes is pointed out before it is taken: No
+// gives the box back with the text to mend, Yes keeps it.
+TEST_F(LineListTest, HistoryLinesTheTrackerWouldRefuseAreAskedAbout)
+{
+    dialogs.expectInput("2008-03-05 [] Changed licence to CC BY 4.0");
+    dialogs.expectMessage(Answer::No);
+    dialogs.expectInput("2008-03-05 {Jane Doe} Changed licence to CC BY 4.0");
+    child<QPushButton>("cmdHistoryAdd")->click();
+    ASSERT_EQ(dialogs.inputsShown.size(), 2u);
+    EXPECT_EQ(dialogs.inputsShown[1].defaultText, "2008-03-05 [] Changed licence to CC BY 4.0");
+    EXPECT_EQ(dialogs.messages.size(), 1u);
+    EXPECT_EQ(app.Header.History[3], "2008-03-05 {Jane Doe} Changed licence to CC BY 4.0");
+    history->setCurrentRow(3);
+    dialogs.expectInput("Changed licence to CC BY 4.0");
+    dialogs.expectMessage(Answer::Yes);
+    child<QPushButton>("cmdHistoryEdit")->click();
+    EXPECT_EQ(dialogs.messages.back().defaultButton, Answer::No);
+    EXPECT_EQ(app.Header.History[3], "Changed licence to CC BY 4.0");
+}
+
+// The refusal names the preference that lifts the limit.
 TEST_F(WindowTest, SaveRefusesALongDescriptionAndSelectsItsTail)
 {
     startUp();
@@ -237,6 +259,9 @@ TEST_F(WindowTest, SaveRefusesALongDescriptionAndSelectsItsTail)
     QTest::keyClick(description, Qt::Key_End);
     dialogs.expectMessage(Answer::Ok);
     window->MDateiSpeichern_Click();
+    EXPECT_EQ(dialogs.messages.back().text,
+              "Length of the part description is limited to 64 character!\r\nSaving the file is not possible\r\n"
+              "Option › Preferences › Limit Part Description to 64 characters lifts this limit when it is cleared.");
     EXPECT_EQ(description->selectedText(), QString(6, 'd'));
     EXPECT_EQ(text("lblLength"), "Length: 70");
     EXPECT_EQ(ReadBytes(path), GoodPart);

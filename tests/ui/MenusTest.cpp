@@ -6,6 +6,7 @@
 #include <QLabel>
 #include <QLineEdit>
 #include <QListWidget>
+#include <QMenuBar>
 #include <QMimeData>
 #include <QPushButton>
 #include <QRegularExpression>
@@ -13,6 +14,8 @@
 #include <QTableWidget>
 #include <QTest>
 #include <filesystem>
+#include <map>
+#include <sys/stat.h>
 
 #include "StandardLists.h"
 #include "WindowFixture.h"
@@ -96,6 +99,34 @@ TEST_F(ListMenuTest, TrackerCheckShowsTheFindingsAndChangesNothing)
     EXPECT_FALSE(app.Header.FileChanged);
 }
 
+// Ctrl+T opens the Tracker's findings; a double-click on one about the header closes them and puts
+// the focus in its field. After a save the status line tells what the Tracker would say.
+TEST_F(WindowTest, TrackerFindingsLeadToTheirFieldsAndEverySaveCountsThem)
+{
+    startUp();
+    auto refused = GoodPart;
+    refused.replace(refused.find("CERTIFY CCW"), 11, "CERTIFY CW").replace(refused.find("Licensed under"), 14, "Mine");
+    openThroughPendingFile(part("3001.dat", refused));
+    window->activateWindow();
+    ASSERT_TRUE(QTest::qWaitForWindowActive(window.get()));
+    child<QWidget>("txAuthorUserName")->setFocus();
+    whenDialogShows<frmTracker>([](frmTracker& dialog) {
+        auto* table = dialog.findChild<QTableWidget*>("tbFindings");
+        const auto licence = table->findItems("license.approved", Qt::MatchExactly);
+        ASSERT_EQ(licence.size(), 1);
+        const QPoint finding = table->visualItemRect(licence[0]).center();
+        QTest::mouseClick(table->viewport(), Qt::LeftButton, {}, finding); // a double-click's first click
+        QTest::mouseDClick(table->viewport(), Qt::LeftButton, {}, finding);
+        EXPECT_FALSE(dialog.isVisible());
+        dialog.reject(); // ends the test rather than waiting, should the double-click not have closed it
+    });
+    QTest::keyClick(window.get(), Qt::Key_T, Qt::ControlModifier);
+    EXPECT_EQ(window->focusWidget(), child<QWidget>("cbLicenses"));
+    app.Prefs.MakeBackup = false;
+    window->MDateiSpeichern_Click();
+    EXPECT_EQ(text("lblStatuszeile"), "Saved " + app.Header.FilePath + "; Parts Tracker: 2 errors, 1 warning (Ctrl+T)");
+}
+
 // Two controls of one parent that cover each other by more than the design's own one-pixel
 // touches, grown with the font.
 bool overlap(const QWidget& a, const QWidget& b)
@@ -109,12 +140,7 @@ bool overlap(const QWidget& a, const QWidget& b)
 // other, and the main window stays on the screen.
 TEST_F(WindowTest, EveryCaptionOfTheThreeWindowsShowsWholeAtAnyFontSize)
 {
-    const QFont designFont = QApplication::font();
-    for (const double points : {8.0, 14.0}) {
-        QFont font = designFont;
-        font.setPointSizeF(points);
-        QApplication::setFont(font);
-        startUp();
+    atDesignAndLargeFont([this](double points) {
         frmList list(ListKind::Category, {"<none>"}, app.ProgramFolder, dialogs);
         frmOption options(PreferencesForm{}, {});
         for (const QWidget* shown : std::initializer_list<const QWidget*>{window.get(), &list, &options}) {
@@ -143,8 +169,60 @@ TEST_F(WindowTest, EveryCaptionOfTheThreeWindowsShowsWholeAtAnyFontSize)
         const QSize screen = window->screen()->availableGeometry().size();
         EXPECT_LE(window->height(), screen.height()) << points << " pt";
         EXPECT_LE(window->width(), screen.width()) << points << " pt";
-    }
-    QApplication::setFont(designFont);
+    });
+}
+
+// The window grows from its design size: the lists and the old header take the room, the controls
+// beside and below them move along, the others keep their places, and nothing covers anything.
+TEST_F(WindowTest, AGrownWindowGivesItsRoomToTheListsAndTheOldHeader)
+{
+    atDesignAndLargeFont([this](double points) {
+        const auto* client = child<QWidget>("client");
+        const auto controls = client->findChildren<QWidget*>(QRegularExpression("^(Label|lbl|tx|cb|ls|cmd)"));
+        window->resize(client->minimumSize() + QSize(0, window->menuBar()->height()));
+        QApplication::processEvents();
+        std::map<const QWidget*, QRect> design;
+        for (const auto* control : controls)
+            design[control] = control->geometry();
+        window->resize(window->size() + QSize(400, 300));
+        QApplication::processEvents();
+        ASSERT_EQ(client->size(), client->minimumSize() + QSize(400, 300));
+        for (const auto* control : controls) {
+            const auto name = control->objectName().toStdString() + " at " + std::to_string(points) + " pt";
+            const QRect before = design[control];
+            const bool grows = QRegularExpression("^(ls|txOldHeader)").match(control->objectName()).hasMatch();
+            if (grows) {
+                EXPECT_TRUE(control->width() > before.width() && control->height() > before.height()) << name;
+            } else if (control != child<QWidget>("lblStatuszeile")) {
+                EXPECT_EQ(control->size(), before.size()) << name;
+            }
+            if (control->y() < child<QWidget>("lsKeyWords")->y()) {
+                EXPECT_EQ(control->pos(), before.topLeft()) << name << " above the lists stays";
+            }
+            EXPECT_LE(control->geometry().right(), client->width() - 1) << name;
+            for (const auto* other : controls)
+                EXPECT_FALSE(other < control && overlap(*control, *other))
+                    << name << " covers " << other->objectName().toStdString();
+        }
+        EXPECT_GT(child<QWidget>("lsComments")->x(), child<QWidget>("cmdEdit")->geometry().right());
+        window->resize(100, 100);
+        EXPECT_EQ(window->size(), window->minimumSize()) << "no smaller than its design, or the screen";
+    });
+}
+
+TEST_F(WindowTest, AGrownListDialogGivesItsRoomToTheList)
+{
+    frmList dialog(ListKind::Bfc, {"CERTIFY CCW"}, app.ProgramFolder, dialogs);
+    dialog.show();
+    QApplication::processEvents();
+    auto* values = dialog.findChild<QListWidget*>("lsValues");
+    auto* close = dialog.findChild<QPushButton*>("cmdClose");
+    const QSize before = values->size();
+    const int closeLeft = close->x();
+    dialog.resize(dialog.size() + QSize(200, 150));
+    QApplication::processEvents();
+    EXPECT_EQ(values->size(), before + QSize(200, 150));
+    EXPECT_EQ(close->x(), closeLeft + 200) << "the buttons keep to the list's right";
 }
 
 TEST_F(WindowTest, PreferencesWindowWithAnEmptyStore)
@@ -167,6 +245,27 @@ TEST_F(WindowTest, PreferencesWindowWithAnEmptyStore)
     EXPECT_FALSE(app.Prefs.LimitDescription);
 }
 
+// While no name is stored, the preferences window is offered with what the names are for; its
+// Cancel stores nothing, and once a name is stored nothing is offered.
+TEST_F(WindowTest, PreferencesAreOfferedWhileTheyHoldNoName)
+{
+    startUp();
+    for (const bool nameStored : {false, true}) {
+        bool shown = false;
+        whenDialogShows<frmOption>([&](frmOption& dialog) {
+            shown = true;
+            EXPECT_NE(dialog.findChild<QLabel*>("lblNamesUse")->text().indexOf("Author line"), -1);
+            dialog.findChild<QPushButton*>("cmdCancel")->click();
+        });
+        window->OfferPreferencesWithoutNames();
+        EXPECT_EQ(shown, !nameStored);
+        if (!nameStored) {
+            EXPECT_FALSE(store.read(DefaultGroup, "RealName").has_value()) << "Cancel stores nothing";
+        }
+        store.write(DefaultGroup, "UserName", "jdoe");
+    }
+}
+
 TEST_F(WindowTest, SetPreferencesShowsTheDefaultsInTheWindow)
 {
     store.write(DefaultGroup, "RealName", "Jane Doe");
@@ -177,8 +276,21 @@ TEST_F(WindowTest, SetPreferencesShowsTheDefaultsInTheWindow)
     window->cmdSetPreferences_Click();
     EXPECT_EQ(text("txAuthorRealName"), "Jane Doe");
     EXPECT_EQ(child<QComboBox>("cbLicenses")->currentText(), "Marked with CC0 1.0 : see CAreadme.txt");
-    EXPECT_NE(window->newHeaderText().find("0 Author: Jane Doe\r\n"), std::string::npos);
+    EXPECT_NE(window->newHeaderText().find("0 Author: Jane Doe [ssample]\r\n"), std::string::npos)
+        << "the user name that the preferences lack stays";
     EXPECT_TRUE(app.Header.FileChanged);
+}
+
+TEST_F(WindowTest, SetPreferencesWithoutStoredNamesSaysSoAndKeepsTheFields)
+{
+    startUp();
+    openThroughPendingFile(part("3001.dat", GoodPart));
+    dialogs.expectMessage(Answer::Ok);
+    window->cmdSetPreferences_Click();
+    EXPECT_EQ(dialogs.messages.back().text.find("Your preferences hold no name yet"), 0u);
+    EXPECT_EQ(text("txAuthorRealName"), "Sam Sample");
+    EXPECT_EQ(text("txAuthorUserName"), "ssample");
+    EXPECT_FALSE(app.Header.FileChanged);
 }
 
 TEST_F(WindowTest, RecentFilesMenuShowsTheStoredFilesNewestFirstAndAClickOpens)
@@ -196,19 +308,33 @@ TEST_F(WindowTest, RecentFilesMenuShowsTheStoredFilesNewestFirstAndAClickOpens)
     EXPECT_EQ(text("txPartDescription"), "A");
 }
 
-TEST_F(WindowTest, RecentFileThatWasDeletedIsReportedAndStays)
+// A file that cannot be opened is named in one box with the system's reason, and the file that
+// was open stays; a deleted recent file keeps its entry.
+TEST_F(WindowTest, FilesThatCannotBeOpenedAreNamedWithTheReasonAndTheOpenFileStays)
 {
     startUp();
     const auto a = part("a.dat", "0 A\r\n"), b = part("b.dat", "0 B\r\n");
     openThroughPendingFile(a);
     openThroughPendingFile(b);
     std::filesystem::remove(a);
-    dialogs.expectMessage(Answer::Ok);
-    dialogs.expectMessage(Answer::Ok);
-    child<QAction>("MRecentFile_2")->trigger();
-    EXPECT_EQ(dialogs.messages.back().text, "File " + a + " not found!");
+    const auto fifo = work.file("fifo.dat");
+    ASSERT_EQ(::mkfifo(fifo.c_str(), 0600), 0);
+    const std::pair<std::string, std::string> cases[] = {
+        {a, "Error 53 (File not found) in procedure IsUnixLineEnd of Modul modUNIX\r\n" + a +
+                ": No such file or directory"},
+        {work.path().string(), "Error 75 (Path/File access error) in procedure IsUnixLineEnd of Modul modUNIX\r\n" +
+                                   work.path().string() + ": Is a directory"},
+        {fifo, "Error 75 (Path/File access error) in procedure IsUnixLineEnd of Modul modUNIX\r\n" + fifo +
+                   ": Not a regular file"}};
+    for (const auto& [path, report] : cases) {
+        dialogs.expectMessage(Answer::Ok);
+        path == a ? child<QAction>("MRecentFile_2")->trigger() : openThroughPendingFile(path);
+        ASSERT_EQ(dialogs.messages.size(), 1u) << path;
+        EXPECT_EQ(dialogs.messages.back().text, report);
+        dialogs.messages.clear();
+        EXPECT_EQ(caption(), "Quillmark 1.0.0 [b.dat]") << "the open file stays";
+    }
     EXPECT_EQ(child<QAction>("MRecentFile_2")->text().toStdString(), a);
-    EXPECT_EQ(caption(), "Quillmark 1.0.0 [b.dat]") << "the open file stays";
 }
 
 // Paths named relative to the working folder are remembered in full, so that the recent files

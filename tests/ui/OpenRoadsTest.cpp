@@ -6,6 +6,7 @@
 #include <QDialog>
 #include <QLabel>
 #include <QLineEdit>
+#include <QMenu>
 #include <QMimeData>
 #include <QPushButton>
 #include <QTest>
@@ -71,9 +72,9 @@ TEST_F(ChangedFileTest, AFailedOpenKeepsTheOpenFile)
 {
     std::filesystem::create_directory(work.path() / "folder.dat");
     const std::pair<std::string, int> failures[] = {
-        {work.file("folder.dat"), 2},                                       // the read error's two reports
+        {work.file("folder.dat"), 1},                                       // the read error
         {part("empty.dat", ""), 1},                                         // "Input past end of file"
-        {work.file("missing.dat"), 2},                                      // the error and "not found"
+        {work.file("missing.dat"), 1},                                      // the read error
         {part("picture.dat", std::string("\x89PNG\r\n\x1a\n\0\0", 10)), 1}, // no text file
     };
     for (const auto& [failing, boxes] : failures) {
@@ -95,9 +96,35 @@ TEST_F(ChangedFileTest, AFailedOpenKeepsTheOpenFile)
     EXPECT_NE(ReadBytes(path).find("0 xBrick  2 x 4\r\n"), std::string::npos);
 }
 
+// Notes saved as ".dat" open only after a question whose No keeps the open file and the recent
+// files as they were.
+TEST_F(ChangedFileTest, TextWithoutLDrawLinesOpensOnlyWhenTheUserSaysSo)
+{
+    const std::string prose = "Notes for the brick\r\n0\r\n10 studs on top\n 0 \t\r\n";
+    const auto notes = part("notes.dat", prose);
+    const auto question = notes + " does not look like an LDraw file. Open it anyway?";
+    // An LDraw line past the 64 KiB looked at.
+    const auto late = part("late.dat", prose + std::string(70000, ' ') + "\r\n0 Name: late.dat\r\n");
+    dialogs.expectMessage(Answer::No); // open without saving
+    dialogs.expectMessage(Answer::No);
+    openThroughPendingFile(notes);
+    EXPECT_EQ(dialogs.messages.back().text, question);
+    EXPECT_EQ(dialogs.messages.back().defaultButton, Answer::No);
+    EXPECT_EQ(caption(), "Quillmark 1.0.0 [3001.dat]*");
+    EXPECT_FALSE(child<QAction>("MRecentFile_2")->isVisible());
+    for (const auto& [file, answer] : {std::pair{late, Answer::No}, std::pair{notes, Answer::Yes}}) {
+        dialogs.expectMessage(Answer::No);
+        dialogs.expectMessage(answer);
+        openThroughPendingFile(file);
+    }
+    EXPECT_EQ(dialogs.messages.back().text, question);
+    EXPECT_EQ(caption(), "Quillmark 1.0.0 [notes.dat]");
+    openThroughPendingFile(part("geometry.dat", "\r\n \t3 16 0 0 0 1 1 1 0 0 1\r\n"));
+    EXPECT_EQ(caption(), "Quillmark 1.0.0 [geometry.dat]") << "a geometry line is LDraw: no question";
+}
+
 TEST_F(WindowTest, AFailedFirstOpenLeavesTheWindowAsAtStartUp)
 {
-    dialogs.expectMessage(Answer::Ok);
     dialogs.expectMessage(Answer::Ok);
     startUp({QString::fromStdString(work.file("missing.dat"))});
     EXPECT_EQ(caption(), "Quillmark 1.0.0");
@@ -114,7 +141,8 @@ TEST_F(ChangedFileTest, SaveClearsTheMarkAndSaysWhereItWrote)
     app.Prefs.MakeBackup = true;
     window->MDateiSpeichern_Click();
     EXPECT_EQ(caption(), "Quillmark 1.0.0 [3001.dat]");
-    EXPECT_EQ(text("lblStatuszeile"), "Saved " + path + " (backup 3001_Backup_2008-08-10_14-05-09.dat)");
+    EXPECT_EQ(text("lblStatuszeile"),
+              "Saved " + path + " (backup 3001_Backup_2008-08-10_14-05-09.dat); Parts Tracker: 1 warning (Ctrl+T)");
     EXPECT_TRUE(window->close()) << "saved: no question";
 }
 
@@ -132,6 +160,22 @@ TEST_F(ChangedFileTest, ShortcutsRunTheirCommands)
     EXPECT_EQ(dialogs.messages.back().text.rfind("Quillmark Version: 1.0.0", 0), 0u) << "F1";
     QTest::keyClick(window.get(), Qt::Key_Q, Qt::ControlModifier);
     EXPECT_FALSE(window->isVisible()) << "Ctrl+Q";
+}
+
+// Alt+F opens the File menu as Alt+I does, and no key pressed with Alt types into a field.
+TEST_F(ChangedFileTest, AltKeysOpenMenusAndTypeNothing)
+{
+    window->activateWindow();
+    ASSERT_TRUE(QTest::qWaitForWindowActive(window.get()));
+    auto* description = child<QLineEdit>("txPartDescription");
+    auto* fileMenu = child<QMenu>("MDatei");
+    for (const auto key : {Qt::Key_F, Qt::Key_I, Qt::Key_Z}) {
+        description->setFocus();
+        QTest::keyClick(description, key, Qt::AltModifier);
+        EXPECT_EQ(fileMenu->isVisible(), key != Qt::Key_Z) << "Alt+" << QKeySequence(key).toString().toStdString();
+        fileMenu->close();
+    }
+    EXPECT_EQ(text("txPartDescription"), "xBrick  2 x 4");
 }
 
 // The user name typed in the preferences is the one the History stub offers at once.

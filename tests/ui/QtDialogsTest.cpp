@@ -42,7 +42,7 @@ TEST_F(WindowTest, QtMessageBoxesShowWhatWasAskedAndAnswerWhatWasPressed)
          QMessageBox::Question, QMessageBox::Yes, QMessageBox::NoButton, Answer::Cancel},
     };
     for (const auto& c : cases) {
-        whenDialogShows<QMessageBox>([&c](QMessageBox& box) {
+        whenDialogShows<QMessageBox>([&](QMessageBox& box) {
             EXPECT_EQ(box.text(), "Text");
             EXPECT_EQ(box.windowTitle(), "Title");
             EXPECT_EQ(box.standardButtons(), c.shownButtons);
@@ -57,18 +57,35 @@ TEST_F(WindowTest, QtMessageBoxesShowWhatWasAskedAndAnswerWhatWasPressed)
     }
 }
 
+// A box stays over its window, also when the window manager places the window only after the box
+// showed.
+TEST_F(WindowTest, QtBoxesFollowTheirWindow)
+{
+    startUp();
+    QtDialogs qt(window.get());
+    whenDialogShows<QMessageBox>([this](QMessageBox& box) {
+        window->move(window->pos() + QPoint(120, 80));
+        EXPECT_LE((box.frameGeometry().center() - window->frameGeometry().center()).manhattanLength(), 8);
+        box.accept();
+    });
+    qt.message(StopBox("Text"));
+}
+
 TEST_F(WindowTest, QtInputBoxGivesTheTypedTextOrNothingWhenCancelled)
 {
     startUp();
     QtDialogs qt(window.get());
     for (const bool accept : {true, false}) {
-        whenDialogShows<QInputDialog>([accept](QInputDialog& box) {
+        whenDialogShows<QInputDialog>([&](QInputDialog& box) {
             EXPECT_EQ(box.labelText(), "Prompt");
-            EXPECT_EQ(box.textValue(), "default");
+            EXPECT_EQ(box.textValue(), "default ");
+            const auto* field = box.findChild<QLineEdit*>();
+            EXPECT_EQ(field->selectedText(), "") << "typing adds to the text";
+            EXPECT_EQ(field->cursorPosition(), 8);
             box.setTextValue("typed");
             accept ? box.accept() : box.reject();
         });
-        EXPECT_EQ(qt.input("Prompt", "Title", "default"), accept ? "typed" : "");
+        EXPECT_EQ(qt.input("Prompt", "Title", "default "), accept ? "typed" : "");
     }
 }
 

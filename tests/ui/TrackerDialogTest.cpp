@@ -81,4 +81,17 @@ TEST(TrackerDialog, CopyPutsThePathAndEveryFindingOnTheClipboard)
                                                      QString::fromStdString(LongMessage) + "\n");
 }
 
+TEST(TrackerDialog, CtrlCCopiesTheSelectedRowsAsCopyWordsThem)
+{
+    frmTracker dialog(Findings, "/parts/3001.dat");
+    auto& table = *dialog.findChild<QTableWidget*>("tbFindings");
+    table.selectRow(3);
+    table.selectionModel()->select(table.model()->index(0, 2), QItemSelectionModel::Select | QItemSelectionModel::Rows);
+    QTest::keyClick(&table, Qt::Key_C, Qt::ControlModifier);
+    EXPECT_EQ(QApplication::clipboard()->text(), "/parts/3001.dat\n"
+                                                 "error bfc: The first BFC line is missing.\n"
+                                                 "warning warning.notcoplaner: line 12: " +
+                                                     QString::fromStdString(LongMessage) + "\n");
+}
+
 } // namespace

@@ -33,12 +33,26 @@ void WindowTest::startUp(const QStringList& arguments)
 {
     window = std::make_unique<frmMain>(app, services);
     window->StartUp(arguments);
+    QApplication::processEvents(); // the file named by the arguments opens once the window shows
 }
 
 void WindowTest::openThroughPendingFile(const std::string& path)
 {
     app.PendingFile = path;
     window->MDateiOeffnen_Click();
+}
+
+void WindowTest::atDesignAndLargeFont(const std::function<void(double points)>& check)
+{
+    const QFont designFont = QApplication::font();
+    for (const double points : {8.0, 14.0}) {
+        QFont font = designFont;
+        font.setPointSizeF(points);
+        QApplication::setFont(font);
+        startUp();
+        check(points);
+    }
+    QApplication::setFont(designFont);
 }
 
 void Drop(QWidget& target, QMimeData& data)

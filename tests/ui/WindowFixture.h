@@ -27,6 +27,8 @@ protected:
     // Writes a part file into the work folder and returns its path.
     std::string part(const std::string& name, const std::string& bytes) const { return work.write(name, bytes); }
     void openThroughPendingFile(const std::string& path);
+    // Starts the window with the design's 8 pt font and again with 14 pt, and runs check on each.
+    void atDesignAndLargeFont(const std::function<void(double points)>& check);
 
     template <typename T>
     T* child(const char* name) const
