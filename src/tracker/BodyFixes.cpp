@@ -160,7 +160,8 @@ std::string lineNote(int number, const std::string& why) { return "line " + std:
 // Why a finding outlives the rewrite of the line's numbers: it is about a word that is no number.
 std::string whyLeft(const LineWords& line, std::string_view word)
 {
-    const auto quoted = "\"" + std::string(word) + "\"";
+    std::string quoted = "\"";
+    quoted.append(word).append("\"");
     if (word == line.colour())
         return "the colour code " + quoted + " is kept as it is";
     return quoted + " is no number of the line" + (line.shape().type == 1 ? " (it is in the file name)" : "");
