@@ -71,7 +71,7 @@ std::optional<HeaderData> ReadForCli(const std::shared_ptr<OpenPart>& part, cons
             status = ExitStatus::SaveFailed;
             return std::nullopt;
         }
-        FileBytes content(*part, [&path](std::string_view head) { EnsureTextFile(head, path); });
+        FileBytes content(*part, TextFileCheck(path));
         HeaderData header;
         ParseProgress silent;
         OpenPartFileContent(header, path, restored ? std::move(*restored) : content.takeBytes(), dialogs, silent);

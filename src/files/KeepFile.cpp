@@ -238,6 +238,8 @@ KeepFinding ExamineKeepFile(const OpenPart& part, const std::string& home)
     return examine(part, found, LOCK_SH);
 }
 
+bool HasKeepFile(const OpenPart& part, const std::string& home) { return findKeep(part, home).fd.valid(); }
+
 KeepNotRestoredError::KeepNotRestoredError(const std::string& path, const std::string& keepPath)
     : QmError(ErrorNumber::PathFileAccessError,
               path + ": an interrupted save was not restored because the file changed since; its old bytes are in " +

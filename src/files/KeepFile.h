@@ -55,6 +55,9 @@ struct KeepFinding {
 };
 KeepFinding ExamineKeepFile(const OpenPart& part, const std::string& home);
 
+// True when a keep file that may stand for the part exists: a look at its name, nothing read.
+bool HasKeepFile(const OpenPart& part, const std::string& home);
+
 // A keep file that stays because the part changed since the interrupted save.
 class KeepNotRestoredError : public QmError {
 public:

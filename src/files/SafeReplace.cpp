@@ -377,7 +377,7 @@ ReplaceResult ReplaceFileSafely(const std::string& path, std::initializer_list<s
 bool RestoreInterruptedSave(const OpenPart& part, FolderSweeps* sweeps, const LockWait& wait, const std::string& home)
 {
     sweep(part.folder(), sweeps);
-    if (ExamineKeepFile(part, home).state == KeepFinding::State::None)
+    if (!HasKeepFile(part, home))
         return false; // the usual case, found without taking the lock
     const FileLock lock(part, wait);
     return RestoreInterruptedRewrite(part, home);

@@ -387,7 +387,7 @@ bool GetGlobalContent(HeaderData& header, Dialogs& dialogs, ParseProgress& progr
         part = OpenPart::openPath(header.FilePath);
         if (beforeRead)
             beforeRead(*part);
-        content.emplace(*part, [&header](std::string_view head) { EnsureTextFile(head, header.FilePath); });
+        content.emplace(*part, TextFileCheck(header.FilePath));
     } catch (const NotTextFileError& notText) {
         dialogs.message({notText.what(), ProgramTitle, Buttons::Ok, Icon::Exclamation, Answer::Ok});
         return false;

@@ -45,3 +45,8 @@ bool LooksLikeLDraw(std::string_view content)
     }
     return false;
 }
+
+HeadCheck TextFileCheck(const std::string& path)
+{
+    return [path](std::string_view head) { EnsureTextFile(head, path); };
+}

@@ -6,6 +6,8 @@
 #include <string>
 #include <string_view>
 
+#include "PartFile.h"
+
 // A part file is text. Pictures, archives and other binary files renamed ".dat" would open as an
 // empty header, and a save would put that header in front of their bytes.
 class NotTextFileError : public std::runtime_error {
@@ -22,6 +24,9 @@ bool LooksBinary(std::string_view content);
 
 // Throws NotTextFileError naming path when content looks binary.
 void EnsureTextFile(std::string_view content, const std::string& path);
+
+// EnsureTextFile as the look a read takes at a file's first bytes before it reads the rest.
+HeadCheck TextFileCheck(const std::string& path);
 
 // True when the first 64 KiB of content hold an LDraw line: "0", spaces or tabs and a word, or a
 // geometry line of type 1 to 5. Notes or a letter saved as ".dat" hold none, and would open as an empty
