@@ -184,7 +184,8 @@ private:
             "fix", "Repair in each FILE, or each part file below a FOLDER, the Parts Tracker's findings that have one "
                    "correct repair (licence, Name: folder, description numbers, \"Pattern\", retired category, "
                    "decimals and zeros of numbers), after edit's changes, and save as edit does. Per file, each "
-                   "repair done is named with its count, and each finding left with why. Exit statuses as for edit.");
+                   "repair done is named with its count, and each finding left with why.");
+        fix_->footer(SaveExitStatuses);
         fix_->add_option("--only", only_,
                          "Run only these repairs, by the Tracker's ids (a,b); "
                          "line.invalidcoloredlines runs only when named here")
