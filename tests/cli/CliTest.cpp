@@ -96,7 +96,7 @@ TEST(CliCheck, ListsEveryFindingInLinesOrJsonAndNeverWritesAndExitsWithTheWorst)
     EXPECT_EQ(run.status, 1);
     EXPECT_EQ(run.out, good + ": ok\n" + bad + ": error save.author: You need to mention the Author!\n" + bad +
                            ": error save.bfc: You need to set the BFC type!\n" + bad +
-                           ": error save.license: You need to set the Liscense type!\n" + bad +
+                           ": error save.license: You need to set the License type!\n" + bad +
                            ": error save.type: You need to set the Part type!\n" + bad +
                            ": warning save.username: The author line names no user.\n" + bad +
                            ": note save.fixup.rotation: A save would offer a fix-up: 0 ROTATION lines in the body.\n" +
@@ -276,7 +276,7 @@ TEST(CliBatch, SummaryCountsEachFinding)
     EXPECT_EQ(run.status, 2);
     EXPECT_EQ(run.err.substr(run.err.find("4 files")),
               "4 files, 2 refused, 2 without user name, 1 unreadable\n"
-              "  refused (2): Length of the part description is limited to 64 character!\n"
+              "  refused (2): Length of the part description is limited to 64 characters!\n"
               "  fix-up offered (2): 0 WRITE lines in the body\n");
 }
 
