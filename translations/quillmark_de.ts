@@ -322,7 +322,7 @@
     </message>
     <message>
         <source>Username:</source>
-        <translation>Benutzername:</translation>
+        <translation>Benutzer:</translation>
     </message>
     <message>
         <source>Part Type:</source>
@@ -334,7 +334,7 @@
     </message>
     <message>
         <source>Set Preferences</source>
-        <translation>Einstellungen übernehmen</translation>
+        <translation>Vorgaben</translation>
     </message>
     <message>
         <source>BFC Statement</source>
