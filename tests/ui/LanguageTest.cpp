@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 // The window speaks the user's language where a translation is installed, English when
 // QUILLMARK_LANGUAGE=en says so; the messages of the core reach the user translated too.
+#include <QAbstractButton>
 #include <QMenuBar>
 #include <QMessageBox>
 #include <QTranslator>
