@@ -248,8 +248,13 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
                         colours->forPart(path, [&dialogs](const std::string& text) { dialogs.message({text}); });
                     tracker = CheckRecordForTracker(header, composed, categories, codes);
                 }
-                report.out =
-                    CheckOutput(options.format, header, composed, findings, options.tracker ? &tracker : nullptr);
+                // The file is read again for the places of its findings only when it has any.
+                const auto bytes =
+                    tracker.empty() && findings.refusals.empty() && !findings.missingUserName && !findings.fixups.color
+                        ? std::string()
+                        : FileBytes(*header.Part).takeBytes();
+                report.out = CheckOutput(options.format, header, composed, bytes, findings,
+                                         options.tracker ? &tracker : nullptr);
                 noteFindings(report, findings);
                 bool trackerRefuses = false;
                 for (const auto& finding : tracker) {
