@@ -1,8 +1,11 @@
 // SPDX-License-Identifier: MIT
 #include "FileFindings.h"
 
+#include <algorithm>
+
 #include "FileLinePlaces.h"
 #include "FileReport.h"
+#include "Text.h"
 
 namespace {
 
@@ -50,6 +53,24 @@ std::vector<FileFinding> SaveCheckFindings(const SaveFindings& save, const FileL
             findings.push_back({id, Severity::Note, std::string("A save would offer a fix-up: ") + what + ".",
                                 std::string_view(id) == "save.fixup.color" ? places.ofHeaderKeyword("COLOR") : 0});
     return findings;
+}
+
+void SortByPlace(std::vector<FileFinding>& findings)
+{
+    const auto place = [](const FileFinding& finding) {
+        return std::pair(std::max<std::size_t>(finding.line, 1), std::max<std::size_t>(finding.column, 1));
+    };
+    std::stable_sort(findings.begin(), findings.end(),
+                     [&place](const FileFinding& a, const FileFinding& b) { return place(a) < place(b); });
+}
+
+FileFinding DescriptionLengthWarning(const HeaderData& header, const FileLinePlaces& places)
+{
+    return {SaveCheckIds::DescriptionLength, Severity::Warning,
+            "The description has " + std::to_string(CharacterCount(header.PartDescription, header.Encoding)) +
+                " characters, more than " + std::to_string(DescriptionLimit) +
+                "; older tools may cut it, the Parts Tracker takes it.",
+            places.ofHeaderKeyword("")};
 }
 
 std::vector<FileFinding> TrackerFileFindings(const std::vector<TrackerFinding>& tracker, const FileLinePlaces& places)

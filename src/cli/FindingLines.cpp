@@ -1,6 +1,10 @@
 // SPDX-License-Identifier: MIT
 #include "FindingLines.h"
 
+#include <algorithm>
+#include <cstdlib>
+#include <filesystem>
+
 #include "ConsoleDialogs.h"
 #include "PathFromHere.h"
 
@@ -42,24 +46,34 @@ std::string TextFindingLines(const std::string& path, const std::vector<FileFind
         return shownPath + ": ok\n";
     std::string lines;
     for (const auto& finding : findings) {
-        lines += shownPath + ':';
-        if (finding.line > 0)
-            lines += std::to_string(finding.line) + ':';
-        lines += ' ';
+        lines += shownPath + ':' + std::to_string(std::max<std::size_t>(finding.line, 1)) + ':' +
+                 std::to_string(std::max<std::size_t>(finding.column, 1)) + ": ";
         lines += SeverityText(finding.severity);
-        lines += ' ' + ShownText(finding.id) + ": " + ShownText(finding.message) + '\n';
+        lines += ": " + ShownText(finding.message) + " [" + ShownText(finding.id) + "]\n";
     }
     return lines;
 }
 
-std::string GithubFindingLines(const std::string& path, const std::vector<FileFinding>& findings)
+std::string GithubBaseFolder()
 {
-    const auto file = workflowEscaped(ShownText(SavedPathFromHere(path).path), true);
+    const char* workspace = std::getenv("GITHUB_WORKSPACE");
+    if (workspace != nullptr && *workspace != '\0')
+        return workspace;
+    std::error_code error;
+    return std::filesystem::current_path(error).string();
+}
+
+std::string GithubFindingLines(const std::string& path, const std::vector<FileFinding>& findings,
+                               const std::string& base)
+{
+    const auto file = workflowEscaped(ShownText(SavedPathFrom(path, base).path), true);
     std::string lines;
     for (const auto& finding : findings) {
         lines += std::string("::") + workflowCommand(finding.severity) + " file=" + file;
         if (finding.line > 0)
             lines += ",line=" + std::to_string(finding.line);
+        if (finding.column > 0)
+            lines += ",col=" + std::to_string(finding.column);
         lines += ",title=" + workflowEscaped(finding.id, true) +
                  "::" + workflowEscaped(ShownText(finding.message), false) + '\n';
     }
