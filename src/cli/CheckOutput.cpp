@@ -4,8 +4,8 @@
 #include <algorithm>
 
 #include "FieldsJson.h"
-#include "FileLinePlaces.h"
 #include "FileReport.h"
+#include "PartFile.h"
 #include "SarifLog.h"
 
 namespace {
@@ -23,10 +23,10 @@ std::string jsonText(const HeaderData& header, const CheckedFile& file, const st
                 continue;
             nlohmann::ordered_json entry{
                 {"id", finding.id}, {"level", SeverityText(finding.severity)}, {"text", finding.message}};
-            if (finding.line > 0)
-                entry["line"] = finding.line;
-            if (finding.column > 0)
-                entry["column"] = finding.column;
+            if (!finding.place.wholeFile) {
+                entry["line"] = finding.place.line;
+                entry["column"] = finding.place.column;
+            }
             text.append(first ? "" : ",").append(entry.dump());
             first = false;
         }
@@ -75,7 +75,12 @@ void KeepReported(CheckedFile& file, const RuleChoice& choice)
 std::vector<FileFinding> PlacedFindings(const CheckedFile& file, const HeaderData& header,
                                         const std::string& composedHeader)
 {
-    const FileLinePlaces places(header, composedHeader);
+    // The file is read again only for findings with a place in it (the other fix-ups are about the whole body).
+    const auto& save = file.save;
+    const bool placed = !save.refusals.empty() || save.missingUserName || save.fixups.color || file.lengthWarning ||
+                        !file.tracker.empty();
+    const auto bytes = placed ? FileBytes(*header.Part).takeBytes() : std::string();
+    const FindingPlaces places(bytes, header, composedHeader);
     auto findings = SaveCheckFindings(file.save, places);
     if (file.lengthWarning)
         findings.push_back(DescriptionLengthWarning(header, places));

@@ -3,7 +3,6 @@
 
 #include <algorithm>
 
-#include "FileLinePlaces.h"
 #include "FileReport.h"
 #include "Text.h"
 
@@ -39,7 +38,7 @@ const char* SeverityText(Severity severity)
     return "note";
 }
 
-std::vector<FileFinding> SaveCheckFindings(const SaveFindings& save, const FileLinePlaces& places)
+std::vector<FileFinding> SaveCheckFindings(const SaveFindings& save, const FindingPlaces& places)
 {
     std::vector<FileFinding> findings;
     for (std::size_t k = 0; k < save.refusals.size(); ++k)
@@ -50,21 +49,20 @@ std::vector<FileFinding> SaveCheckFindings(const SaveFindings& save, const FileL
                             places.ofHeaderKeyword("Author:")});
     for (const auto& [offered, what, id] : FixUpNames(save.fixups))
         if (offered)
-            findings.push_back({id, Severity::Note, std::string("A save would offer a fix-up: ") + what + ".",
-                                std::string_view(id) == "save.fixup.color" ? places.ofHeaderKeyword("COLOR") : 0});
+            findings.push_back(
+                {id, Severity::Note, std::string("A save would offer a fix-up: ") + what + ".",
+                 std::string_view(id) == "save.fixup.color" ? places.ofHeaderKeyword("COLOR") : FindingPlace{}});
     return findings;
 }
 
 void SortByPlace(std::vector<FileFinding>& findings)
 {
-    const auto place = [](const FileFinding& finding) {
-        return std::pair(std::max<std::size_t>(finding.line, 1), std::max<std::size_t>(finding.column, 1));
-    };
+    const auto place = [](const FileFinding& finding) { return std::pair(finding.place.line, finding.place.column); };
     std::stable_sort(findings.begin(), findings.end(),
                      [&place](const FileFinding& a, const FileFinding& b) { return place(a) < place(b); });
 }
 
-FileFinding DescriptionLengthWarning(const HeaderData& header, const FileLinePlaces& places)
+FileFinding DescriptionLengthWarning(const HeaderData& header, const FindingPlaces& places)
 {
     return {SaveCheckIds::DescriptionLength, Severity::Warning,
             "The description has " + std::to_string(CharacterCount(header.PartDescription, header.Encoding)) +
@@ -73,12 +71,10 @@ FileFinding DescriptionLengthWarning(const HeaderData& header, const FileLinePla
             places.ofHeaderKeyword("")};
 }
 
-std::vector<FileFinding> TrackerFileFindings(const std::vector<TrackerFinding>& tracker, const FileLinePlaces& places)
+std::vector<FileFinding> TrackerFileFindings(const std::vector<TrackerFinding>& tracker, const FindingPlaces& places)
 {
     std::vector<FileFinding> findings;
     for (const auto& finding : tracker)
-        findings.push_back({finding.id, severityOf(finding.level), finding.text,
-                            finding.line > 0 ? places.ofCheckedLine(static_cast<std::size_t>(finding.line))
-                                             : places.ofTrackerRule(finding.id)});
+        findings.push_back({finding.id, severityOf(finding.level), finding.text, places.of(finding)});
     return findings;
 }

@@ -4,6 +4,7 @@
 #include <string>
 #include <vector>
 
+#include "FindingPlaces.h"
 #include "HeaderData.h"
 #include "SaveChecks.h"
 #include "TrackerCheck.h"
@@ -17,11 +18,8 @@ struct FileFinding {
     std::string id; // a save check's ("save.author") or the Parts Tracker's ("license.approved")
     Severity severity;
     std::string message;
-    std::size_t line = 0;   // the line of the file on disk; 0 when there is none to name
-    std::size_t column = 0; // of the first character it is about on that line; 0 when not known
+    FindingPlace place;
 };
-
-class FileLinePlaces;
 
 // Findings in the order of their places in the file, line by line and column by column; a
 // finding about the file as a whole stands on line 1, column 1.
@@ -29,10 +27,10 @@ void SortByPlace(std::vector<FileFinding>& findings);
 
 // What the save checks say about a file, in their order: a refusal is an error, a missing user
 // name a warning, a fix-up a save would offer a note.
-std::vector<FileFinding> SaveCheckFindings(const SaveFindings& save, const FileLinePlaces& places);
+std::vector<FileFinding> SaveCheckFindings(const SaveFindings& save, const FindingPlaces& places);
 
 // Under the Parts Tracker's rules, a description over the limit only warns: the Tracker takes it.
-FileFinding DescriptionLengthWarning(const HeaderData& header, const FileLinePlaces& places);
+FileFinding DescriptionLengthWarning(const HeaderData& header, const FindingPlaces& places);
 
 // The findings of the Parts Tracker's rules, placed on the file's lines.
-std::vector<FileFinding> TrackerFileFindings(const std::vector<TrackerFinding>& tracker, const FileLinePlaces& places);
+std::vector<FileFinding> TrackerFileFindings(const std::vector<TrackerFinding>& tracker, const FindingPlaces& places);

@@ -1,7 +1,6 @@
 // SPDX-License-Identifier: MIT
 #include "FindingLines.h"
 
-#include <algorithm>
 #include <cstdlib>
 #include <filesystem>
 
@@ -46,8 +45,8 @@ std::string TextFindingLines(const std::string& path, const std::vector<FileFind
         return shownPath + ": ok\n";
     std::string lines;
     for (const auto& finding : findings) {
-        lines += shownPath + ':' + std::to_string(std::max<std::size_t>(finding.line, 1)) + ':' +
-                 std::to_string(std::max<std::size_t>(finding.column, 1)) + ": ";
+        lines +=
+            shownPath + ':' + std::to_string(finding.place.line) + ':' + std::to_string(finding.place.column) + ": ";
         lines += SeverityText(finding.severity);
         lines += ": " + ShownText(finding.message) + " [" + ShownText(finding.id) + "]\n";
     }
@@ -70,10 +69,8 @@ std::string GithubFindingLines(const std::string& path, const std::vector<FileFi
     std::string lines;
     for (const auto& finding : findings) {
         lines += std::string("::") + workflowCommand(finding.severity) + " file=" + file;
-        if (finding.line > 0)
-            lines += ",line=" + std::to_string(finding.line);
-        if (finding.column > 0)
-            lines += ",col=" + std::to_string(finding.column);
+        if (!finding.place.wholeFile)
+            lines += ",line=" + std::to_string(finding.place.line) + ",col=" + std::to_string(finding.place.column);
         lines += ",title=" + workflowEscaped(finding.id, true) +
                  "::" + workflowEscaped(ShownText(finding.message), false) + '\n';
     }

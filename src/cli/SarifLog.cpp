@@ -99,11 +99,9 @@ std::string SarifResultLines(const std::string& path, const std::vector<FileFind
         if (belowBase)
             artifact["uriBaseId"] = "%SRCROOT%";
         Json location{{"physicalLocation", {{"artifactLocation", std::move(artifact)}}}};
-        if (finding.line > 0) {
-            auto& region = location["physicalLocation"]["region"] = {{"startLine", finding.line}};
-            if (finding.column > 0)
-                region["startColumn"] = finding.column;
-        }
+        if (!finding.place.wholeFile)
+            location["physicalLocation"]["region"] = {{"startLine", finding.place.line},
+                                                      {"startColumn", finding.place.column}};
         Json result{{"ruleId", finding.id}};
         if (const auto index = ruleIndex(finding.id); index < RuleTexts().size())
             result["ruleIndex"] = index;

@@ -198,7 +198,7 @@ TEST(Checker, ALongDescriptionIsAWarningUnderTheTrackersRules)
     const auto tracker = RunCliWith({"check", "--tracker", "--quiet", part});
     EXPECT_EQ(tracker.status, 0) << tracker.out;
     const auto characters = std::to_string(description.size() - 2);
-    EXPECT_NE(tracker.out.find(part + ":1:1: warning: The description has " + characters + " characters"),
+    EXPECT_NE(tracker.out.find(part + ":1:3: warning: The description has " + characters + " characters"),
               std::string::npos)
         << tracker.out;
     EXPECT_EQ(RunCliWith({"check", "--tracker", "--quiet", "--fail-on", "warning", part}).status, 1);
@@ -207,7 +207,7 @@ TEST(Checker, ALongDescriptionIsAWarningUnderTheTrackersRules)
     EXPECT_EQ(json["warnings"][0]["id"], SaveCheckIds::DescriptionLength);
     const auto plain = RunCliWith({"check", "--quiet", part});
     EXPECT_EQ(plain.status, 1);
-    EXPECT_NE(plain.out.find(part + ":1:1: error: Length of the part description"), std::string::npos) << plain.out;
+    EXPECT_NE(plain.out.find(part + ":1:3: error: Length of the part description"), std::string::npos) << plain.out;
     EXPECT_EQ(RunCliWith({"check", "--tracker", "--quiet", "--no-length-limit", part}).out, part + ": ok\n");
 }
 

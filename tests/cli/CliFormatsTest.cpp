@@ -107,13 +107,15 @@ TEST(CliFormats, GithubAnnotationsAreEscapedAsWorkflowCommands)
     TempDir dir;
     dir.write("a,b:c.dat", Part);
     const auto run = checkIn(dir, {"check", "--tracker", "--format", "github", "a,b:c.dat"});
-    EXPECT_NE(run.out.find("::error file=a%2Cb%3Ac.dat,line=" + std::to_string(editorLineOf(Part, "by 100%")) +
-                           ",title=line.invalid::Not a valid LDraw line: \"by 100%25 hand\"\n"),
-              std::string::npos)
-        << run.out;
-    EXPECT_NE(run.out.find("::error file=a%2Cb%3Ac.dat,line=" + std::to_string(editorLineOf(Part, "0 !LICENSE")) +
-                           ",title=license.approved::"),
-              std::string::npos);
+    const auto expect = [&](const std::string& what, const std::string& rest) {
+        EXPECT_TRUE(std::regex_search(
+            run.out, std::regex("::error file=a%2Cb%3Ac\\.dat,line=" + std::to_string(editorLineOf(Part, what)) +
+                                ",col=\\d+," + rest)))
+            << rest << " in\n"
+            << run.out;
+    };
+    expect("by 100%", R"(title=line\.invalid::Not a valid LDraw line: "by 100%25 hand"\n)");
+    expect("0 !LICENSE", R"(title=license\.approved::)");
 }
 
 // The window shows a file that is valid UTF-8 as UTF-8 and any other as ISO-8859-1: JSON too.

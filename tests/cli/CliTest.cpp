@@ -102,7 +102,7 @@ TEST(CliCheck, ListsEveryFindingInLinesOrJsonAndNeverWritesAndExitsWithTheWorst)
                            ":1:1: note: A save would offer a fix-up: 0 ROTATION lines in the body. "
                            "[save.fixup.rotation]\n" +
                            bad +
-                           ":2:1: note: A save would offer a fix-up: COLOR lines in the header. [save.fixup.color]\n");
+                           ":2:9: note: A save would offer a fix-up: COLOR lines in the header. [save.fixup.color]\n");
     const auto json = nlohmann::json::parse(RunCliWith({"check", "--json", bad}).out);
     EXPECT_EQ(json["FilePath"], bad);
     EXPECT_EQ(json["refusals"][0], "You need to mention the Author!\r\nSaving the file is not possible");
