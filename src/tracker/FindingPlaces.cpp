@@ -107,6 +107,19 @@ std::string_view offendingNumber(std::string_view id, std::string_view text)
 
 } // namespace
 
+std::string HeaderLineKey(std::string_view line, bool first)
+{
+    if (first)
+        return {};
+    const auto keyword = Words(line).word(2);
+    return keyword.empty() ? "#" : plainKeyword(keyword);
+}
+
+std::string_view HeaderLineValue(std::string_view line, bool first)
+{
+    return TrimTrackerLine(Words(line).joinedFrom(first ? 2 : 3));
+}
+
 FindingPlaces::FindingPlaces(std::string_view fileBytes, const HeaderData& header, const std::string& composedHeader)
     : bytes_(fileBytes), header_(header), composed_(composedHeader)
 {
@@ -148,6 +161,12 @@ std::pair<std::size_t, std::size_t> FindingPlaces::readerLine(std::size_t reader
     return {begin, end};
 }
 
+std::size_t FindingPlaces::readerLineAt(std::size_t offset) const
+{
+    const auto& starts = readerStarts();
+    return static_cast<std::size_t>(std::upper_bound(starts.begin(), starts.end(), offset) - starts.begin());
+}
+
 FindingPlace FindingPlaces::at(std::size_t begin, std::size_t end) const
 {
     readerStarts();
@@ -164,7 +183,7 @@ std::size_t FindingPlaces::readerLineOfKeyword(std::string_view keyword) const
     CrLfLines lines(header_.OldHeader);
     std::string_view line;
     for (std::size_t index = 0; lines.next(line); ++index)
-        if (index > 0 && plainKeyword(Words(line).word(2)) == wanted)
+        if (index > 0 && HeaderLineKey(line, false) == wanted)
             return header_.OldHeaderLines.fileLineOf(index);
     return 0;
 }
@@ -175,7 +194,7 @@ FindingPlace FindingPlaces::valueOf(std::size_t readerLineNumber, std::string_vi
         return {};
     const auto [begin, end] = readerLine(readerLineNumber);
     const auto line = bytes_.substr(begin, end - begin);
-    const auto value = TrimTrackerLine(Words(line).joinedFrom(keyword.empty() ? 2 : 3));
+    const auto value = HeaderLineValue(line, keyword.empty());
     if (value.empty())
         return at(begin, end);
     const auto valueBegin = begin + static_cast<std::size_t>(value.data() - line.data());
