@@ -3,6 +3,7 @@
 
 #include <algorithm>
 #include <array>
+#include <cstring>
 #include <tuple>
 
 #include "LineEnds.h"
@@ -135,13 +136,24 @@ const std::vector<std::size_t>& FindingPlaces::readerStarts() const
     const std::size_t first = bytes_.starts_with(Utf8ByteOrderMark) ? Utf8ByteOrderMark.size() : 0;
     const bool lineFeedsEnd = IsUnixLineEnd(bytes_.substr(first));
     readerStarts_.push_back(first);
-    for (std::size_t i = first; i < bytes_.size(); ++i) {
-        if (bytes_[i] == '\n')
-            lineFeeds_.push_back(i);
-        if (bytes_[i] == '\r')
-            readerStarts_.push_back(i + 1 < bytes_.size() && bytes_[i + 1] == '\n' ? i + 2 : i + 1);
-        else if (bytes_[i] == '\n' && lineFeedsEnd && (i == 0 || bytes_[i - 1] != '\r'))
-            readerStarts_.push_back(i + 1);
+    // CRs and LFs are looked for with memchr: the bytes between them are most of a file.
+    const auto next = [this](char c, std::size_t from) {
+        const auto* found = from < bytes_.size()
+                                ? static_cast<const char*>(std::memchr(bytes_.data() + from, c, bytes_.size() - from))
+                                : nullptr;
+        return found != nullptr ? static_cast<std::size_t>(found - bytes_.data()) : bytes_.size();
+    };
+    auto cr = next('\r', first), lf = next('\n', first);
+    while (cr < bytes_.size() || lf < bytes_.size()) {
+        if (cr < lf) {
+            readerStarts_.push_back(lf == cr + 1 ? cr + 2 : cr + 1);
+            cr = next('\r', cr + 1);
+            continue;
+        }
+        lineFeeds_.push_back(lf);
+        if (lineFeedsEnd && (lf == 0 || bytes_[lf - 1] != '\r'))
+            readerStarts_.push_back(lf + 1);
+        lf = next('\n', lf + 1);
     }
     return readerStarts_;
 }
