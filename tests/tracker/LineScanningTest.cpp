@@ -2,6 +2,7 @@
 // How the Tracker's rules read a line's bytes: the same wherever in a long line a byte stands.
 #include <gtest/gtest.h>
 
+#include "GeometryLine.h"
 #include "NumberFormats.h"
 #include "TrackerTestParts.h"
 #include "TrackerText.h"
@@ -33,6 +34,31 @@ TEST(LineScanning, NumberFindingsStandAnywhereInALine)
         const auto passing = CheckNumberFormats(before + "10.5 100 1.05 -0.5 0.12345 a01 0 01");
         EXPECT_TRUE(passing.leadingZero.empty() && passing.trailingZero.empty() && passing.tooPrecise.empty())
             << letters;
+    }
+}
+
+TEST(LineScanning, NumbersReadToTheirExactValues)
+{
+    // Runs of digits shorter and longer than eight, before and after the dot, inside the line and
+    // as its last word.
+    const std::pair<const char*, double> numbers[] = {{"7", 7.0},
+                                                      {"0.3", 0.3}, // not 3 * 0.1
+                                                      {"-0.00003", -0.00003},
+                                                      {"12345678", 12345678.0},
+                                                      {"123456789", 123456789.0},
+                                                      {"-9876543210.5", -9876543210.5},
+                                                      {"0.12345678", 0.12345678},
+                                                      {"1.000000001", 1.000000001},
+                                                      {"-.5", -0.5},
+                                                      {"87654321.1234567", 87654321.1234567},
+                                                      {"123456789012345", 123456789012345.0},
+                                                      {"1234567890123456", 1234567890123456.0}};
+    for (const auto& [text, value] : numbers) {
+        const auto line = std::string("2 24 ") + text + " 0 0 1 1 " + text;
+        GeometryLine read;
+        ASSERT_TRUE(ReadGeometryLine(line, read)) << line;
+        EXPECT_EQ(read.numbers[0], value) << text;
+        EXPECT_EQ(read.numbers[5], value) << text;
     }
 }
 
