@@ -102,7 +102,7 @@ struct Writing {
 // as such, and so is one that does not fit in memory beside those that the other threads hold.
 // Quiet, the messages of the file's dialogs are not shown.
 FileReport reportOn(const PartFileEntry& entry, bool quiet, ConsoleDialogs::Answerer answerer, const Writing* writing,
-                    MemoryClaims& memory, const std::function<void(HeaderData&, ConsoleDialogs&, FileReport&)>& handle)
+                    RunReads& reads, const std::function<void(HeaderData&, ConsoleDialogs&, FileReport&)>& handle)
 {
     FileReport report;
     std::ostringstream err, discarded;
@@ -115,7 +115,7 @@ FileReport reportOn(const PartFileEntry& entry, bool quiet, ConsoleDialogs::Answ
     };
     try {
         auto part = OpenEntry(entry);
-        const auto held = memory.claim(static_cast<std::size_t>(part->status().st_size));
+        const auto held = reads.memory.claim(static_cast<std::size_t>(part->status().st_size));
         std::unique_lock<std::mutex> turn;
         if (writing != nullptr) {
             turn = std::unique_lock(writing->locks.of(*part));
@@ -123,7 +123,8 @@ FileReport reportOn(const PartFileEntry& entry, bool quiet, ConsoleDialogs::Answ
             if (!part->stillNamed())
                 part = OpenEntry(entry);
         }
-        auto opened = ReadForCli(part, entry.path, dialogs, err, writing ? &writing->run : nullptr, report.status);
+        auto opened =
+            ReadForCli(part, entry.path, dialogs, err, writing ? &writing->run : nullptr, report.status, reads);
         if (opened)
             handle(*opened, dialogs, report);
         else if (report.status == ExitStatus::Unreadable)
@@ -161,8 +162,7 @@ int runBatch(const std::vector<std::string>& arguments, const BatchOptions& batc
     for (const auto& problem : found.problems)
         err << "quillmark-cli: cannot read folder " << ShownText(problem.path) << ": " << problem.reason << '\n';
     for (const auto& keep : found.orphanKeepFiles)
-        err << "quillmark-cli: " << ShownText(keep)
-            << ": the copy an interrupted save kept of a file that is gone; it is left as it is\n";
+        err << "quillmark-cli: " << ShownText(OrphanCopyNotice(keep)) << '\n';
     Summary summary;
     summary.addWalks(found);
     int status = found.problems.empty() ? ExitStatus::Ok : ExitStatus::Unreadable;
@@ -230,7 +230,7 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
     if (options.tracker &&
         (!ReadStandardList(ListKind::Category, categories, err) || !(colours = colourSource(options.ldconfig, err))))
         return ExitStatus::Unreadable;
-    MemoryClaims memory;
+    RunReads reads;
     // A SARIF log is one document: its results are gathered and written at the end.
     const bool sarif = options.format == OutputFormat::Sarif;
     std::ostringstream sarifResults;
@@ -238,7 +238,7 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
         const auto& path = entry.path;
         // A check never writes, not even to undo what a killed save left: the next save does that.
         return reportOn(
-            entry, batch.quiet, {}, nullptr, memory,
+            entry, batch.quiet, {}, nullptr, reads,
             [&](const HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
                 const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
                 const auto composed = ComposeHeader(header);
@@ -296,17 +296,25 @@ int RunEdit(const std::vector<std::string>& arguments, const SaveOptions& option
             [[maybe_unused]] const auto written = ::write(STDERR_FILENO, line.data(), line.size());
         };
     const Writing writing{run, locks};
-    MemoryClaims memory;
+    RunReads reads;
     DiffedFiles diffed;
     // A dry run and a JSON listing write nothing.
     const bool writes = !edit.dryRun && !edit.json;
     return runBatch(arguments, batch, out, err, [&](const PartFileEntry& entry) {
         const auto& path = entry.path;
-        return reportOn(entry, batch.quiet, answer, writes ? &writing : nullptr, memory,
+        return reportOn(entry, batch.quiet, answer, writes ? &writing : nullptr, reads,
                         [&](HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
                             // A dry run prints a diff and only a diff on standard output.
                             auto& said = edit.dryRun ? report.err : report.out;
-                            if (const auto refusal = ApplyHeaderEdits(header, edit.edits, clock.now())) {
+                            auto edits = edit.edits;
+                            if (const auto unwritable = EncodeHeaderEdits(edits, header.Encoding)) {
+                                report.saving = FileReport::Saving::Failed;
+                                report.status = ExitStatus::SaveFailed;
+                                said = "failed " + ShownText(path) + ": \"" + ShownText(*unwritable) +
+                                       "\" cannot be written in this file's encoding (ISO-8859-1)\n";
+                                return;
+                            }
+                            if (const auto refusal = ApplyHeaderEdits(header, edits, clock.now())) {
                                 report.saving = FileReport::Saving::Skipped;
                                 report.status = ExitStatus::Refused;
                                 said = "skipped " + ShownText(path) + ": " + *refusal + '\n';

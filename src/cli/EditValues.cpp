@@ -5,6 +5,7 @@
 #include <cstdio>
 
 #include "ConsoleDialogs.h"
+#include "Text.h"
 
 namespace {
 
@@ -35,6 +36,11 @@ public:
 
     void noControlsIn(const char* option, std::string_view value, bool tabAllowed)
     {
+        // A value is text: bytes of another encoding would give the file two.
+        if (!IsValidUtf8(value)) {
+            refuse(option, value, "is not valid UTF-8 text");
+            return;
+        }
         const auto bad = std::find_if(value.begin(), value.end(),
                                       [tabAllowed](char c) { return isControl(c) && !(tabAllowed && c == '\t'); });
         if (bad != value.end())
