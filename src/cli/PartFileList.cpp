@@ -6,6 +6,7 @@
 #include <dirent.h>
 #include <fcntl.h>
 #include <memory>
+#include <sys/resource.h>
 #include <sys/stat.h>
 #include <system_error>
 #include <unistd.h>
@@ -68,7 +69,11 @@ constexpr std::size_t HeldFolders = 256;
 // "..", checked to be the folder it came from.
 class FolderWalk {
 public:
-    explicit FolderWalk(PartFileList& found) : found_(found) {}
+    explicit FolderWalk(PartFileList& found) : found_(found)
+    {
+        struct rlimit limit {};
+        descriptorLimit_ = ::getrlimit(RLIMIT_NOFILE, &limit) == 0 ? limit.rlim_cur : 0;
+    }
 
     void run(const std::string& root)
     {
@@ -153,12 +158,14 @@ private:
         return level;
     }
 
+    // Holds the folder for its files while descriptors are plenty: the walk itself and the files
+    // open at once need the other half.
     void hold(int folder, const std::string& path, FolderTrail& trail)
     {
         if (held_ == HeldFolders)
             return;
         FileDescriptor copy(::fcntl(folder, F_DUPFD_CLOEXEC, 0));
-        if (!copy.valid())
+        if (!copy.valid() || static_cast<rlim_t>(copy.get()) >= descriptorLimit_ / 2)
             return;
         ++held_;
         trail.held = std::make_shared<const OpenFolder>(std::move(copy), path, keepFileCandidates_);
@@ -229,6 +236,7 @@ private:
     PartFileList& found_;
     std::vector<std::string> keepFileCandidates_;
     std::size_t held_ = 0;
+    rlim_t descriptorLimit_ = 0;
 };
 
 bool isFolder(const std::string& path)

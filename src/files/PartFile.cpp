@@ -30,6 +30,21 @@ void reserveFor(std::string& bytes, std::size_t size, MemoryClaims* memory)
 // cache before read() overwrites them.
 constexpr std::size_t ReadStep = std::size_t{256} * 1024;
 
+// A hole in a sparse file reads as zeros that take no disk and no memory until read: its first
+// byte is shown to the check before room for the whole file is taken. The descriptor's offset,
+// which lseek moves, is put back: it may be shared.
+void checkFirstHole(int fd, std::size_t size, const std::string& path, const ReadCheck& check)
+{
+    const auto offset = ::lseek(fd, 0, SEEK_CUR);
+    const auto hole = ::lseek(fd, static_cast<off_t>(HeadSize), SEEK_HOLE);
+    if (offset >= 0)
+        ::lseek(fd, offset, SEEK_SET);
+    char first = 0;
+    if (hole >= 0 && static_cast<std::size_t>(hole) < size &&
+        ReadAt(fd, &first, 1, static_cast<std::size_t>(hole), path) == 1)
+        check(std::string_view(&first, 1));
+}
+
 } // namespace
 
 std::size_t ReadAt(int fd, char* buffer, std::size_t size, std::size_t offset, const std::string& path)
@@ -132,6 +147,7 @@ FileBytes::FileBytes(int fd, const std::string& path, const ReadCheck& check, Me
         head.resize(ReadAt(fd, head.data(), head.size(), 0, path));
         check(head);
         checked = head.size();
+        checkFirstHole(fd, expected, path, check);
     }
     reserveFor(bytes_, expected, memory);
     for (;;) {
