@@ -7,8 +7,8 @@
 #include <cstdlib>
 #include <dirent.h>
 #include <fcntl.h>
-#include <sys/stat.h>
 #include <span>
+#include <sys/stat.h>
 #include <unistd.h>
 
 #include "Attributes.h"

@@ -61,7 +61,8 @@ TEST(CliValues, AValueIsWrittenInTheFilesOwnEncoding)
 {
     TempDir dir;
     const auto partBy = [](const std::string& author) {
-        return "0 Name: a.dat\r\n0 Author: " + author + " [rene]\r\n0 !LDRAW_ORG Part\r\n0 !LICENSE L\r\n"
+        return "0 Name: a.dat\r\n0 Author: " + author +
+               " [rene]\r\n0 !LDRAW_ORG Part\r\n0 !LICENSE L\r\n"
                "0 BFC CERTIFY CCW\r\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 b.dat\r\n";
     };
     const auto body = partBy("Ren\xe9");
@@ -78,8 +79,9 @@ TEST(CliValues, AValueIsWrittenInTheFilesOwnEncoding)
     const auto before = ReadBytes(latin1);
     const auto outside = edit("Brick \xe2\x82\xac 1", latin1); // the euro sign
     EXPECT_EQ(outside.status, 3);
-    EXPECT_EQ(outside.out, "failed " + latin1 + ": \"Brick \xe2\x82\xac 1\" cannot be written in this file's "
-                                                "encoding (ISO-8859-1)\n");
+    EXPECT_EQ(outside.out, "failed " + latin1 +
+                               ": \"Brick \xe2\x82\xac 1\" cannot be written in this file's "
+                               "encoding (ISO-8859-1)\n");
     EXPECT_EQ(ReadBytes(latin1), before);
 }
 

@@ -22,7 +22,8 @@ const std::string Part = "0 Brick\r\n0 Name: a.dat\r\n0 Author: Sam Sample [ssam
 long systemCallsOfCheck(const std::string& folder, const TempDir& scratch)
 {
     const auto counts = scratch.file("counts.txt");
-    const auto command = "strace -f -c -o " + counts + " " + QUILLMARK_CLI + " check --quiet " + folder + " >/dev/null 2>&1";
+    const auto command =
+        "strace -f -c -o " + counts + " " + QUILLMARK_CLI + " check --quiet " + folder + " >/dev/null 2>&1";
     if (std::system(command.c_str()) == -1)
         return -1;
     std::ifstream table(counts);

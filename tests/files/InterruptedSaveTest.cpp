@@ -41,7 +41,10 @@ protected:
         const auto id = part->identity();
         return ".quillmark-keep-" + std::to_string(id.device) + "-" + std::to_string(id.inode);
     }
-    KeepFinding::State restoreFinding() { return RestoreInterruptedSave(*part, nullptr, {}, home.path().string()).state; }
+    KeepFinding::State restoreFinding()
+    {
+        return RestoreInterruptedSave(*part, nullptr, {}, home.path().string()).state;
+    }
     bool restore() { return restoreFinding() == KeepFinding::State::Restorable; }
 
     TempDir dir, home;

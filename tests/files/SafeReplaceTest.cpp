@@ -5,10 +5,10 @@
 
 #include <cstring>
 #include <fcntl.h>
-#include <future>
-#include <sys/file.h>
 #include <fstream>
+#include <future>
 #include <memory>
+#include <sys/file.h>
 #include <sys/wait.h>
 #include <sys/xattr.h>
 #include <thread>
@@ -67,7 +67,8 @@ TEST(AnotherUsersFolder, SaysTheBackupCannotBeMadeThere)
         try {
             ReplaceFileSafely(path, {NewContent}, withBackup(dir.file(BackupName)));
         } catch (const QmError& error) {
-            [[maybe_unused]] const auto written = ::write(said[1], error.description().data(), error.description().size());
+            [[maybe_unused]] const auto written =
+                ::write(said[1], error.description().data(), error.description().size());
         }
     }));
     ::close(said[1]);
