@@ -406,13 +406,14 @@ ReplaceResult ReplacePart(const std::shared_ptr<OpenPart>& part, std::initialize
     const auto original = part->status();
     const auto expected = options.expected.value_or(StampOf(original));
     ensureUnchanged(*part, expected);
-    checkWritable(*part, original);
-    // The backup is a new file beside the part: where none can be made, the save stops before it
-    // begins. Without one, a file this user may write in a folder where he may not create files
-    // can only be rewritten in place, with the copy of its old bytes in a folder of his own.
+    // The backup is a new file beside the part: where none can be made (a folder of others, a
+    // read-only mount), the save stops before it begins. Without one, a file this user may write
+    // in a folder where he may not create files can only be rewritten in place, with the copy of
+    // its old bytes in a folder of his own.
     const int noNewFiles = part->folder().whyNoNewFiles();
     if (options.backupPath && noNewFiles != 0)
         throw BackupNotMadeError(*options.backupPath, noNewFiles);
+    checkWritable(*part, original);
     const bool hardLinked = original.st_nlink > 1 && !onlyOtherNameIsABackup(*part, original, options);
     const bool keepInode = hardLinked || noNewFiles != 0;
     const Replace replace{part, original, pieces, options, expected, lock};
