@@ -113,6 +113,30 @@ TEST(WritingCommands, APartThatChangedSinceItsSaveWasKilledIsLeftAndFails)
     EXPECT_EQ(snapshot(dir.path()), before);
 }
 
+// Another user's copy beside the part is named once in a run that writes, and the save goes on.
+TEST(WritingCommands, AnotherUsersCopyIsNamedOnceAndTheSaveGoesOn)
+{
+    if (::geteuid() != 0)
+        GTEST_SKIP() << "needs root to give a copy another owner";
+    TempDir dir;
+    const auto path = dir.write("a.dat", Part);
+    {
+        KeepFile keep(*OpenPart::openPath(path), "0 his bytes\r\n", {Part + "0 // more\r\n"}, "");
+        keep.keep();
+    }
+    const auto copy = NamesIn(dir.path()).begin()->starts_with(".quillmark-keep-") ? *NamesIn(dir.path()).begin()
+                                                                                   : *NamesIn(dir.path()).rbegin();
+    ASSERT_EQ(::chown(dir.file(copy).c_str(), 12345, 12345), 0);
+    const auto run = RunCliWith({"edit", "--author", "Ann [ann]", "--no-backup", path});
+    EXPECT_EQ(run.status, 0) << run.out << run.err;
+    const std::string notice =
+        path + ": a copy left by another user's interrupted save is at " + dir.file(copy) +
+        "; it was not applied; the file stays as that save left it until that user saves it again";
+    EXPECT_NE(run.err.find(notice), std::string::npos) << run.err;
+    EXPECT_EQ(run.err.find(notice), run.err.rfind(notice)) << "named once";
+    EXPECT_NE(ReadBytes(path).find("Author: Ann [ann]"), std::string::npos);
+}
+
 // Another program appends to the part between the read and the save: the save fails, the append
 // stays.
 TEST(WritingCommands, AChangeBetweenReadAndSaveFailsTheSave)
