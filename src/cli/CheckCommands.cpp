@@ -252,7 +252,7 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
                 const auto bytes =
                     tracker.empty() && findings.refusals.empty() && !findings.missingUserName && !findings.fixups.color
                         ? std::string()
-                        : FileBytes(*header.Part).takeBytes();
+                        : FileBytes(*header.Part, {}, &reads.memory).takeBytes();
                 report.out = CheckOutput(options.format, header, composed, bytes, findings,
                                          options.tracker ? &tracker : nullptr);
                 noteFindings(report, findings);
@@ -402,8 +402,8 @@ int RunEdit(const std::vector<std::string>& arguments, const SaveOptions& option
             const auto line = savedLine(header.FilePath, options, result, dialogs, report);
             said += noteLines(path, notes);
             if (edit.dryRun && (result.outcome == SaveOutcome::NotWritten || result.outcome == SaveOutcome::Unchanged))
-                report.out = DryRunDiff(path, FileBytes(*header.Part).view(), SavedText(header, ComposeHeader(header)),
-                                        writing.diffed, report.err);
+                report.out = DryRunDiff(path, FileBytes(*header.Part, {}, &writing.reads.memory).view(),
+                                        SavedText(header, ComposeHeader(header)), writing.diffed, report.err);
             else
                 said += line;
         });
@@ -434,7 +434,7 @@ int RunRepair(const std::vector<std::string>& arguments, const SaveOptions& opti
                 said = "skipped " + ShownText(path) + ": " + *refusal + '\n';
                 return;
             }
-            const auto bytes = FileBytes(*header.Part).takeBytes();
+            const auto bytes = FileBytes(*header.Part, {}, &writing.reads.memory).takeBytes();
             const auto repaired = repair(bytes, read, header);
             if (!repaired.left.empty()) {
                 report.saving = FileReport::Saving::Skipped;
