@@ -114,7 +114,7 @@ struct Writing {
 // as such, and so is one that does not fit in memory beside those that the other threads hold.
 // Quiet, the messages of the file's dialogs are not shown.
 FileReport reportOn(const PartFileEntry& entry, bool quiet, ConsoleDialogs::Answerer answerer, const Writing* writing,
-                    MemoryClaims& memory, const std::function<void(HeaderData&, ConsoleDialogs&, FileReport&)>& handle)
+                    RunReads& reads, const std::function<void(HeaderData&, ConsoleDialogs&, FileReport&)>& handle)
 {
     FileReport report;
     std::ostringstream err, discarded;
@@ -127,7 +127,7 @@ FileReport reportOn(const PartFileEntry& entry, bool quiet, ConsoleDialogs::Answ
     };
     try {
         auto part = OpenEntry(entry);
-        const auto held = memory.claim(static_cast<std::size_t>(part->status().st_size));
+        const auto held = reads.memory.claim(static_cast<std::size_t>(part->status().st_size));
         std::unique_lock<std::mutex> turn;
         if (writing != nullptr) {
             turn = std::unique_lock(writing->locks.of(*part));
@@ -135,7 +135,8 @@ FileReport reportOn(const PartFileEntry& entry, bool quiet, ConsoleDialogs::Answ
             if (!part->stillNamed())
                 part = OpenEntry(entry);
         }
-        auto opened = ReadForCli(part, entry.path, dialogs, err, writing ? &writing->run : nullptr, report.status);
+        auto opened =
+            ReadForCli(part, entry.path, dialogs, err, writing ? &writing->run : nullptr, report.status, reads);
         if (opened)
             handle(*opened, dialogs, report);
         else if (report.status == ExitStatus::Unreadable)
@@ -175,8 +176,7 @@ int runBatch(const std::vector<std::string>& arguments, const BatchOptions& batc
     for (const auto& problem : found.problems)
         err << "quillmark-cli: cannot read folder " << ShownText(problem.path) << ": " << problem.reason << '\n';
     for (const auto& keep : found.orphanKeepFiles)
-        err << "quillmark-cli: " << ShownText(keep)
-            << ": the copy an interrupted save kept of a file that is gone; it is left as it is\n";
+        err << "quillmark-cli: " << ShownText(OrphanCopyNotice(keep)) << '\n';
     Summary summary;
     summary.addWalks(found);
     int status = found.problems.empty() ? ExitStatus::Ok : ExitStatus::Unreadable;
@@ -261,7 +261,7 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
     std::optional<SarifLogWriter> sarif;
     if (options.format == OutputFormat::Sarif)
         sarif.emplace(out, form.base);
-    MemoryClaims memory;
+    RunReads reads;
     const auto checkOne = [&](const HeaderData& header, const PartSettings& settings, ConsoleDialogs& dialogs,
                               FileReport& report) {
         CheckedFile file;
@@ -303,7 +303,7 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
             }
             const auto settings = SettingsForPart(options.settings, config.config, partPath);
             // A check never writes, not even to undo what a killed save left: the next save does that.
-            return reportOn(entry, batch.quiet, {}, nullptr, memory,
+            return reportOn(entry, batch.quiet, {}, nullptr, reads,
                             [&](const HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
                                 checkOne(header, settings, dialogs, report);
                             });
@@ -323,7 +323,7 @@ int RunSave(const std::vector<std::string>& arguments, const SaveOptions& option
 namespace {
 
 // What the commands that write share over one run: the answers to a save's questions, the clock,
-// the locks and sweeps of the files, the memory held and the files diffed.
+// the locks and sweeps of the files, what the reads share and the files diffed.
 struct WritingRun {
     explicit WritingRun(const SaveOptions& options, const BatchOptions& batch)
         : answer([&options](const MessageBox& box) {
@@ -351,9 +351,25 @@ struct WritingRun {
     FolderSweeps sweeps;
     ReplaceOptions run;
     const Writing writing{run, locks};
-    MemoryClaims memory;
+    RunReads reads;
     DiffedFiles diffed;
 };
+
+// The edits in the file's encoding; nullopt when a value has no bytes there, the file then failed
+// and said so on said.
+std::optional<HeaderEdits> editsForFile(const HeaderEdits& edits, const HeaderData& header, const std::string& path,
+                                        std::string& said, FileReport& report)
+{
+    auto encoded = edits;
+    if (const auto unwritable = EncodeHeaderEdits(encoded, header.Encoding)) {
+        report.saving = FileReport::Saving::Failed;
+        report.status = ExitStatus::SaveFailed;
+        said = "failed " + ShownText(path) + ": \"" + ShownText(*unwritable) +
+               "\" cannot be written in this file's encoding (ISO-8859-1)\n";
+        return std::nullopt;
+    }
+    return encoded;
+}
 
 using FileHandler = std::function<void(HeaderData&, ConsoleDialogs&, FileReport&)>;
 
@@ -363,14 +379,17 @@ int runWriting(const std::vector<std::string>& arguments, WritingRun& writing, b
                const BatchOptions& batch, std::ostream& out, std::ostream& err, const FileHandler& handle)
 {
     return runBatch(arguments, batch, out, err, [&](const PartFileEntry& entry) {
-        return reportOn(entry, batch.quiet, writing.answer, writes ? &writing.writing : nullptr, writing.memory,
+        return reportOn(entry, batch.quiet, writing.answer, writes ? &writing.writing : nullptr, writing.reads,
                         [&](HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
-                            if (const auto refusal = ApplyHeaderEdits(header, edit.edits, writing.clock.now())) {
+                            // A dry run prints a diff and only a diff on standard output.
+                            auto& said = edit.dryRun ? report.err : report.out;
+                            const auto edits = editsForFile(edit.edits, header, entry.path, said, report);
+                            if (!edits)
+                                return;
+                            if (const auto refusal = ApplyHeaderEdits(header, *edits, writing.clock.now())) {
                                 report.saving = FileReport::Saving::Skipped;
                                 report.status = ExitStatus::Refused;
-                                // A dry run prints a diff and only a diff on standard output.
-                                (edit.dryRun ? report.err : report.out) =
-                                    "skipped " + ShownText(entry.path) + ": " + *refusal + '\n';
+                                said = "skipped " + ShownText(entry.path) + ": " + *refusal + '\n';
                                 return;
                             }
                             handle(header, dialogs, report);
@@ -427,8 +446,8 @@ int RunEdit(const std::vector<std::string>& arguments, const SaveOptions& option
             const auto line = savedLine(header.FilePath, options, result, dialogs, report);
             said += noteLines(path, notes);
             if (edit.dryRun && (result.outcome == SaveOutcome::NotWritten || result.outcome == SaveOutcome::Unchanged))
-                report.out = DryRunDiff(path, FileBytes(*header.Part).view(), SavedText(header, ComposeHeader(header)),
-                                        writing.diffed, report.err);
+                report.out = DryRunDiff(path, FileBytes(*header.Part, {}, &writing.reads.memory).view(),
+                                        SavedText(header, ComposeHeader(header)), writing.diffed, report.err);
             else
                 said += line;
         });
@@ -450,13 +469,16 @@ int RunRepair(const std::vector<std::string>& arguments, const SaveOptions& opti
             auto body = std::move(header.Body);
             const HeaderData read = header;
             header.Body = std::move(body);
-            if (const auto refusal = ApplyHeaderEdits(header, edit.edits, writing.clock.now())) {
+            const auto edits = editsForFile(edit.edits, header, path, said, report);
+            if (!edits)
+                return;
+            if (const auto refusal = ApplyHeaderEdits(header, *edits, writing.clock.now())) {
                 report.saving = FileReport::Saving::Skipped;
                 report.status = ExitStatus::Refused;
                 said = "skipped " + ShownText(path) + ": " + *refusal + '\n';
                 return;
             }
-            const auto bytes = FileBytes(*header.Part).takeBytes();
+            const auto bytes = FileBytes(*header.Part, {}, &writing.reads.memory).takeBytes();
             const auto repaired = repair(bytes, read, header);
             if (!repaired.left.empty()) {
                 report.saving = FileReport::Saving::Skipped;

@@ -44,15 +44,20 @@ namespace {
 
 // The bytes a read-only command reports a part from: those an interrupted save's restore would
 // give it, said on err; none when the part is as its last save left it.
-std::optional<std::string> bytesAfterRestore(const OpenPart& part, const std::string& path, std::ostream& err)
+std::optional<std::string> bytesAfterRestore(const OpenPart& part, const std::string& path, std::ostream& err,
+                                             const KeepSearch& keeps)
 {
-    const auto finding = ExamineKeepFile(part, HomeOfThisUser());
+    const auto finding = keeps.examine(part);
     if (finding.state == KeepFinding::State::Restorable) {
         err << ShownText(path) << ": an interrupted save will be restored by the next save\n";
         return finding.oldBytes;
     }
     if (finding.state == KeepFinding::State::Changed)
         err << OneLine(KeepNotRestoredError(path, finding.keepPath).description()) << '\n';
+    if (finding.state == KeepFinding::State::OthersCopy)
+        err << OneLine(OthersCopyNotice(path, finding)) << '\n';
+    if (finding.state == KeepFinding::State::Orphan)
+        err << ShownText(path) << ": " << OneLine(OrphanCopyNotice(finding.keepPath)) << '\n';
     return std::nullopt;
 }
 
@@ -60,18 +65,18 @@ std::optional<std::string> bytesAfterRestore(const OpenPart& part, const std::st
 
 std::optional<HeaderData> ReadForCli(const std::shared_ptr<OpenPart>& part, const std::string& path,
                                      ConsoleDialogs& dialogs, std::ostream& err, const ReplaceOptions* writing,
-                                     int& status)
+                                     int& status, RunReads& reads)
 {
     dialogs.setCurrentFile(path);
     try {
         std::optional<std::string> restored;
         if (writing == nullptr)
-            restored = bytesAfterRestore(*part, path, err);
+            restored = bytesAfterRestore(*part, path, err, reads.keeps);
         else if (RestoreInterruptedSaveOf(*part, dialogs, *writing) == RestoreOutcome::CopyKept) {
             status = ExitStatus::SaveFailed;
             return std::nullopt;
         }
-        FileBytes content(*part, TextFileCheck(path));
+        FileBytes content(*part, TextFileCheck(path), &reads.memory);
         HeaderData header;
         ParseProgress silent;
         OpenPartFileContent(header, path, restored ? std::move(*restored) : content.takeBytes(), dialogs, silent);
@@ -86,10 +91,10 @@ std::optional<HeaderData> ReadForCli(const std::shared_ptr<OpenPart>& part, cons
 }
 
 std::optional<HeaderData> OpenForCli(const PartFileEntry& entry, ConsoleDialogs& dialogs, std::ostream& err,
-                                     int& status)
+                                     int& status, RunReads& reads)
 {
     try {
-        return ReadForCli(OpenEntry(entry), entry.path, dialogs, err, nullptr, status);
+        return ReadForCli(OpenEntry(entry), entry.path, dialogs, err, nullptr, status, reads);
     } catch (const std::exception& failure) {
         ReportUnreadable(entry.path, failure, err);
         status = ExitStatus::Unreadable;
@@ -101,9 +106,10 @@ int ForEachOpenedFile(const std::vector<std::string>& paths, ConsoleDialogs& dia
                       const std::function<int(HeaderData&)>& handle)
 {
     int status = ExitStatus::Ok;
+    RunReads reads;
     for (const auto& path : paths) {
         int opening = ExitStatus::Ok;
-        auto opened = OpenForCli({path, nullptr, {}}, dialogs, err, opening);
+        auto opened = OpenForCli({path, nullptr, {}}, dialogs, err, opening, reads);
         status = std::max(status, opened ? handleCatching(path, *opened, err, handle) : opening);
     }
     return status;

@@ -10,6 +10,8 @@
 #include "HeaderData.h"
 #include "ListKinds.h"
 
+#include "KeepFile.h"
+#include "PartFile.h"
 #include "PartFileList.h"
 #include "SafeReplace.h"
 
@@ -27,6 +29,13 @@ inline constexpr int SaveFailed = 3;
 // The one line that names a file that could not be read or worked on.
 void ReportUnreadable(const std::string& path, const std::exception& failure, std::ostream& err);
 
+// What the reads of one run share, found once and used by every thread: the memory figures and
+// claims, and where keep files are looked for.
+struct RunReads {
+    MemoryClaims memory;
+    KeepSearch keeps;
+};
+
 // Reads the open part as the Open command does; path names it in messages. A command that writes
 // (writing: its run's sweeps and lock wait) first undoes what a killed save left there; when the
 // part changed since, its copy stays and the file fails (status SaveFailed). A command that only
@@ -36,11 +45,11 @@ void ReportUnreadable(const std::string& path, const std::exception& failure, st
 // Unreadable.
 std::optional<HeaderData> ReadForCli(const std::shared_ptr<OpenPart>& part, const std::string& path,
                                      ConsoleDialogs& dialogs, std::ostream& err, const ReplaceOptions* writing,
-                                     int& status);
+                                     int& status, RunReads& reads);
 
 // Opens and reads the file an entry names for a command that only reads (see ReadForCli).
 std::optional<HeaderData> OpenForCli(const PartFileEntry& entry, ConsoleDialogs& dialogs, std::ostream& err,
-                                     int& status);
+                                     int& status, RunReads& reads);
 
 // The folder of the running program, where a build keeps its list and data files.
 std::string ProgramFolder();

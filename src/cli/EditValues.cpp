@@ -5,6 +5,7 @@
 #include <cstdio>
 
 #include "ConsoleDialogs.h"
+#include "Text.h"
 
 namespace {
 
@@ -28,6 +29,16 @@ std::string codeOf(char c)
     return text;
 }
 
+// Bytes as ASCII, every other one as "\x" and two hex digits: a value that is not UTF-8 shown as
+// it is.
+std::string bytesEscaped(std::string_view value)
+{
+    std::string shown;
+    for (const char c : value)
+        shown += static_cast<unsigned char>(c) < 0x80 ? std::string(1, c) : "\\x" + codeOf(c).substr(2);
+    return shown;
+}
+
 class ValueCheck {
 public:
     explicit ValueCheck(std::ostream& err) : err_(err) {}
@@ -35,6 +46,11 @@ public:
 
     void noControlsIn(const char* option, std::string_view value, bool tabAllowed)
     {
+        // A value is text: bytes of another encoding would give the file two.
+        if (!IsValidUtf8(value)) {
+            refuse(option, bytesEscaped(value), "is not valid UTF-8 text");
+            return;
+        }
         const auto bad = std::find_if(value.begin(), value.end(),
                                       [tabAllowed](char c) { return isControl(c) && !(tabAllowed && c == '\t'); });
         if (bad != value.end())

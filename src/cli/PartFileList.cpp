@@ -6,6 +6,7 @@
 #include <dirent.h>
 #include <fcntl.h>
 #include <memory>
+#include <sys/resource.h>
 #include <sys/stat.h>
 #include <system_error>
 #include <unistd.h>
@@ -50,13 +51,17 @@ Dir listingOf(int fd)
     return dir;
 }
 
-std::shared_ptr<const FolderTrail> trailOf(DIR* dir, std::shared_ptr<const FolderTrail> parent, std::string name)
+std::shared_ptr<FolderTrail> trailOf(DIR* dir, std::shared_ptr<const FolderTrail> parent, std::string name)
 {
     struct stat info {};
     ::fstat(::dirfd(dir), &info);
-    return std::make_shared<const FolderTrail>(
-        FolderTrail{std::move(parent), std::move(name), info.st_dev, info.st_ino});
+    return std::make_shared<FolderTrail>(FolderTrail{std::move(parent), std::move(name), info.st_dev, info.st_ino, {}});
 }
+
+// The folders a walk holds open for the files found in them: a file is then opened with one call,
+// never through a folder put in the place of the one listed. Beyond that number (a descriptor
+// each), a folder is found again along its trail.
+constexpr std::size_t HeldFolders = 256;
 
 // One folder at a time, depth first, without recursion: a level holds the names of its subfolders
 // still to visit, and the path grows and shrinks as the walk goes down and up. Each subfolder is
@@ -64,7 +69,11 @@ std::shared_ptr<const FolderTrail> trailOf(DIR* dir, std::shared_ptr<const Folde
 // "..", checked to be the folder it came from.
 class FolderWalk {
 public:
-    explicit FolderWalk(PartFileList& found) : found_(found) {}
+    explicit FolderWalk(PartFileList& found) : found_(found)
+    {
+        struct rlimit limit {};
+        descriptorLimit_ = ::getrlimit(RLIMIT_NOFILE, &limit) == 0 ? limit.rlim_cur : 0;
+    }
 
     void run(const std::string& root)
     {
@@ -107,7 +116,7 @@ private:
         std::vector<std::string> subfolders;
         std::size_t next = 0;
         std::size_t pathSize = 0;
-        std::shared_ptr<const FolderTrail> trail;
+        std::shared_ptr<FolderTrail> trail;
     };
 
     // Back to the parent; false, with the rest of this walk given up, when the folder was moved
@@ -123,7 +132,7 @@ private:
 
     // Takes the part files of the open folder and returns the names of its subfolders. The
     // folder named on the command line may be a link; one met on the walk was seen not to be.
-    Level read(DIR* dir, const std::string& path, std::shared_ptr<const FolderTrail> trail)
+    Level read(DIR* dir, const std::string& path, std::shared_ptr<FolderTrail> trail)
     {
         Level level;
         level.trail = std::move(trail);
@@ -144,7 +153,22 @@ private:
                 take(folder, path, name, entry->d_type, level);
         }
         noteOrphanKeepFiles(path, *level.trail, inodes);
+        hold(folder, path, *level.trail);
+        keepFileCandidates_.clear();
         return level;
+    }
+
+    // Holds the folder for its files while descriptors are plenty: the walk itself and the files
+    // open at once need the other half.
+    void hold(int folder, const std::string& path, FolderTrail& trail)
+    {
+        if (held_ == HeldFolders)
+            return;
+        FileDescriptor copy(::fcntl(folder, F_DUPFD_CLOEXEC, 0));
+        if (!copy.valid() || static_cast<rlim_t>(copy.get()) >= descriptorLimit_ / 2)
+            return;
+        ++held_;
+        trail.held = std::make_shared<const OpenFolder>(std::move(copy), path, keepFileCandidates_);
     }
 
     void take(int folder, const std::string& path, std::string_view name, unsigned char type, Level& level)
@@ -178,7 +202,6 @@ private:
                 found_.orphanKeepFiles.push_back(std::move(keepPath));
             }
         }
-        keepFileCandidates_.clear();
     }
 
     // For file systems that do not tell the type while listing.
@@ -212,6 +235,8 @@ private:
 
     PartFileList& found_;
     std::vector<std::string> keepFileCandidates_;
+    std::size_t held_ = 0;
+    rlim_t descriptorLimit_ = 0;
 };
 
 bool isFolder(const std::string& path)
@@ -224,6 +249,8 @@ bool isFolder(const std::string& path)
 // folder the walk saw.
 std::shared_ptr<const OpenFolder> openTrail(const FolderTrail& trail)
 {
+    if (trail.held)
+        return trail.held;
     auto folder = trail.parent ? openTrail(*trail.parent)->openSubfolder(trail.name) : OpenFolder::open(trail.name);
     if (!isFolderSeen(folder->fd(), trail))
         throw PathFileAccessError();

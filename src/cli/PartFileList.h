@@ -23,6 +23,9 @@ struct FolderTrail {
     std::string name;                          // in the parent; the path of the folder named
     dev_t device = 0;
     ino_t inode = 0;
+    // The folder itself, held open since the walk listed it, with the keep names it saw there; null
+    // for folders beyond the number a walk holds, found again along the trail.
+    std::shared_ptr<const OpenFolder> held;
 };
 
 // A file to work on: named on the command line (no trail), or found in a folder of a walk.

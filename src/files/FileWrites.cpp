@@ -19,7 +19,7 @@ void WriteAll(int fd, std::string_view bytes, const std::string& path)
     }
 }
 
-void OverwriteFile(int fd, std::initializer_list<std::string_view> pieces, const std::string& path)
+std::size_t WriteFromStart(int fd, std::initializer_list<std::string_view> pieces, const std::string& path)
 {
     if (::lseek(fd, 0, SEEK_SET) != 0)
         throw OsError(errno, path);
@@ -28,6 +28,16 @@ void OverwriteFile(int fd, std::initializer_list<std::string_view> pieces, const
         WriteAll(fd, piece, path);
         size += piece.size();
     }
+    return size;
+}
+
+void CutAndFlush(int fd, std::size_t size, const std::string& path)
+{
     if (::ftruncate(fd, static_cast<off_t>(size)) != 0 || ::fsync(fd) != 0)
         throw OsError(errno, path);
+}
+
+void OverwriteFile(int fd, std::initializer_list<std::string_view> pieces, const std::string& path)
+{
+    CutAndFlush(fd, WriteFromStart(fd, pieces, path), path);
 }

@@ -6,6 +6,7 @@
 #include <charconv>
 #include <cinttypes>
 #include <cstdio>
+#include <dirent.h>
 #include <fcntl.h>
 #include <pwd.h>
 #include <sys/file.h>
@@ -23,9 +24,29 @@ constexpr std::string_view KeepPrefix = ".quillmark-keep-";
 // Below the home folder: where this user keeps the copies of files in folders he may not write.
 constexpr const char* PrivatePath[] = {".local", "state", "Quillmark", "keep"};
 
-std::string keepNameOf(const FileIdentity& identity)
+std::string keepNameOf(std::uint64_t device, std::uint64_t inode)
 {
-    return std::string(KeepPrefix) + std::to_string(identity.device) + "-" + std::to_string(identity.inode);
+    return std::string(KeepPrefix) + std::to_string(device) + "-" + std::to_string(inode);
+}
+
+std::string keepNameOf(const FileIdentity& identity) { return keepNameOf(identity.device, identity.inode); }
+
+// The keep-file names in the open folder.
+std::vector<std::string> keepNamesIn(int folder)
+{
+    std::vector<std::string> names;
+    const int listing = ::openat(folder, ".", O_RDONLY | O_DIRECTORY | O_CLOEXEC);
+    DIR* entries = listing < 0 ? nullptr : ::fdopendir(listing);
+    if (entries == nullptr) {
+        if (listing >= 0)
+            ::close(listing);
+        return names;
+    }
+    while (const auto* entry = ::readdir(entries))
+        if (unsigned long long device = 0, inode = 0; IsKeepFileName(entry->d_name, device, inode))
+            names.emplace_back(entry->d_name);
+    ::closedir(entries);
+    return names;
 }
 
 // The first line of a keep file: the part's identity, then the sizes of the old bytes and of the
@@ -62,9 +83,9 @@ bool parseRecord(std::string_view keep, KeepRecord& record)
     return true;
 }
 
-// The folder of this user's own below his home, made when create is on; null when there is none
-// or when it is not his alone.
-std::shared_ptr<const OpenFolder> privateFolder(const std::string& home, bool create)
+// The folder of this user's own below his home, made when create is on, with the keep names in it
+// when listed is on; null when there is none or when it is not his alone.
+std::shared_ptr<const OpenFolder> privateFolder(const std::string& home, bool create, bool listed = false)
 {
     if (home.empty())
         return nullptr;
@@ -82,41 +103,57 @@ std::shared_ptr<const OpenFolder> privateFolder(const std::string& home, bool cr
     std::string path = home;
     for (const char* step : PrivatePath)
         path += std::string("/") + step;
-    return std::make_shared<const OpenFolder>(std::move(folder), path);
+    auto names = listed ? std::optional(keepNamesIn(folder.get())) : std::nullopt;
+    return std::make_shared<const OpenFolder>(std::move(folder), path, std::move(names));
 }
 
-// A keep file in the part's folder made by someone who may write the part anyway: this user, the
-// part's owner, its group when the group may write it, anyone when everyone may. Never one that
-// another user put there to have its bytes written into a part he may not write.
-bool mayStandFor(const struct stat& keep, const struct stat& part)
+// A keep file stands for a part only when this user made it: it is his and nobody else may write
+// it. One that another user put there (a setgid folder gives it the part's group) would have its
+// bytes written into a part he may not write.
+bool madeByThisUser(const struct stat& keep)
 {
-    return keep.st_uid == ::geteuid() || keep.st_uid == part.st_uid ||
-           (keep.st_gid == part.st_gid && (part.st_mode & S_IWGRP) != 0) || (part.st_mode & S_IWOTH) != 0;
+    return S_ISREG(keep.st_mode) && keep.st_uid == ::geteuid() && (keep.st_mode & (S_IWGRP | S_IWOTH)) == 0;
 }
 
-// A keep file found for a part, open.
+// A keep file found for a part, open; or the path of one that another user made.
 struct FoundKeep {
     std::shared_ptr<const OpenFolder> folder;
     std::string name;
     FileDescriptor fd;
+    std::string othersPath;
+    FileDescriptor othersFd;
     std::string path() const { return folder->pathOf(name); }
 };
 
-FoundKeep findKeep(const OpenPart& part, const std::string& home)
+// The keep file of the part's name in folder, looked up by name. A command that only reads
+// (listings) looks only for a name that the folder's listing saw, so that the usual part, with no
+// keep file anywhere, costs no system call; a save never trusts a listing: a keep file made since
+// by a save killed meanwhile must be found.
+FoundKeep findKeepIn(const OpenPart& part, const std::shared_ptr<const OpenFolder>& folder, bool listings)
 {
-    const auto name = keepNameOf(part.identity());
-    const auto partStatus = part.status();
-    for (auto folder : {part.sharedFolder(), privateFolder(home, false)}) {
-        if (!folder)
-            continue;
-        FileDescriptor fd(::openat(folder->fd(), name.c_str(), O_RDONLY | O_NOFOLLOW | O_NONBLOCK | O_CLOEXEC));
-        struct stat keep {};
-        const bool own = folder != part.sharedFolder();
-        if (fd.valid() && ::fstat(fd.get(), &keep) == 0 && S_ISREG(keep.st_mode) &&
-            (own || mayStandFor(keep, partStatus)))
-            return {std::move(folder), name, std::move(fd)};
+    FoundKeep found;
+    if (!folder)
+        return found;
+    const auto& listed = folder->listedKeepNames();
+    if (listings && listed && listed->empty())
+        return found;
+    const auto status = part.status();
+    const auto name = keepNameOf(status.st_dev, status.st_ino);
+    if (listings && listed && std::find(listed->begin(), listed->end(), name) == listed->end())
+        return found;
+    FileDescriptor fd(::openat(folder->fd(), name.c_str(), O_RDONLY | O_NOFOLLOW | O_NONBLOCK | O_CLOEXEC));
+    struct stat keep {};
+    if (!fd.valid() || ::fstat(fd.get(), &keep) != 0 || !S_ISREG(keep.st_mode))
+        return found;
+    if (madeByThisUser(keep)) {
+        found.folder = folder;
+        found.name = name;
+        found.fd = std::move(fd);
+    } else {
+        found.othersPath = folder->pathOf(name);
+        found.othersFd = std::move(fd);
     }
-    return {nullptr, {}, FileDescriptor()};
+    return found;
 }
 
 // True when current is a state that the rewrite of old into newText, stopped anywhere, leaves: the
@@ -145,13 +182,30 @@ KeepFinding::State judge(std::string_view current, const KeepRecord& record)
     return isInterruptedRewrite(current, record.oldBytes, record.newText) ? State::Restorable : State::Changed;
 }
 
+// What another user's keep file says of the part, read and never applied: whether his killed
+// save left the part torn.
+KeepFinding othersKeep(const OpenPart& part, const FoundKeep& found)
+{
+    KeepFinding finding{KeepFinding::State::OthersCopy, found.othersPath, {}};
+    // His copy holds the old bytes and a new text of about their size: a larger one is no reason
+    // to read that much.
+    struct stat copy {};
+    if (::fstat(found.othersFd.get(), &copy) != 0 || copy.st_size > 2 * part.status().st_size + (off_t{1} << 20))
+        return finding;
+    const FileBytes keep(found.othersFd.get(), found.othersPath);
+    KeepRecord record;
+    finding.tornByOthersSave = parseRecord(keep.view(), record) && record.identity == part.identity() &&
+                               judge(FileBytes(part).view(), record) == KeepFinding::State::Restorable;
+    return finding;
+}
+
 // Examines the keep file found, holding its lock (exclusive for a restore) while the finding is
 // used; the lock goes with found.fd.
 KeepFinding examine(const OpenPart& part, const FoundKeep& found, int lockKind)
 {
     KeepFinding finding;
     if (!found.fd.valid())
-        return finding;
+        return found.othersFd.valid() ? othersKeep(part, found) : finding;
     finding.keepPath = found.path();
     // Where the file system has no locks, nothing tells a live writer: the part's own lock, taken
     // by every save before it looks here, keeps saves apart.
@@ -162,7 +216,7 @@ KeepFinding examine(const OpenPart& part, const FoundKeep& found, int lockKind)
     const FileBytes keep(found.fd.get(), finding.keepPath);
     KeepRecord record;
     if (!parseRecord(keep.view(), record) || record.identity != part.identity()) {
-        finding.state = KeepFinding::State::Changed; // another file has the inode now
+        finding.state = KeepFinding::State::Orphan; // kept for a file that is gone; another has the inode
         return finding;
     }
     const FileBytes current(part);
@@ -170,6 +224,29 @@ KeepFinding examine(const OpenPart& part, const FoundKeep& found, int lockKind)
     if (finding.state == KeepFinding::State::Restorable)
         finding.oldBytes = record.oldBytes;
     return finding;
+}
+
+// The part's keep file, examined: the one in the part's folder, or where that is none of this
+// user's for the part, the one in his own folder (own), where a save goes when the name is taken
+// beside the part. Another user's copy or an orphan is the finding only where no keep file of the
+// part stands. used: the keep file of the finding, when it is this user's.
+KeepFinding findAndExamine(const OpenPart& part, const std::shared_ptr<const OpenFolder>& own, bool listings,
+                           int lockKind, FoundKeep& used)
+{
+    using State = KeepFinding::State;
+    KeepFinding first;
+    for (const auto& folder : {part.sharedFolder(), own}) {
+        auto found = findKeepIn(part, folder, listings);
+        auto finding = examine(part, found, lockKind);
+        if (finding.state == State::Orphan || finding.state == State::OthersCopy) {
+            if (first.state == State::None)
+                first = std::move(finding);
+        } else if (finding.state != State::None) {
+            used = std::move(found);
+            return finding;
+        }
+    }
+    return first;
 }
 
 // Removes the keep file's name, when it still is the file found.
@@ -234,11 +311,27 @@ KeepFile::~KeepFile()
 
 KeepFinding ExamineKeepFile(const OpenPart& part, const std::string& home)
 {
-    const auto found = findKeep(part, home);
-    return examine(part, found, LOCK_SH);
+    FoundKeep used;
+    return findAndExamine(part, privateFolder(home, false), false, LOCK_SH, used);
 }
 
-bool HasKeepFile(const OpenPart& part, const std::string& home) { return findKeep(part, home).fd.valid(); }
+KeepSearch::KeepSearch(const std::string& home) : own_(privateFolder(home, false, true)) {}
+
+KeepFinding KeepSearch::examine(const OpenPart& part) const
+{
+    FoundKeep used;
+    return findAndExamine(part, own_, true, LOCK_SH, used);
+}
+
+bool HasKeepFile(const OpenPart& part, const std::string& home)
+{
+    for (const auto& folder : {part.sharedFolder(), privateFolder(home, false)}) {
+        const auto found = findKeepIn(part, folder, false);
+        if (found.fd.valid() || found.othersFd.valid())
+            return true;
+    }
+    return false;
+}
 
 KeepNotRestoredError::KeepNotRestoredError(const std::string& path, const std::string& keepPath)
     : QmError(ErrorNumber::PathFileAccessError,
@@ -247,13 +340,27 @@ KeepNotRestoredError::KeepNotRestoredError(const std::string& path, const std::s
 {
 }
 
-bool RestoreInterruptedRewrite(const OpenPart& part, const std::string& home)
+std::string OrphanCopyNotice(const std::string& keepPath)
 {
-    const auto found = findKeep(part, home);
-    const auto finding = examine(part, found, LOCK_EX);
+    return keepPath + ": the copy an interrupted save kept of a file that is gone; it is left as it is";
+}
+
+std::string OthersCopyNotice(const std::string& path, const KeepFinding& finding)
+{
+    return path + ": a copy left by another user's interrupted save is at " + finding.keepPath +
+           "; it was not applied" +
+           (finding.tornByOthersSave ? "; the file stays as that save left it until that user saves it again" : "");
+}
+
+KeepFinding RestoreInterruptedRewrite(const OpenPart& part, const std::string& home)
+{
+    FoundKeep found;
+    auto finding = findAndExamine(part, privateFolder(home, false), false, LOCK_EX, found);
     using State = KeepFinding::State;
     switch (finding.state) {
-    case State::None: return false;
+    case State::None:
+    case State::OthersCopy:
+    case State::Orphan: return finding;
     case State::Busy: throw FileLockedError(part.path());
     case State::Changed: throw KeepNotRestoredError(part.path(), finding.keepPath);
     case State::Restorable: {
@@ -266,7 +373,7 @@ bool RestoreInterruptedRewrite(const OpenPart& part, const std::string& home)
     }
     removeKeep(found);
     found.folder->sync();
-    return finding.state == State::Restorable;
+    return finding;
 }
 
 bool IsKeepFileName(std::string_view name, unsigned long long& device, unsigned long long& inode)

@@ -29,7 +29,7 @@ std::string OpenFolder::pathOf(std::string_view name) const
     return (path_.ends_with('/') ? path_ : path_ + "/") + std::string(name);
 }
 
-bool OpenFolder::mayCreateFiles() const { return ::faccessat(fd_.get(), ".", W_OK | X_OK, AT_EACCESS) == 0; }
+int OpenFolder::whyNoNewFiles() const { return ::faccessat(fd_.get(), ".", W_OK | X_OK, AT_EACCESS) == 0 ? 0 : errno; }
 
 void OpenFolder::sync() const
 {

@@ -2,8 +2,10 @@
 #pragma once
 
 #include <memory>
+#include <optional>
 #include <string>
 #include <string_view>
+#include <vector>
 
 #include "FileDescriptor.h"
 
@@ -24,13 +26,23 @@ public:
     // How messages name the entry name of this folder.
     std::string pathOf(std::string_view name) const;
     // True when this user may create files here.
-    bool mayCreateFiles() const;
+    bool mayCreateFiles() const { return whyNoNewFiles() == 0; }
+    // 0 when this user may create files here, else the system's reason (errno) why not.
+    int whyNoNewFiles() const;
     // Flushes the folder's entries, so that a new name in it survives a crash.
     void sync() const;
 
-    OpenFolder(FileDescriptor fd, std::string path) : fd_(std::move(fd)), path_(std::move(path)) {}
+    // The names of the keep files that a listing of the folder saw (see KeepFile.h); none when the
+    // folder was not listed, and a keep file is then looked up by its name.
+    const std::optional<std::vector<std::string>>& listedKeepNames() const { return keepNames_; }
+
+    OpenFolder(FileDescriptor fd, std::string path, std::optional<std::vector<std::string>> keepNames = {})
+        : fd_(std::move(fd)), path_(std::move(path)), keepNames_(std::move(keepNames))
+    {
+    }
 
 private:
     FileDescriptor fd_;
     std::string path_;
+    std::optional<std::vector<std::string>> keepNames_;
 };

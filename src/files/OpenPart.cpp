@@ -72,9 +72,9 @@ FileDescriptor OpenPart::openForWriting() const
     return fd;
 }
 
-bool OpenPart::mayWrite() const
+int OpenPart::whyNotWritable() const
 {
-    return ::faccessat(AT_FDCWD, DescriptorPath(fd_.get()).c_str(), W_OK, AT_EACCESS) == 0;
+    return ::faccessat(AT_FDCWD, DescriptorPath(fd_.get()).c_str(), W_OK, AT_EACCESS) == 0 ? 0 : errno;
 }
 
 std::string DescriptorPath(int fd) { return "/proc/self/fd/" + std::to_string(fd); }

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 #pragma once
 
+#include <atomic>
 #include <cstdint>
 #include <memory>
 #include <string>
@@ -50,8 +51,13 @@ public:
     bool unchangedSince(const FileStamp& stamp) const { return this->stamp() == stamp && stillNamed(); }
     // The same file opened again for writing, found through this descriptor, never by name.
     FileDescriptor openForWriting() const;
-    // True when this user may write the file.
-    bool mayWrite() const;
+    // 0 when this user may write the file, else the system's reason (errno) why not.
+    int whyNotWritable() const;
+
+    // Said by the restore of an interrupted save, which looked at the part's keep file under its
+    // lock, and taken by the next save, which then need not look again.
+    void markKeepExamined() const { keepExamined_ = true; }
+    bool takeKeepExamined() const { return keepExamined_.exchange(false); }
 
     OpenPart(std::shared_ptr<const OpenFolder> folder, std::string name, std::string path, FileDescriptor fd)
         : folder_(std::move(folder)), name_(std::move(name)), path_(std::move(path)), fd_(std::move(fd))
@@ -63,6 +69,7 @@ private:
     std::string name_;
     std::string path_;
     FileDescriptor fd_;
+    mutable std::atomic<bool> keepExamined_ = false;
 };
 
 // The path by which the system reaches the open file fd itself, whatever its names are now.

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 #pragma once
 
+#include <chrono>
 #include <cstddef>
 #include <functional>
 #include <mutex>
@@ -39,21 +40,30 @@ public:
     };
     // Throws QmError 7 (Out of memory) when size does not fit beside what is claimed.
     Claim claim(std::size_t size);
+    // RoomForFiles, asked of the system at most once a second.
+    std::size_t room();
 
 private:
+    std::size_t roomLocked();
+
     std::mutex mutex_;
     std::size_t claimed_ = 0;
+    std::size_t room_ = 0;
+    std::chrono::steady_clock::time_point asked_;
 };
 
 // Reads up to size bytes of the open file fd at offset, fewer only at the end of the file. The
 // file's own offset is left alone: the descriptor may be shared with whoever holds the file open.
 // A failure throws QmError naming path.
 std::size_t ReadAt(int fd, char* buffer, std::size_t size, std::size_t offset, const std::string& path);
+// One read of up to size bytes at offset: fewer at the end of the file, or when a signal cut it short.
+std::size_t ReadSome(int fd, char* buffer, std::size_t size, std::size_t offset, const std::string& path);
 
-// Looks at the first bytes of a file before the rest is read, and throws to refuse it.
-using HeadCheck = std::function<void(std::string_view head)>;
+// Looks at a file's bytes as they are read, and throws to refuse the file: first at its head
+// (HeadSize bytes, all of a shorter file) before the rest is read, then at each further piece
+// as it arrives, so that a refused file costs no more than the bytes up to the reason.
+using ReadCheck = std::function<void(std::string_view bytes)>;
 
-// How many bytes a HeadCheck sees: all of a shorter file.
 inline constexpr std::size_t HeadSize = std::size_t{64} * 1024;
 
 // The bytes of a regular file, read at once into one buffer. Anything else (a folder, a FIFO, a
@@ -66,12 +76,13 @@ inline constexpr std::size_t HeadSize = std::size_t{64} * 1024;
 // held in memory once.
 class FileBytes {
 public:
-    // Reads the open file from its start. The head check sees its first bytes before the rest is
-    // read, so that a file it refuses costs no more than those. Throws QmError: the classic number
-    // when the file cannot be read, 7 (Out of memory) when it is too large to work on.
-    explicit FileBytes(const OpenPart& part, const HeadCheck& headCheck = {});
+    // Reads the open file from its start, each piece shown to check (see ReadCheck). Throws
+    // QmError: the classic number when the file cannot be read, 7 (Out of memory) when it is too
+    // large to work on.
+    // memory: the run's, whose figures stand for the system's.
+    explicit FileBytes(const OpenPart& part, const ReadCheck& check = {}, MemoryClaims* memory = nullptr);
     // The same for any open file; path names it in messages.
-    FileBytes(int fd, const std::string& path, const HeadCheck& headCheck = {});
+    FileBytes(int fd, const std::string& path, const ReadCheck& check = {}, MemoryClaims* memory = nullptr);
     // The file at path, links followed; 75 (Path/File access error) when it is no regular file.
     explicit FileBytes(const std::string& path);
 

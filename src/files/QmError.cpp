@@ -51,7 +51,9 @@ QmError NoRegularFileError(const std::string& path, bool folder)
     return PathFileAccessError(path + ": " + (folder ? systemReason(EISDIR) : std::string("Not a regular file")));
 }
 
-QmError OsError(int errnoValue, const std::string& path)
+namespace {
+
+QmError classicErrorOf(int errnoValue, const std::string& path)
 {
     auto detail = path + ": " + systemReason(errnoValue);
     switch (errnoValue) {
@@ -62,11 +64,27 @@ QmError OsError(int errnoValue, const std::string& path)
     case ENOTDIR: return {ErrorNumber::PathNotFound, "Path not found", std::move(detail)};
     case EEXIST: return {ErrorNumber::FileAlreadyExists, "File already exists", std::move(detail)};
     case EACCES:
-    case EPERM:
-    case EROFS: return {ErrorNumber::PermissionDenied, "Permission denied", std::move(detail)};
+    case EPERM: return {ErrorNumber::PermissionDenied, "Permission denied", std::move(detail)};
     case ENOSPC:
     case EDQUOT: return {ErrorNumber::DiskFull, "Disk full", std::move(detail)};
     case EIO: return {ErrorNumber::DeviceIoError, "Device I/O error", std::move(detail)};
-    default: return PathFileAccessError(std::move(detail));
+    default: return PathFileAccessError(std::move(detail)); // a read-only file system among them
     }
+}
+
+} // namespace
+
+QmError OsError(int errnoValue, const std::string& path)
+{
+    auto error = classicErrorOf(errnoValue, path);
+    error.systemError_ = errnoValue;
+    return error;
+}
+
+std::string ReasonInWords(int errnoValue)
+{
+    auto words = systemReason(errnoValue);
+    if (!words.empty() && words[0] >= 'A' && words[0] <= 'Z')
+        words[0] = static_cast<char>(words[0] - 'A' + 'a');
+    return words;
 }

@@ -14,11 +14,15 @@ public:
     int number() const { return number_; }
     const std::string& description() const { return description_; }
     const std::string& detail() const { return detail_; }
+    // The system's error (errno) behind it; 0 when it came from elsewhere.
+    int systemError() const { return systemError_; }
 
 private:
+    friend QmError OsError(int errnoValue, const std::string& path);
     int number_;
     std::string description_;
     std::string detail_;
+    int systemError_ = 0;
 };
 
 namespace ErrorNumber {
@@ -49,3 +53,7 @@ QmError NoRegularFileError(const std::string& path, bool folder);
 
 // Maps an OS error (errno) met while working on path to the classic number and description.
 QmError OsError(int errnoValue, const std::string& path);
+
+// The system's reason for an OS error in words, as a message says it after a path: "permission
+// denied", "read-only file system", "no space left on device".
+std::string ReasonInWords(int errnoValue);

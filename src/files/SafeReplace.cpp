@@ -1,11 +1,13 @@
 // SPDX-License-Identifier: MIT
 #include "SafeReplace.h"
 
+#include <algorithm>
 #include <cerrno>
 #include <climits>
 #include <cstdlib>
 #include <dirent.h>
 #include <fcntl.h>
+#include <span>
 #include <sys/stat.h>
 #include <unistd.h>
 
@@ -14,6 +16,7 @@
 #include "Folders.h"
 #include "NewFile.h"
 #include "PartFile.h"
+#include "SameBytes.h"
 
 namespace {
 
@@ -40,8 +43,24 @@ std::string fileNameOf(const std::string& path) { return path.substr(path.rfind(
 void checkWritable(const OpenPart& part, const struct stat& info)
 {
     // A file without any write permission stays as it is, even for root.
-    if ((info.st_mode & 0222) == 0 || !part.mayWrite())
+    if ((info.st_mode & 0222) == 0)
         throw OsError(EACCES, part.path());
+    if (const int why = part.whyNotWritable())
+        throw OsError(why, part.path());
+}
+
+// What make returns, a failure of the system said as the backup's: "cannot make the backup
+// <path>: permission denied".
+template <typename Make>
+auto backupSaying(const std::string& backupPath, const Make& make)
+{
+    try {
+        return make();
+    } catch (const QmError& error) {
+        if (error.systemError() == 0)
+            throw;
+        throw BackupNotMadeError(backupPath, error.systemError());
+    }
 }
 
 // "a_Backup.dat", "a_Backup (2).dat", "a_Backup (3).dat"...
@@ -158,9 +177,35 @@ struct Replace {
     const FileLock& lock;
 };
 
+// What another program's write to a file changes: its size, and its change time unless the write
+// falls in the same tick of the clock as the last look.
+bool sameLook(const struct stat& now, const struct stat& before)
+{
+    return now.st_size == before.st_size && now.st_ctim.tv_sec == before.st_ctim.tv_sec &&
+           now.st_ctim.tv_nsec == before.st_ctim.tv_nsec;
+}
+
+// Writes the pieces over the part through writable, watching for another program's write: after
+// the last write the file must have the size the writes give it and keep its look until it is cut
+// to length, and then hold exactly the pieces. False when it did not. No check can see a write
+// that lands between a look and the next write of ours and is then overwritten: without
+// mandatory locks (POSIX has none) only the other program's own lock would keep it out.
+bool overwriteWatched(const Replace& r, int writable, std::size_t oldSize)
+{
+    const auto& part = *r.part;
+    const auto size = WriteFromStart(writable, r.pieces, part.path());
+    const auto written = part.status();
+    reach(r.options.afterStep, ReplaceStep::WrittenInPlace);
+    if (static_cast<std::size_t>(written.st_size) != std::max(oldSize, size) || !sameLook(part.status(), written))
+        return false;
+    CutAndFlush(writable, size, part.path());
+    return FileHoldsExactly(part.fd(), std::span(r.pieces.begin(), r.pieces.size()));
+}
+
 // For a file that must keep its inode (several hard links, an owner or attributes a new file
 // could not have): its old bytes are first made safe in a keep file, then it is rewritten through
-// its own descriptor, and written back from the copy if that fails.
+// its own descriptor, and written back from the copy if that fails or another program wrote to
+// it meanwhile.
 ReplaceResult rewriteInPlace(const Replace& r)
 {
     const auto& part = *r.part;
@@ -168,20 +213,37 @@ ReplaceResult rewriteInPlace(const Replace& r)
     ReplaceResult result;
     KeepFile keep(part, old.view(), r.pieces, r.options.home);
     if (r.options.backupPath)
-        result.backupPath = writeCopy(part.folder(), *r.options.backupPath, old.view(), r.original);
+        result.backupPath = backupSaying(*r.options.backupPath, [&] {
+            return writeCopy(part.folder(), *r.options.backupPath, old.view(), r.original);
+        });
     Undo backup(part.folder(), result.backupPath);
     reach(r.options.afterStep, ReplaceStep::BackupMade);
     ensureUnchanged(part, r.expected);
+    // The last look before the first byte is written.
+    if (!sameLook(part.status(), r.original))
+        throw FileChangedError(part.path());
     const auto writable = part.openForWriting();
-    try {
-        OverwriteFile(writable.get(), r.pieces, part.path());
-    } catch (const QmError&) {
+    const auto putOldBytesBack = [&] {
         try {
             OverwriteFile(writable.get(), {old.view()}, part.path());
         } catch (const QmError&) {
             keep.keep(); // the one whole version of the old bytes, for the next open to restore
         }
+    };
+    bool steady = false;
+    try {
+        steady = overwriteWatched(r, writable.get(), old.view().size());
+    } catch (const QmError&) {
+        putOldBytesBack();
         throw;
+    }
+    if (!steady) {
+        const FileBytes stood(part);
+        const auto& keepFolder = keep.folder();
+        const auto copy =
+            writeCopy(keepFolder, keepFolder.pathOf(part.name() + ".changed-while-saving"), stood.view(), r.original);
+        putOldBytesBack();
+        throw ChangedWhileSavingError(part.path(), copy);
     }
     backup.keep();
     result.written = r.part;
@@ -216,7 +278,10 @@ std::optional<ReplaceResult> replaceByRename(const Replace& r)
     // bytes. Killed between the two, the part and its backup are one file with two names; the
     // next save knows that backup by its name and replaces the part by rename again
     // (onlyOtherNameIsABackup), so no save ever writes into a backup.
-    const auto backup = r.options.backupPath ? makeBackup(part, *r.options.backupPath, r.original) : Backup{};
+    const auto backup =
+        r.options.backupPath
+            ? backupSaying(*r.options.backupPath, [&] { return makeBackup(part, *r.options.backupPath, r.original); })
+            : Backup{};
     Undo undoBackup(folder, backup.path);
     const auto oldName = keepAName(part, backup);
     Undo temporaryOldName(folder, backup.secondName ? std::string() : oldName);
@@ -294,6 +359,19 @@ void sweep(const OpenFolder& folder, FolderSweeps* sweeps)
 
 FileChangedError::FileChangedError(const std::string& path) : QmError(PathFileAccessError()), path_(path) {}
 
+BackupNotMadeError::BackupNotMadeError(const std::string& backupPath, int errnoValue)
+    : QmError(OsError(errnoValue, backupPath).number(),
+              "cannot make the backup " + backupPath + ": " + ReasonInWords(errnoValue))
+{
+}
+
+ChangedWhileSavingError::ChangedWhileSavingError(const std::string& path, const std::string& copyPath)
+    : QmError(ErrorNumber::PathFileAccessError,
+              path + ": changed while saving; the file as another program left it is in " + copyPath +
+                  ", and its old bytes are back")
+{
+}
+
 std::string ResolveLinks(const std::string& path)
 {
     std::string resolved = path;
@@ -321,16 +399,23 @@ ReplaceResult ReplacePart(const std::shared_ptr<OpenPart>& part, std::initialize
     reach(options.afterStep, ReplaceStep::Locked);
     if (!part->stillNamed())
         throw FileChangedError(part->path());
-    RestoreInterruptedRewrite(*part, options.home);
+    // Unless the restore before the read looked already: a save killed since then changed the
+    // part, which the stamp check below sees.
+    if (!part->takeKeepExamined())
+        RestoreInterruptedRewrite(*part, options.home);
     const auto original = part->status();
     const auto expected = options.expected.value_or(StampOf(original));
     ensureUnchanged(*part, expected);
+    // The backup is a new file beside the part: where none can be made (a folder of others, a
+    // read-only mount), the save stops before it begins. Without one, a file this user may write
+    // in a folder where he may not create files can only be rewritten in place, with the copy of
+    // its old bytes in a folder of his own.
+    const int noNewFiles = part->folder().whyNoNewFiles();
+    if (options.backupPath && noNewFiles != 0)
+        throw BackupNotMadeError(*options.backupPath, noNewFiles);
     checkWritable(*part, original);
-    // A file this user may write in a folder where he may not create files can only be rewritten
-    // in place, with the copy of its old bytes in a folder of his own.
-    const bool folderWritable = part->folder().mayCreateFiles();
     const bool hardLinked = original.st_nlink > 1 && !onlyOtherNameIsABackup(*part, original, options);
-    const bool keepInode = hardLinked || (!folderWritable && !options.backupPath);
+    const bool keepInode = hardLinked || noNewFiles != 0;
     const Replace replace{part, original, pieces, options, expected, lock};
     std::optional<ReplaceResult> result;
     if (!keepInode)
@@ -374,11 +459,16 @@ ReplaceResult ReplaceFileSafely(const std::string& path, std::initializer_list<s
     return ReplacePart(part, pieces, options);
 }
 
-bool RestoreInterruptedSave(const OpenPart& part, FolderSweeps* sweeps, const LockWait& wait, const std::string& home)
+KeepFinding RestoreInterruptedSave(const OpenPart& part, FolderSweeps* sweeps, const LockWait& wait,
+                                   const std::string& home)
 {
     sweep(part.folder(), sweeps);
-    if (!HasKeepFile(part, home))
-        return false; // the usual case, found without taking the lock
+    if (!HasKeepFile(part, home)) {
+        part.markKeepExamined();
+        return {}; // the usual case, found without taking the lock
+    }
     const FileLock lock(part, wait);
-    return RestoreInterruptedRewrite(part, home);
+    auto found = RestoreInterruptedRewrite(part, home);
+    part.markKeepExamined();
+    return found;
 }

@@ -23,7 +23,8 @@ std::string ResolveLinks(const std::string& path);
 
 // The points between the steps of a replace, where a test can stop a save as a kill would, or
 // act as another program would between two steps.
-enum class ReplaceStep { Locked, NewTextWritten, BackupMade, NewTextNamed, Placed };
+// WrittenInPlace: an in-place rewrite wrote its last byte and has not yet cut the file to length.
+enum class ReplaceStep { Locked, NewTextWritten, BackupMade, WrittenInPlace, NewTextNamed, Placed };
 using ReplaceStepHook = std::function<void(ReplaceStep)>;
 
 struct ReplaceOptions {
@@ -60,6 +61,19 @@ private:
     std::string path_;
 };
 
+// The backup could not be made; the message names it and the system's reason in words.
+class BackupNotMadeError : public QmError {
+public:
+    BackupNotMadeError(const std::string& backupPath, int errnoValue);
+};
+
+// Another program wrote to the part while it was rewritten in place. The file as it stood then is
+// in a copy whose path the message names, and the part holds its old bytes again.
+class ChangedWhileSavingError : public QmError {
+public:
+    ChangedWhileSavingError(const std::string& path, const std::string& copyPath);
+};
+
 // Replaces the content of the open part by the pieces, one after the other, so that the file is
 // never broken, never missing and never another user's:
 // - the new text goes to a new file in the part's folder that has no name until it is complete
@@ -68,7 +82,9 @@ private:
 // - a file with several hard links, one whose owner or attributes a new file could not keep, or
 //   one in a folder where this user may not create files, is rewritten in place through its own
 //   descriptor instead, after a copy of its old bytes is safe on disk (a keep file), and restored
-//   from that copy if writing fails or, when the process is killed, by the next open or save;
+//   from that copy if writing fails or, when the process is killed, by the next open or save; a
+//   change by another program seen during the rewrite (ChangedWhileSavingError) leaves the file
+//   as it stood in a copy beside the keep file, and the old bytes in the part;
 // - with a backup path, the old content ends under that name (a second name for the old file,
 //   or a copy of it);
 // - a file this user may not write, or that has no write permission at all, is refused;
@@ -92,6 +108,6 @@ ReplaceResult ReplaceFileSafely(const std::string& path, std::initializer_list<s
 
 // Under the part's lock, undoes the in-place rewrite of the part that a killed process left half
 // done (see RestoreInterruptedRewrite), after removing what killed saves left in its folder
-// (sweeps: see ReplaceOptions); true when old bytes were written back.
-bool RestoreInterruptedSave(const OpenPart& part, FolderSweeps* sweeps = nullptr, const LockWait& wait = {},
-                            const std::string& home = HomeOfThisUser());
+// (sweeps: see ReplaceOptions); returns what it found (Restorable: the old bytes went back).
+KeepFinding RestoreInterruptedSave(const OpenPart& part, FolderSweeps* sweeps = nullptr, const LockWait& wait = {},
+                                   const std::string& home = HomeOfThisUser());

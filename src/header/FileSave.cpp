@@ -100,16 +100,33 @@ std::string MakeBackupName(const std::string& path, const LocalDateTime& stamp)
 
 RestoreOutcome RestoreInterruptedSaveOf(const OpenPart& part, Dialogs& dialogs, const ReplaceOptions& run)
 {
+    KeepFinding found;
     try {
-        if (!RestoreInterruptedSave(part, run.sweeps, run.lockWait, run.home))
-            return RestoreOutcome::NothingToDo;
+        found = RestoreInterruptedSave(part, run.sweeps, run.lockWait, run.home);
     } catch (const KeepNotRestoredError& kept) {
         dialogs.message({kept.description(), KeptCopyTitle, Buttons::Ok, Icon::Exclamation, Answer::Ok});
         return RestoreOutcome::CopyKept;
     }
-    dialogs.message({"restored " + part.path() + " from an interrupted save", "Quillmark", Buttons::Ok,
-                     Icon::Information, Answer::Ok});
-    return RestoreOutcome::Restored;
+    using State = KeepFinding::State;
+    switch (found.state) {
+    case State::Restorable:
+        dialogs.message({"restored " + part.path() + " from an interrupted save", "Quillmark", Buttons::Ok,
+                         Icon::Information, Answer::Ok});
+        return RestoreOutcome::Restored;
+    case State::OthersCopy:
+        dialogs.message(
+            {OthersCopyNotice(part.path(), found), ProgramTitle, Buttons::Ok, Icon::Exclamation, Answer::Ok});
+        return RestoreOutcome::NothingToDo;
+    case State::Orphan:
+        dialogs.message({OrphanCopyNotice(found.keepPath), ProgramTitle, Buttons::Ok, Icon::Information, Answer::Ok});
+        return RestoreOutcome::NothingToDo;
+    case State::None:
+    case State::Busy:
+    case State::Untouched:
+    case State::Finished:
+    case State::Changed: break;
+    }
+    return RestoreOutcome::NothingToDo;
 }
 
 bool IsBackupName(std::string_view fileName)
@@ -183,6 +200,10 @@ std::optional<MessageBox> boxFor(const QmError& error)
         return box(KeptCopyTitle);
     if (dynamic_cast<const FileLockedError*>(&error) != nullptr)
         return box(FileLockedTitle);
+    if (dynamic_cast<const BackupNotMadeError*>(&error) != nullptr)
+        return box(ProgramTitle);
+    if (dynamic_cast<const ChangedWhileSavingError*>(&error) != nullptr)
+        return box(ChangedOnDiskTitle);
     if (dynamic_cast<const InterruptedError*>(&error) != nullptr)
         return box(InterruptedTitle);
     return std::nullopt;

@@ -62,5 +62,7 @@ enum class RestoreOutcome { NothingToDo, Restored, CopyKept };
 
 // Undoes what a save killed in the middle of rewriting the part in place left there, and says so:
 // "restored <path> from an interrupted save". When the part changed since, the copy of its old
-// bytes stays, and a box says where (CopyKept).
+// bytes stays, and a box says where (CopyKept). Another user's copy is never applied: a box says
+// so, and the part is worked on as it is. This user's copy of a file that is gone, whose inode
+// another file has now, is left alone, and a box says so.
 RestoreOutcome RestoreInterruptedSaveOf(const OpenPart& part, Dialogs& dialogs, const ReplaceOptions& run = {});

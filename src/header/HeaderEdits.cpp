@@ -132,6 +132,27 @@ std::string NameFolderOfType(std::string_view partType)
     return "";
 }
 
+std::optional<std::string> EncodeHeaderEdits(HeaderEdits& edits, TextEncoding encoding)
+{
+    std::optional<std::string> unwritable;
+    const auto encode = [&](std::string& value) {
+        auto encoded = Utf8ToFileText(value, encoding);
+        if (encoded)
+            value = std::move(*encoded);
+        else if (!unwritable)
+            unwritable = value;
+    };
+    for (auto* value : {&edits.description, &edits.author, &edits.type, &edits.update, &edits.license, &edits.bfc,
+                        &edits.category, &edits.addHistory})
+        if (*value)
+            encode(**value);
+    for (auto* values : {&edits.addKeywords, &edits.removeKeywords})
+        for (auto& value : *values)
+            encode(value);
+    encode(edits.historyUser);
+    return unwritable;
+}
+
 std::optional<std::string> ApplyHeaderEdits(HeaderData& h, const HeaderEdits& edits, const LocalDateTime& today)
 {
     if (auto refusal = windingTurned(h, edits))

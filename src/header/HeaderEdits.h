@@ -38,6 +38,11 @@ StringList SplitKeywords(std::string_view text);
 // before the type and words after it do not count.
 std::string NameFolderOfType(std::string_view partType);
 
+// Turns the edits' values, valid UTF-8, into the text of a file of that encoding (see
+// Utf8ToFileText). Returns the first value that the encoding cannot hold, the edits then left
+// partly turned; nothing when all could be.
+std::optional<std::string> EncodeHeaderEdits(HeaderEdits& edits, TextEncoding encoding);
+
 // Applies the edits to the record; today dates an added history line. Returns why the file is
 // left as it is (a BFC winding that the edit would turn round), or nothing when it was edited.
 std::optional<std::string> ApplyHeaderEdits(HeaderData& header, const HeaderEdits& edits, const LocalDateTime& today);

@@ -177,3 +177,23 @@ std::string Latin1ToUtf8(std::string_view bytes)
     }
     return result;
 }
+
+std::optional<std::string> Utf8ToFileText(std::string_view utf8, TextEncoding encoding)
+{
+    if (encoding == TextEncoding::Utf8)
+        return std::string(utf8);
+    std::string result;
+    result.reserve(utf8.size());
+    for (std::size_t at = 0; at < utf8.size(); ++at) {
+        const auto lead = static_cast<unsigned char>(utf8[at]);
+        if (lead < 0x80) {
+            result += static_cast<char>(lead);
+            continue;
+        }
+        // U+0080 to U+00FF take two bytes with a lead of C2 or C3; every other character has none.
+        if ((lead != 0xC2 && lead != 0xC3) || at + 1 >= utf8.size())
+            return std::nullopt;
+        result += static_cast<char>(((lead & 0x03) << 6) | (static_cast<unsigned char>(utf8[++at]) & 0x3F));
+    }
+    return result;
+}

@@ -2,6 +2,7 @@
 #pragma once
 
 #include <cstddef>
+#include <optional>
 #include <string>
 #include <string_view>
 
@@ -42,3 +43,6 @@ std::size_t CharacterCount(std::string_view text, TextEncoding encoding);
 
 // Each byte as the ISO-8859-1 character of that code, encoded as UTF-8.
 std::string Latin1ToUtf8(std::string_view bytes);
+// Valid UTF-8 text as a file of that encoding writes it: as it is in UTF-8, each character as its
+// byte in ISO-8859-1; nullopt when a character has no byte there.
+std::optional<std::string> Utf8ToFileText(std::string_view utf8, TextEncoding encoding);

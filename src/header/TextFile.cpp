@@ -23,10 +23,7 @@ NotTextFileError::NotTextFileError(const std::string& path) : std::runtime_error
 {
 }
 
-bool LooksBinary(std::string_view content)
-{
-    return content.substr(0, LookedAtBytes).find('\0') != std::string_view::npos;
-}
+bool LooksBinary(std::string_view content) { return content.find('\0') != std::string_view::npos; }
 
 void EnsureTextFile(std::string_view content, const std::string& path)
 {
@@ -46,7 +43,7 @@ bool LooksLikeLDraw(std::string_view content)
     return false;
 }
 
-HeadCheck TextFileCheck(const std::string& path)
+ReadCheck TextFileCheck(const std::string& path)
 {
     return [path](std::string_view head) { EnsureTextFile(head, path); };
 }

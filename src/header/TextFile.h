@@ -15,18 +15,19 @@ public:
     explicit NotTextFileError(const std::string& path);
 };
 
-// How far into a file the checks below look: enough for any header, and cheap for any file.
+// How far into a file LooksLikeLDraw looks: enough for any header, and cheap for any file.
 inline constexpr std::size_t LookedAtBytes = std::size_t{64} * 1024;
 
-// True when content is no text file: a NUL byte among its first 64 KiB, which no text file holds
-// and nearly every binary file does.
+// True when content is no text file: a NUL byte anywhere, which no text file holds and nearly
+// every binary file does (holes in a sparse file read as NUL too).
 bool LooksBinary(std::string_view content);
 
 // Throws NotTextFileError naming path when content looks binary.
 void EnsureTextFile(std::string_view content, const std::string& path);
 
-// EnsureTextFile as the look a read takes at a file's first bytes before it reads the rest.
-HeadCheck TextFileCheck(const std::string& path);
+// EnsureTextFile as the look a read takes at each piece of a file as it arrives: the first NUL
+// ends the read.
+ReadCheck TextFileCheck(const std::string& path);
 
 // True when the first 64 KiB of content hold an LDraw line: "0", spaces or tabs and a word, or a
 // geometry line of type 1 to 5. Notes or a letter saved as ".dat" hold none, and would open as an empty

@@ -48,6 +48,43 @@ TEST(CliValues, NoControlCharacterGetsIntoAHeaderLineAndTabsOnlyWhereTheyStay)
         }
 }
 
+// Values are text: bytes that are not UTF-8 would give a UTF-8 file a second encoding.
+TEST(CliValues, BytesThatAreNotUtf8AreRefused)
+{
+    for (const auto* option : {"--description", "--author", "--add-keywords", "--add-history"})
+        EXPECT_TRUE(refused(editWith(option, "Caf\xe9 Brick"), option, "is not valid UTF-8")) << option;
+}
+
+// A value goes into a UTF-8 file as UTF-8 and into an ISO-8859-1 file as ISO-8859-1; a value
+// that the file's encoding cannot hold fails that file, which is left as it is.
+TEST(CliValues, AValueIsWrittenInTheFilesOwnEncoding)
+{
+    TempDir dir;
+    const auto partBy = [](const std::string& author) {
+        return "0 Name: a.dat\r\n0 Author: " + author +
+               " [rene]\r\n0 !LDRAW_ORG Part\r\n0 !LICENSE L\r\n"
+               "0 BFC CERTIFY CCW\r\n1 16 0 0 0 1 0 0 0 1 0 0 0 1 b.dat\r\n";
+    };
+    const auto body = partBy("Ren\xe9");
+    const auto latin1 = dir.write("latin1.dat", "0 Brick\r\n" + body);
+    const auto utf8 = dir.write("utf8.dat", "0 Brick\r\n" + partBy("Ren\xc3\xa9"));
+    const auto edit = [](const std::string& value, const std::string& path) {
+        return RunCliWith({"edit", "--description", value, "--no-backup", path});
+    };
+    EXPECT_EQ(edit("Caf\xc3\xa9 Brick", latin1).status, 0);
+    EXPECT_EQ(ReadBytes(latin1).substr(0, 14), "0 Caf\xe9 Brick\r\n");
+    EXPECT_NE(ReadBytes(latin1).find("Author: Ren\xe9 [rene]"), std::string::npos);
+    EXPECT_EQ(edit("Caf\xc3\xa9 Brick", utf8).status, 0);
+    EXPECT_EQ(ReadBytes(utf8).substr(0, 15), "0 Caf\xc3\xa9 Brick\r\n");
+    const auto before = ReadBytes(latin1);
+    const auto outside = edit("Brick \xe2\x82\xac 1", latin1); // the euro sign
+    EXPECT_EQ(outside.status, 3);
+    EXPECT_EQ(outside.out, "failed " + latin1 +
+                               ": \"Brick \xe2\x82\xac 1\" cannot be written in this file's "
+                               "encoding (ISO-8859-1)\n");
+    EXPECT_EQ(ReadBytes(latin1), before);
+}
+
 TEST(CliValues, UpdateTagsAreYearAndReleaseAndUserNamesUseTheTrackersCharacters)
 {
     for (const auto* tag : {"-------", "20-4-01", "2024-0-", "2024-001", "2024_01", "２０２４-01"})

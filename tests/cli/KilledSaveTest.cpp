@@ -101,12 +101,14 @@ std::string killAt(const Road& road, const std::string& call, int count, const s
         execCli(road.noWriteFolder ? std::vector<std::string>{"save", "-j", "1", "--no-backup", path}
                                    : std::vector<std::string>{"save", "-j", "1", path});
     }));
-    const int opened = WaitFor(StartChild(false, [&] { // as root: another user than the saving one
+    // As the user who saved: another user's copy is never applied.
+    const int opened = WaitFor(StartChild(road.asNobody(), [&] {
         std::ostringstream err;
         ConsoleDialogs dialogs(err);
         const ReplaceOptions writing;
         int status = 0;
-        ReadForCli(OpenPart::openPath(path), path, dialogs, err, &writing, status);
+        RunReads reads;
+        ReadForCli(OpenPart::openPath(path), path, dialogs, err, &writing, status, reads);
         ::_exit(err.str().find("restored " + path + " from an interrupted save") == std::string::npos ? 0 : 1);
     }));
     const auto bytes = ReadBytes(path);

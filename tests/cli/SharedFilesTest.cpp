@@ -4,6 +4,7 @@
 // is locked, or lies in a folder that is swapped for a link.
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <csignal>
 #include <fcntl.h>
 #include <filesystem>
@@ -23,6 +24,7 @@
 #include "FileSave.h"
 #include "FixedClock.h"
 #include "KeepFile.h"
+#include "PartFile.h"
 #include "PartFileList.h"
 #include "TempDir.h"
 
@@ -111,6 +113,30 @@ TEST(WritingCommands, APartThatChangedSinceItsSaveWasKilledIsLeftAndFails)
     EXPECT_EQ(snapshot(dir.path()), before);
 }
 
+// Another user's copy beside the part is named once in a run that writes, and the save goes on.
+TEST(WritingCommands, AnotherUsersCopyIsNamedOnceAndTheSaveGoesOn)
+{
+    if (::geteuid() != 0)
+        GTEST_SKIP() << "needs root to give a copy another owner";
+    TempDir dir;
+    const auto path = dir.write("a.dat", Part);
+    {
+        KeepFile keep(*OpenPart::openPath(path), "0 his bytes\r\n", {Part + "0 // more\r\n"}, "");
+        keep.keep();
+    }
+    const auto copy = NamesIn(dir.path()).begin()->starts_with(".quillmark-keep-") ? *NamesIn(dir.path()).begin()
+                                                                                   : *NamesIn(dir.path()).rbegin();
+    ASSERT_EQ(::chown(dir.file(copy).c_str(), 12345, 12345), 0);
+    const auto run = RunCliWith({"edit", "--author", "Ann [ann]", "--no-backup", path});
+    EXPECT_EQ(run.status, 0) << run.out << run.err;
+    const std::string notice =
+        path + ": a copy left by another user's interrupted save is at " + dir.file(copy) +
+        "; it was not applied; the file stays as that save left it until that user saves it again";
+    EXPECT_NE(run.err.find(notice), std::string::npos) << run.err;
+    EXPECT_EQ(run.err.find(notice), run.err.rfind(notice)) << "named once";
+    EXPECT_NE(ReadBytes(path).find("Author: Ann [ann]"), std::string::npos);
+}
+
 // Another program appends to the part between the read and the save: the save fails, the append
 // stays.
 TEST(WritingCommands, AChangeBetweenReadAndSaveFailsTheSave)
@@ -121,7 +147,8 @@ TEST(WritingCommands, AChangeBetweenReadAndSaveFailsTheSave)
     ConsoleDialogs dialogs(err, [](const MessageBox&) { return Answer::No; });
     const ReplaceOptions run;
     int status = 0;
-    auto header = ReadForCli(OpenPart::openPath(path), path, dialogs, err, &run, status);
+    RunReads reads;
+    auto header = ReadForCli(OpenPart::openPath(path), path, dialogs, err, &run, status, reads);
     ASSERT_TRUE(header);
     header->PartDescription = "Brick 2 x 4";
     std::ofstream(path, std::ios::app) << "1 16 0 0 0 1 0 0 0 1 0 0 0 1 c.dat\r\n";
@@ -170,10 +197,56 @@ TEST(FolderRuns, AFolderSwappedForALinkIsNeverEntered)
     fs::rename(team.path() / "zzz", team.path() / "elsewhere");
     fs::create_directory_symlink(victims.path(), team.path() / "zzz");
     EXPECT_EQ(ReadBytes(OpenEntry(found.files[0])->path()), Part);
-    EXPECT_THROW(OpenEntry(found.files[1]), QmError);
+    try {
+        EXPECT_EQ(FileBytes(*OpenEntry(found.files[1])).view(), Part) << "the folder the walk saw";
+    } catch (const QmError&) {
+        // refused is as good
+    }
     RunCliWith({"edit", "--author", "Ann [ann]", "--no-backup", team.path().string()});
     EXPECT_EQ(ReadBytes(victim), "the victim's part");
     EXPECT_EQ(NamesIn(victims.path()), std::set<std::string>{"3001.dat"});
+}
+
+// A folder that another user replaces by a folder of his own after the walk saw it: no file of
+// his is taken for the one the walk found there, whether the walk still holds the folder or, past
+// the number of folders it holds, finds it again along its trail.
+TEST(FolderRuns, AFolderReplacedAfterTheWalkIsNeverEntered)
+{
+    for (const int folders : {2, 300}) {
+        TempDir team;
+        for (int i = 0; i < folders; ++i) {
+            fs::create_directories(team.path() / ("f" + std::to_string(i)));
+            team.write("f" + std::to_string(i) + "/3001.dat", Part);
+        }
+        const auto found = ExpandPartFiles({team.path().string()});
+        ASSERT_EQ(found.files.size(), static_cast<std::size_t>(folders));
+        const auto notHeld = std::find_if(found.files.begin(), found.files.end(),
+                                          [](const PartFileEntry& entry) { return !entry.folder->held; });
+        const auto& entry = notHeld != found.files.end() ? *notHeld : found.files.back();
+        ASSERT_EQ(folders > 2, notHeld != found.files.end());
+        fs::rename(team.path() / entry.folder->name, team.path() / "moved");
+        fs::create_directories(team.path() / entry.folder->name);
+        team.write(entry.folder->name + "/3001.dat", "0 his own part\r\n");
+        try {
+            EXPECT_EQ(FileBytes(*OpenEntry(entry)).view(), Part) << folders;
+        } catch (const QmError&) {
+            // refused is as good as the folder the walk saw
+        }
+    }
+}
+
+// One file named many times in one run: each name's turn comes after the save of the one
+// before, and reads what that save wrote, never the file it replaced.
+TEST(WritingCommands, EveryNameOfOneFileReadsWhatTheSaveBeforeWrote)
+{
+    TempDir dir;
+    const auto path = dir.write("a.dat", Part);
+    std::vector<std::string> args{"edit", "--author", "Ann [ann]", "--no-backup", "-j", "2"};
+    for (int name = 0; name < 20; ++name)
+        args.push_back(name % 2 == 0 ? path : dir.path().string() + "/./a.dat");
+    const auto run = RunCliWith(args);
+    EXPECT_EQ(run.status, 0) << run.out << run.err;
+    EXPECT_EQ(run.out.find("failed"), std::string::npos) << run.out;
 }
 
 // The copy a killed save kept of a file that is gone is named once and never written anywhere.
@@ -205,6 +278,32 @@ TEST(ReadingFiles, ABinaryFileIsRefusedBeforeItIsRead)
     ::wait4(cli, &status, 0, &usage);
     EXPECT_EQ(WEXITSTATUS(status), 2);
     EXPECT_LT(usage.ru_maxrss, 100 * 1024) << "KiB at the peak";
+}
+
+// A part whose text head is followed by holes holds NUL bytes: it is refused at the first one past
+// the head, before the rest is read, and never written, so no hole becomes a disk block.
+TEST(ReadingFiles, ASparsePartWithATextHeadIsRefusedAtItsFirstHole)
+{
+    TempDir dir;
+    std::string head = Part;
+    while (head.size() < 80 * 1024)
+        head += "0 // a comment line that fills the head of the part\r\n";
+    const auto path = dir.write("s.dat", head);
+    ASSERT_EQ(::truncate(path.c_str(), off_t{1} << 30), 0); // 1 GiB, the rest holes
+    const auto blocks = StatOf(path).st_blocks;
+    for (const auto& args : std::vector<std::vector<std::string>>{
+             {"check", path}, {"edit", "--author", "Ann [ann]", "--no-backup", path}}) {
+        const pid_t cli = startCli(args, dir);
+        int status = 0;
+        struct rusage usage {};
+        ::wait4(cli, &status, 0, &usage);
+        EXPECT_EQ(WEXITSTATUS(status), 2) << args[0];
+        EXPECT_LT(usage.ru_maxrss, 100 * 1024) << args[0] << ": KiB at the peak";
+        EXPECT_NE(ReadBytes(dir.file("err.txt")).find(path + " is not an LDraw text file."), std::string::npos)
+            << ReadBytes(dir.file("err.txt"));
+    }
+    EXPECT_EQ(StatOf(path).st_blocks, blocks);
+    EXPECT_EQ(StatOf(path).st_size, off_t{1} << 30);
 }
 
 } // namespace

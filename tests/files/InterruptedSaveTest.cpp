@@ -41,7 +41,11 @@ protected:
         const auto id = part->identity();
         return ".quillmark-keep-" + std::to_string(id.device) + "-" + std::to_string(id.inode);
     }
-    bool restore() { return RestoreInterruptedSave(*part, nullptr, {}, home.path().string()); }
+    KeepFinding::State restoreFinding()
+    {
+        return RestoreInterruptedSave(*part, nullptr, {}, home.path().string()).state;
+    }
+    bool restore() { return restoreFinding() == KeepFinding::State::Restorable; }
 
     TempDir dir, home;
     const std::string path = dir.write("a.dat", Old);
@@ -68,8 +72,8 @@ TEST_F(InterruptedSave, ARewriteThatEndedStays)
     EXPECT_EQ(NamesIn(dir.path()), std::set<std::string>{"a.dat"});
 }
 
-// The user wrote the part again after the kill, or the file system gave the part's inode to
-// another file: the part is left alone and the copy stays where the message says.
+// The user wrote the part again after the kill: the part is left alone and the copy stays where
+// the message says.
 TEST_F(InterruptedSave, APartThatChangedSinceKeepsItsBytesAndTheCopyStays)
 {
     interruptedWith("0 the user's own later text\r\n" + std::string(Old.size(), 'x'));
@@ -85,17 +89,70 @@ TEST_F(InterruptedSave, APartThatChangedSinceKeepsItsBytesAndTheCopyStays)
     }
     EXPECT_EQ(ReadBytes(path), later);
     EXPECT_TRUE(fs::exists(dir.file(keepName())));
+}
 
-    // Another file on the same inode: the copy names the part's birth, which that file does not share.
-    TempDir::writeTo(path, Old); // in place, the same inode
+// A part that another program cut short after the kill is no state the rewrite leaves, however
+// well its bytes match the new text's start and the old text's end.
+TEST_F(InterruptedSave, APartShorterThanTheOldBytesIsAChange)
+{
+    const auto shortened = New.substr(0, 5) + Old.substr(5, Old.size() - 12);
+    interruptedWith(shortened);
+    EXPECT_THROW(restore(), KeepNotRestoredError);
+    EXPECT_EQ(ReadBytes(path), shortened);
+}
+
+// The part was deleted after the kill, and a new file got its inode: the copy names the old
+// file's birth, which the new one does not share. It never touches the new file nor stops its
+// saves.
+TEST_F(InterruptedSave, ACopyOfAFileThatIsGoneNeverStopsTheFileOnItsInode)
+{
+    interruptedWith(New.substr(0, 5) + Old.substr(5)); // as torn as can be
     auto record = ReadBytes(dir.file(keepName()));
     const auto born = std::to_string(part->identity().bornSeconds);
     record.replace(record.find(" " + born + " "), born.size() + 2, " 1 ");
     fs::remove(dir.file(keepName()));
     TempDir::writeTo(dir.file(keepName()), record);
-    TempDir::writeTo(path, New.substr(0, 5) + Old.substr(5)); // as torn as can be
-    EXPECT_THROW(restore(), KeepNotRestoredError);
+    ::chmod(dir.file(keepName()).c_str(), 0600);
+    EXPECT_EQ(restoreFinding(), KeepFinding::State::Orphan);
     EXPECT_EQ(ReadBytes(path), New.substr(0, 5) + Old.substr(5));
+    ReplaceOptions options;
+    options.home = home.path().string();
+    ReplacePart(part, {New}, options);
+    EXPECT_EQ(ReadBytes(path), New);
+    EXPECT_EQ(ReadBytes(dir.file(keepName())), record) << "the copy stays for its owner to look at";
+}
+
+// In a setgid folder a file that another user makes takes the part's group. His forged copy, as
+// anyone can write one, is never written into the part, however well it names it; the part stays
+// as it is, and saves go on.
+TEST_F(InterruptedSave, AnotherUsersCopyIsNeverApplied)
+{
+    if (::geteuid() != 0)
+        GTEST_SKIP() << "needs root to give a copy another owner";
+    ASSERT_EQ(::chmod(dir.path().c_str(), 02775), 0);
+    ASSERT_EQ(::chmod(path.c_str(), 0664), 0);
+    interruptedWith(New.substr(0, 5) + Old.substr(5));
+    const auto copy = dir.file(keepName());
+    ASSERT_EQ(::chown(copy.c_str(), 12345, StatOf(path).st_gid), 0);
+    const auto finding = ExamineKeepFile(*part, home.path().string());
+    EXPECT_EQ(finding.state, KeepFinding::State::OthersCopy);
+    EXPECT_EQ(OthersCopyNotice(path, finding),
+              path + ": a copy left by another user's interrupted save is at " + copy +
+                  "; it was not applied; the file stays as that save left it until that user saves it again");
+    EXPECT_EQ(restoreFinding(), KeepFinding::State::OthersCopy);
+    EXPECT_EQ(ReadBytes(path), New.substr(0, 5) + Old.substr(5));
+    // His copy, even one nobody else may write, is still his; and one of this user's that others
+    // may write could be anyone's.
+    ASSERT_EQ(::chmod(copy.c_str(), 0600), 0);
+    EXPECT_EQ(restoreFinding(), KeepFinding::State::OthersCopy);
+    ASSERT_EQ(::chown(copy.c_str(), 0, StatOf(path).st_gid), 0);
+    ASSERT_EQ(::chmod(copy.c_str(), 0660), 0);
+    EXPECT_EQ(restoreFinding(), KeepFinding::State::OthersCopy);
+    ReplaceOptions options;
+    options.home = home.path().string();
+    ReplacePart(part, {New}, options);
+    EXPECT_EQ(ReadBytes(path), New);
+    EXPECT_TRUE(fs::exists(copy));
 }
 
 TEST_F(InterruptedSave, ACopyWhoseWriterStillHoldsItIsLeftAlone)

@@ -4,8 +4,11 @@
 #include <gtest/gtest.h>
 
 #include <cstring>
+#include <fcntl.h>
 #include <fstream>
+#include <future>
 #include <memory>
+#include <sys/file.h>
 #include <sys/wait.h>
 #include <sys/xattr.h>
 #include <thread>
@@ -46,6 +49,34 @@ TEST(AnotherUsersFile, IsRefusedWhenOnlyItsOwnerMayWriteIt)
     EXPECT_EQ(WEXITSTATUS(WaitFor(StartChild(true, [&] { ::_exit(saveStatus(rootsOwn)); }))), 70);
     EXPECT_EQ(ReadBytes(rootsOwn), OldContent);
     EXPECT_EQ(NamesIn(dir.path()), std::set<std::string>{"roots.dat"});
+}
+
+// A user who may write the part but not its folder gets no backup there, and is told so in words
+// before anything is written.
+TEST(AnotherUsersFolder, SaysTheBackupCannotBeMadeThere)
+{
+    if (::geteuid() != 0)
+        GTEST_SKIP() << "needs root to act as another user";
+    TempDir dir;
+    fs::permissions(dir.path(), fs::perms(0755));
+    const auto path = dir.write("3001.dat", OldContent);
+    ASSERT_EQ(::chown(path.c_str(), 65534, 65534), 0); // nobody's, in root's folder
+    int said[2];
+    ASSERT_EQ(::pipe(said), 0);
+    WaitFor(StartChild(true, [&] {
+        try {
+            ReplaceFileSafely(path, {NewContent}, withBackup(dir.file(BackupName)));
+        } catch (const QmError& error) {
+            [[maybe_unused]] const auto written =
+                ::write(said[1], error.description().data(), error.description().size());
+        }
+    }));
+    ::close(said[1]);
+    std::string message(512, '\0');
+    message.resize(static_cast<std::size_t>(std::max<ssize_t>(0, ::read(said[0], message.data(), message.size()))));
+    ::close(said[0]);
+    EXPECT_EQ(message, "cannot make the backup " + dir.file(BackupName) + ": permission denied");
+    EXPECT_EQ(ReadBytes(path), OldContent);
 }
 
 // A save killed between making the backup and renaming leaves the part and its backup as one
@@ -93,6 +124,75 @@ TEST(ChangedWhileSaving, EndsTheSaveAndKeepsTheOtherWrite)
             EXPECT_EQ(names, removed ? std::set<std::string>{} : std::set<std::string>{"3001.dat"});
         }
     }
+}
+
+// A hard-linked part is rewritten in place, where the new text lands in the file another program
+// has open. Its append, or its write over bytes already rewritten, after the last write and
+// before the part is cut to length, is never cut away or overwritten unnoticed: the save fails,
+// the file as it stood is in a copy beside the part, and the part holds its old bytes again.
+TEST(ChangedWhileRewritingInPlace, FailsTheSaveAndKeepsTheOtherWrite)
+{
+    const std::string Shorter = "0 n\r\n";
+    for (const bool append : {true, false}) {
+        TempDir dir;
+        const auto path = dir.write("3001.dat", OldContent);
+        fs::create_hard_link(path, dir.file("second.dat"));
+        ReplaceOptions options;
+        options.afterStep = [&](ReplaceStep reached) {
+            if (reached != ReplaceStep::WrittenInPlace)
+                return;
+            if (append)
+                std::ofstream(path, std::ios::app) << "1 4 theirs.dat\r\n";
+            else
+                std::fstream(path, std::ios::in | std::ios::out) << "X";
+        };
+        try {
+            ReplaceFileSafely(path, {Shorter}, options);
+            ADD_FAILURE() << "saved; append " << append;
+        } catch (const ChangedWhileSavingError& error) {
+            const auto copy = dir.file("3001.dat.changed-while-saving");
+            EXPECT_EQ(error.description(), path + ": changed while saving; the file as another program left it is in " +
+                                               copy + ", and its old bytes are back");
+            // The write over rewritten bytes is seen before or after the cut, as the clock's tick falls.
+            if (append)
+                EXPECT_EQ(ReadBytes(copy), Shorter + OldContent.substr(Shorter.size()) + "1 4 theirs.dat\r\n");
+            else
+                EXPECT_TRUE(ReadBytes(copy).starts_with("X" + Shorter.substr(1))) << ReadBytes(copy);
+        }
+        EXPECT_EQ(ReadBytes(path), OldContent);
+        EXPECT_EQ(NamesIn(dir.path()),
+                  (std::set<std::string>{"3001.dat", "second.dat", "3001.dat.changed-while-saving"}));
+    }
+}
+
+// Another program that holds the part locked makes a save wait, for a while and no longer.
+TEST(LockedPart, IsWaitedForUpToThePatience)
+{
+    TempDir dir;
+    const auto path = dir.write("3001.dat", OldContent);
+    const FileDescriptor holder(::open(path.c_str(), O_RDONLY | O_CLOEXEC));
+    ASSERT_EQ(::flock(holder.get(), LOCK_EX), 0);
+    ReplaceOptions options;
+    options.lockWait.patience = std::chrono::milliseconds(100);
+    auto save = std::async(std::launch::async, [&] { ReplaceFileSafely(path, {NewContent}, options); });
+    // A watchdog: a save that waits for ever is let go, and fails the test.
+    if (save.wait_for(std::chrono::seconds(30)) != std::future_status::ready) {
+        ADD_FAILURE() << "the save still waits";
+        ::flock(holder.get(), LOCK_UN);
+    }
+    EXPECT_THROW(save.get(), FileLockedError);
+    EXPECT_EQ(ReadBytes(path), OldContent);
+}
+
+// What a killed save left in the part's folder goes with the next save there.
+TEST(LeftoversOfKilledSaves, AreSweptByTheNextSave)
+{
+    TempDir dir;
+    const auto path = dir.write("3001.dat", OldContent);
+    dir.write(".quillmark-save-0123456789abcdef", "a killed save's text");
+    std::this_thread::sleep_for(std::chrono::milliseconds(50)); // older than the save
+    ReplaceFileSafely(path, {NewContent});
+    EXPECT_EQ(NamesIn(dir.path()), std::set<std::string>{"3001.dat"});
 }
 
 // Another user who may write the folder swaps the part for a link to a file of the victim's

@@ -154,9 +154,30 @@ TEST_F(SaveFaults, AFailingStepKeepsTheOldFileAndLeavesNothingBehind)
 TEST_F(SaveFaults, AFailedRewriteInPlaceBringsBackTheOldBytes)
 {
     std::filesystem::create_hard_link(path, dir.file("second.dat"));
-    EXPECT_EQ(failureNumber("ftruncate", EROFS, false), 70);
+    EXPECT_EQ(failureNumber("ftruncate", EIO, false), 57);
     EXPECT_EQ(ReadBytes(dir.file("second.dat")), OldBytes);
     EXPECT_EQ(NamesIn(dir.path()), (std::set<std::string>{"3001.dat", "second.dat"}));
+}
+
+// A backup that cannot be made stops the save with one message: the backup's path and the
+// system's reason in words.
+TEST_F(SaveFaults, ABackupThatCannotBeMadeSaysWhyInWords)
+{
+    for (const auto& [error, words] :
+         {std::pair{EACCES, "permission denied"}, std::pair{EROFS, "read-only file system"}}) {
+        failNext = "linkat";
+        failErrno = error;
+        ReplaceOptions options;
+        options.backupPath = backup;
+        try {
+            ReplaceFileSafely(path, {NewBytes}, options);
+            ADD_FAILURE() << "saved";
+        } catch (const QmError& failure) {
+            EXPECT_EQ(failure.description(), "cannot make the backup " + backup + ": " + words);
+        }
+        EXPECT_EQ(ReadBytes(path), OldBytes);
+        EXPECT_EQ(NamesIn(dir.path()), std::set<std::string>{"3001.dat"});
+    }
 }
 
 TEST_F(SaveFaults, ABackupThatCannotBeASecondNameIsACopy)

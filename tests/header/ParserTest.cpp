@@ -225,7 +225,7 @@ TEST(ParserAnyInput, OddBytesAreJustTextButBinaryFilesAreRefused)
         EXPECT_STREQ(refused.what(), "/parts/picture.dat is not an LDraw text file.");
     }
     const std::string lateNul = "0 d\r\n0 // " + std::string(64 * 1024, 'x') + std::string(1, '\0');
-    EXPECT_EQ(parseText(lateNul).PartDescription, "d") << "only the first 64 KiB are looked at";
+    EXPECT_THROW(parseText(lateNul), NotTextFileError) << "a NUL beyond the first 64 KiB refuses the file too";
     const auto blanks = parseLines({"0 d", "0 !KEYWORDS" + std::string(100000, ' ') + "x"});
     EXPECT_EQ(blanks.Keywords, (EntryList{"x"})) << "empty words before the first word are skipped";
     const auto longLine = parseLines({"0 d", "1" + std::string(10 * 1024 * 1024, 'x')});
