@@ -72,9 +72,11 @@ FileDescriptor OpenPart::openForWriting() const
     return fd;
 }
 
-bool OpenPart::mayWrite() const
+int OpenPart::writeDenial() const
 {
-    return ::faccessat(AT_FDCWD, DescriptorPath(fd_.get()).c_str(), W_OK, AT_EACCESS) == 0;
+    if ((status().st_mode & 0222) == 0)
+        return EACCES;
+    return ::faccessat(AT_FDCWD, DescriptorPath(fd_.get()).c_str(), W_OK, AT_EACCESS) == 0 ? 0 : errno;
 }
 
 std::string DescriptorPath(int fd) { return "/proc/self/fd/" + std::to_string(fd); }

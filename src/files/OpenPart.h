@@ -51,7 +51,10 @@ public:
     // The same file opened again for writing, found through this descriptor, never by name.
     FileDescriptor openForWriting() const;
     // True when this user may write the file.
-    bool mayWrite() const;
+    bool mayWrite() const { return writeDenial() == 0; }
+    // 0 when this user may write the file; otherwise the system's reason, as an errno value (a file
+    // without any write permission is denied even to root).
+    int writeDenial() const;
 
     OpenPart(std::shared_ptr<const OpenFolder> folder, std::string name, std::string path, FileDescriptor fd)
         : folder_(std::move(folder)), name_(std::move(name)), path_(std::move(path)), fd_(std::move(fd))
