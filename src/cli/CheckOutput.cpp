@@ -2,7 +2,6 @@
 #include "CheckOutput.h"
 
 #include "FieldsJson.h"
-#include "FileLinePlaces.h"
 #include "SarifLog.h"
 
 nlohmann::ordered_json CheckJson(const HeaderData& header, const SaveFindings& save,
@@ -21,17 +20,20 @@ nlohmann::ordered_json CheckJson(const HeaderData& header, const SaveFindings& s
         for (const auto& finding : *tracker) {
             auto& entry = json["tracker"].emplace_back(nlohmann::ordered_json{
                 {"id", finding.id}, {"level", SeverityText(finding.severity)}, {"text", finding.message}});
-            if (finding.line > 0)
-                entry["line"] = finding.line;
+            if (!finding.place.wholeFile) {
+                entry["line"] = finding.place.line;
+                entry["column"] = finding.place.column;
+            }
         }
     }
     return json;
 }
 
 std::string CheckOutput(OutputFormat format, const HeaderData& header, const std::string& composedHeader,
-                        const SaveFindings& save, const std::vector<TrackerFinding>* tracker)
+                        std::string_view fileBytes, const SaveFindings& save,
+                        const std::vector<TrackerFinding>* tracker)
 {
-    const FileLinePlaces places(header, composedHeader);
+    const FindingPlaces places(fileBytes, header, composedHeader);
     const auto trackerFindings =
         tracker != nullptr ? TrackerFileFindings(*tracker, places) : std::vector<FileFinding>{};
     if (format == OutputFormat::Json)

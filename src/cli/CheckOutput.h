@@ -9,9 +9,10 @@
 #include "FindingLines.h"
 
 // One file's output of check in the chosen form; tracker is null unless the Parts Tracker's
-// rules were checked. composedHeader is the header a save would write.
+// rules were checked. composedHeader is the header a save would write, fileBytes the file as read.
 std::string CheckOutput(OutputFormat format, const HeaderData& header, const std::string& composedHeader,
-                        const SaveFindings& save, const std::vector<TrackerFinding>* tracker);
+                        std::string_view fileBytes, const SaveFindings& save,
+                        const std::vector<TrackerFinding>* tracker);
 
 // The JSON object of a file's save checks, and of its Tracker findings when given.
 nlohmann::ordered_json CheckJson(const HeaderData& header, const SaveFindings& save,
