@@ -5,6 +5,8 @@
 #include <algorithm>
 #include <string_view>
 
+#include "FindingPlaces.h"
+#include "PartFile.h"
 #include "SaveChecks.h"
 #include "TrackerFixes.h"
 
@@ -69,6 +71,21 @@ void judgeRepair(StopRow& row, const HeaderData& header, const StopContext& cont
     row.note = translated("No repair here: ") + (why.empty() ? translated("it would change nothing") : why) + ".";
 }
 
+// Each row's line on disk, counted as the command line counts it; 0 for the file as a whole. The
+// file is read again for them only when there are rows.
+void placeRows(std::vector<StopRow>& rows, const HeaderData& header, const std::string& composedHeader)
+{
+    if (rows.empty() || !header.Part)
+        return;
+    const auto bytes = FileBytes(*header.Part).takeBytes();
+    const FindingPlaces places(bytes, header, composedHeader);
+    for (auto& row : rows) {
+        const auto place = IsSaveCheckRow(row) ? places.ofHeaderKeyword(HeaderKeywordOfSaveCheck(row.finding.id))
+                                               : places.of(row.finding);
+        row.finding.line = place.wholeFile ? 0 : static_cast<int>(place.line);
+    }
+}
+
 } // namespace
 
 std::vector<StopRow> WhatStopsTheSave(const HeaderData& header, const std::string& composedHeader,
@@ -89,6 +106,7 @@ std::vector<StopRow> WhatStopsTheSave(const HeaderData& header, const std::strin
         }
         rows.push_back(std::move(row));
     }
+    placeRows(rows, header, composedHeader);
     return rows;
 }
 

@@ -112,3 +112,28 @@ TEST_F(WindowTest, TheCountAfterASaveIncludesTheSaveChecks)
 }
 
 } // namespace
+
+namespace {
+
+// Lines are the file's on disk, as grep -n and the command line count them: after a comment that
+// holds a lone CR, which the Tracker's rules take as a line end, and below a header that the
+// composer lays out anew.
+TEST_F(WindowTest, TheDialogsLineNumbersAreTheFilesOnDisk)
+{
+    startUp();
+    auto numbered = GoodPart;
+    numbered.replace(numbered.find("2 x 4"), 5, "2 x  4");
+    openThroughPendingFile(part("3001.dat", numbered + "0 // a lone\rCR\r\n"));
+    whenDialogShows<frmTracker>([](frmTracker& dialog) {
+        dialog.reject();
+        auto& table = *dialog.findChild<QTableWidget*>("tbFindings");
+        const int row = rowOf(table, "line.invalid");
+        EXPECT_EQ(row, 0);
+        if (row == 0) {
+            EXPECT_EQ(table.item(row, LineColumn)->text(), "16");
+        }
+    });
+    child<QAction>("MTrackerCheck")->trigger();
+}
+
+} // namespace
