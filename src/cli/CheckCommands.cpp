@@ -11,6 +11,7 @@
 #include <unistd.h>
 
 #include "Batch.h"
+#include "CheckConfig.h"
 #include "CheckOutput.h"
 #include "CliFiles.h"
 #include "Clock.h"
@@ -26,6 +27,8 @@
 #include "NewFile.h"
 #include "PartFile.h"
 #include "PartFileList.h"
+#include "PartSettings.h"
+#include "Paths.h"
 #include "QmError.h"
 #include "SarifLog.h"
 #include "Summary.h"
@@ -33,8 +36,6 @@
 #include "TrackerCheck.h"
 
 namespace {
-
-using TrackerFindings = std::vector<TrackerFinding>;
 
 // Where the Tracker's colour codes come from; none when the built-in list cannot be read.
 std::unique_ptr<ColourSource> colourSource(const std::string& ldconfig, std::ostream& err)
@@ -51,6 +52,17 @@ std::unique_ptr<ColourSource> colourSource(const std::string& ldconfig, std::ost
 }
 
 std::string firstLine(const std::string& text) { return text.substr(0, text.find('\r')); }
+
+// Takes the refusal of the check id out of findings; whether there was one.
+bool takeRefusal(SaveFindings& findings, std::string_view id)
+{
+    const auto found = std::find(findings.refusalIds.begin(), findings.refusalIds.end(), id);
+    if (found == findings.refusalIds.end())
+        return false;
+    findings.refusals.erase(findings.refusals.begin() + (found - findings.refusalIds.begin()));
+    findings.refusalIds.erase(found);
+    return true;
+}
 
 void noteFindings(FileReport& report, const SaveFindings& findings)
 {
@@ -153,8 +165,10 @@ std::string outputClosedText(int error)
     return std::string("standard output closed (") + (name != nullptr ? name : "error") + ")";
 }
 
+// writeOut, when given, writes each file's standard output instead of out.
 int runBatch(const std::vector<std::string>& arguments, const BatchOptions& batch, std::ostream& out, std::ostream& err,
-             const std::function<FileReport(const PartFileEntry&)>& work)
+             const std::function<FileReport(const PartFileEntry&)>& work,
+             const std::function<void(const std::string&)>& writeOut = {})
 {
     const auto found = ExpandPartFiles(arguments);
     const auto& files = found.files;
@@ -170,7 +184,10 @@ int runBatch(const std::vector<std::string>& arguments, const BatchOptions& batc
     const bool whole = RunInOrder(
         files.size(), ThreadsFor(batch.threads), [&](std::size_t index) { return work(files[index]); },
         [&](FileReport& report) {
-            out << report.out;
+            if (writeOut)
+                writeOut(report.out);
+            else
+                out << report.out;
             err << report.err;
             summary.add(report);
             status = std::max(status, report.status);
@@ -227,46 +244,73 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
 {
     StringList categories;
     std::unique_ptr<ColourSource> colours;
-    if (options.tracker &&
-        (!ReadStandardList(ListKind::Category, categories, err) || !(colours = colourSource(options.ldconfig, err))))
+    if (options.tracker && (!ReadStandardList(ListKind::Category, categories, err) ||
+                            !(colours = colourSource(options.settings.ldconfig, err))))
         return ExitStatus::Unreadable;
+    CheckConfigs configs(options.config, !options.isolated);
+    // A wrong config named on the command line is a wrong command line: no file is read.
+    if (const auto named = options.config.empty() ? CheckConfigs::Found{} : configs.forPart(options.config);
+        named.error != nullptr) {
+        err << "quillmark-cli: " << *named.error << '\n';
+        return ExitStatus::Usage;
+    }
+    std::error_code noFolder;
+    const OutputForm form{options.format, options.format == OutputFormat::Github
+                                              ? GithubBaseFolder()
+                                              : std::filesystem::current_path(noFolder).string()};
+    std::optional<SarifLogWriter> sarif;
+    if (options.format == OutputFormat::Sarif)
+        sarif.emplace(out, form.base);
     MemoryClaims memory;
-    // A SARIF log is one document: its results are gathered and written at the end.
-    const bool sarif = options.format == OutputFormat::Sarif;
-    std::ostringstream sarifResults;
-    const auto status = runBatch(arguments, batch, sarif ? sarifResults : out, err, [&](const PartFileEntry& entry) {
-        const auto& path = entry.path;
-        // A check never writes, not even to undo what a killed save left: the next save does that.
-        return reportOn(
-            entry, batch.quiet, {}, nullptr, memory,
-            [&](const HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
-                const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
-                const auto composed = ComposeHeader(header);
-                TrackerFindings tracker; // empty unless asked for
-                if (options.tracker) {
-                    const auto& codes =
-                        colours->forPart(path, [&dialogs](const std::string& text) { dialogs.message({text}); });
-                    tracker = CheckRecordForTracker(header, composed, categories, codes);
-                }
-                // The file is read again for the places of its findings only when it has any.
-                const auto bytes =
-                    tracker.empty() && findings.refusals.empty() && !findings.missingUserName && !findings.fixups.color
-                        ? std::string()
-                        : FileBytes(*header.Part).takeBytes();
-                report.out = CheckOutput(options.format, header, composed, bytes, findings,
-                                         options.tracker ? &tracker : nullptr);
-                noteFindings(report, findings);
-                bool trackerRefuses = false;
-                for (const auto& finding : tracker) {
-                    report.trackerIds.push_back(finding.id);
-                    trackerRefuses = trackerRefuses || finding.level == FindingLevel::Error;
-                }
-                report.refused = trackerRefuses;
-                report.status = findings.refusals.empty() && !trackerRefuses ? ExitStatus::Ok : ExitStatus::Refused;
-            });
-    });
+    const auto checkOne = [&](const HeaderData& header, const PartSettings& settings, ConsoleDialogs& dialogs,
+                              FileReport& report) {
+        CheckedFile file;
+        file.save = EvaluateSaveChecks(header, settings.limitDescription);
+        // The Tracker takes a long description: under its rules the length alone only warns.
+        if (options.tracker)
+            file.lengthWarning = takeRefusal(file.save, SaveCheckIds::DescriptionLength);
+        const auto composed = ComposeHeader(header);
+        if (options.tracker) {
+            const auto tell = [&dialogs](const std::string& text) { dialogs.message({text}); };
+            const auto& codes = settings.ldconfig.empty() ? colours->forPart(header.FilePath, tell)
+                                                          : colours->ofLDConfig(settings.ldconfig, tell);
+            file.tracker = CheckRecordForTracker(header, composed, categories, codes);
+            file.trackerChecked = true;
+        }
+        KeepReported(file, settings.choice);
+        const auto findings = PlacedFindings(file, header, composed);
+        report.out = CheckOutput(form, header, file, findings);
+        noteFindings(report, file.save);
+        for (const auto& finding : file.tracker)
+            report.trackerIds.push_back(finding.id);
+        report.refused = std::any_of(findings.begin(), findings.end(), [&](const FileFinding& finding) {
+            return settings.choice.fails(finding.severity);
+        });
+        report.status = report.refused ? ExitStatus::Refused : ExitStatus::Ok;
+    };
+    const auto status = runBatch(
+        arguments, batch, out, err,
+        [&](const PartFileEntry& entry) {
+            const auto partPath = AbsolutePath(entry.path);
+            const auto config = configs.forPart(partPath);
+            if (config.error != nullptr) {
+                FileReport report;
+                report.status = ExitStatus::Usage;
+                report.unreadable = true;
+                if (config.firstTold)
+                    report.err = "quillmark-cli: " + *config.error + '\n';
+                return report;
+            }
+            const auto settings = SettingsForPart(options.settings, config.config, partPath);
+            // A check never writes, not even to undo what a killed save left: the next save does that.
+            return reportOn(entry, batch.quiet, {}, nullptr, memory,
+                            [&](const HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
+                                checkOne(header, settings, dialogs, report);
+                            });
+        },
+        sarif ? [&sarif](const std::string& text) { sarif->write(text); } : std::function<void(const std::string&)>{});
     if (sarif)
-        WriteSarifLog(sarifResults.view(), out);
+        sarif->finish();
     return status;
 }
 
@@ -353,7 +397,7 @@ int RunEdit(const std::vector<std::string>& arguments, const SaveOptions& option
             const auto notes = edit.afterEdits ? edit.afterEdits(header) : std::vector<std::string>{};
             if (edit.json) {
                 const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
-                auto json = CheckJson(header, findings, nullptr);
+                auto json = CheckJson(header, findings);
                 json["old_header"] = HeaderTextForJson(header.OldHeader, header.Encoding);
                 json["new_header"] = HeaderTextForJson(ComposeHeader(header), header.Encoding);
                 if (edit.afterEdits) {

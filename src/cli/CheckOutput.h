@@ -7,13 +7,34 @@
 
 #include "FileFindings.h"
 #include "FindingLines.h"
+#include "RuleChoice.h"
 
-// One file's output of check in the chosen form; tracker is null unless the Parts Tracker's
-// rules were checked. composedHeader is the header a save would write, fileBytes the file as read.
-std::string CheckOutput(OutputFormat format, const HeaderData& header, const std::string& composedHeader,
-                        std::string_view fileBytes, const SaveFindings& save,
-                        const std::vector<TrackerFinding>* tracker);
+// What check reports of one file: the save checks and, when asked for, the Parts Tracker's rules,
+// the findings a rule choice leaves out already taken out.
+struct CheckedFile {
+    SaveFindings save;
+    bool lengthWarning = false; // under the Tracker's rules a long description is a warning, not a refusal
+    bool trackerChecked = false;
+    std::vector<TrackerFinding> tracker;
+};
 
-// The JSON object of a file's save checks, and of its Tracker findings when given.
-nlohmann::ordered_json CheckJson(const HeaderData& header, const SaveFindings& save,
-                                 const std::vector<FileFinding>* tracker);
+// Takes out of file what choice does not report.
+void KeepReported(CheckedFile& file, const RuleChoice& choice);
+
+// Every finding of file with its place in the file on disk, in the order of the places.
+std::vector<FileFinding> PlacedFindings(const CheckedFile& file, const HeaderData& header,
+                                        const std::string& composedHeader);
+
+// The forms check writes, and the folder their paths are relative to (the working folder, for
+// GitHub $GITHUB_WORKSPACE when set).
+struct OutputForm {
+    OutputFormat format = OutputFormat::Text;
+    std::string base;
+};
+
+// One file's output of check in the chosen form.
+std::string CheckOutput(const OutputForm& form, const HeaderData& header, const CheckedFile& file,
+                        const std::vector<FileFinding>& findings);
+
+// The JSON object of a file's save checks, without its Tracker findings.
+nlohmann::ordered_json CheckJson(const HeaderData& header, const SaveFindings& save);

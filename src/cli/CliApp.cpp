@@ -12,8 +12,10 @@
 #include "ClosestWord.h"
 #include "ConsoleDialogs.h"
 #include "EditCommandLine.h"
+#include "ExplainCommand.h"
 #include "FixCommand.h"
 #include "PrintCommands.h"
+#include "RuleChoice.h"
 
 namespace {
 
@@ -46,6 +48,7 @@ public:
         batch_.errIsTerminal = errIsTerminal;
         addReadCommands();
         addCheck();
+        addExplain();
         addSaveAndEdit();
     }
 
@@ -64,7 +67,9 @@ public:
         if (*fields_)
             return RunFields(files_, dialogs, out, err);
         if (*check_)
-            return RunCheck(files_, checkOptions_, batch_, out, err);
+            return runCheck(out, err);
+        if (*explain_)
+            return RunExplain(explainId_, explainMarkdown_, out, err);
         if (*save_)
             return RunSave(files_, saveOptions_, batch_, out, err);
         if (*edit_)
@@ -136,9 +141,9 @@ private:
         auto* format =
             check_
                 ->add_option("--format", checkOptions_.format,
-                             "text: \"path:line: level id: message\" per finding, as compilers write them; json: one "
-                             "object per file and line; sarif: one SARIF 2.1.0 log for code scanning; github: GitHub "
-                             "Actions annotations")
+                             "text: \"path:line:column: severity: message [id]\" per finding, as compilers write "
+                             "them; json: one object per file and line; sarif: one SARIF 2.1.0 log for code scanning; "
+                             "github: GitHub Actions annotations")
                 ->transform(CLI::CheckedTransformer(formats, CLI::ignore_case))
                 ->option_text("text|json|sarif|github");
         check_
@@ -150,12 +155,58 @@ private:
                          "Rules that need the Tracker's database (registered authors, duplicates, held subfiles) are "
                          "not checked.");
         check_
-            ->add_option("--ldconfig", checkOptions_.ldconfig,
+            ->add_option("--ldconfig", checkOptions_.settings.ldconfig,
                          "The LDConfig.ldr whose colour codes --tracker accepts (default: the first LDConfig.ldr in "
                          "the file's folder or above it, else the built-in list)")
             ->check(ReadableFile);
+        check_
+            ->add_option("--select", select_,
+                         "Report only these rules, by id (a,b); an id ending in \".\" names a group: numbers., save.")
+            ->delimiter(',');
+        check_->add_option("--ignore", ignore_, "Do not report these rules, by id or group as for --select")
+            ->delimiter(',');
+        check_
+            ->add_option("--fail-on", failOn_,
+                         "The findings that make the exit status 1: error (the default), "
+                         "warning (warnings too) or never")
+            ->check(CLI::IsMember({"error", "warning", "never"}));
+        auto* config = check_
+                           ->add_option("--config", checkOptions_.config,
+                                        "The quillmark.toml for every file (default: the nearest one in the file's "
+                                        "folder or above it)")
+                           ->check(ReadableFile);
+        check_->add_flag("--isolated", checkOptions_.isolated, "Read no quillmark.toml")->excludes(config);
         addBatchOptions(check_);
         check_->add_option("FILE", files_, "Part files or folders to check")->required();
+    }
+
+    void addExplain()
+    {
+        explain_ = app_.add_subcommand("explain", "Print what the rule ID checks, why the library has it, whether "
+                                                  "and how a command repairs it, and an example.");
+        explain_->footer("Exit status:\n  0  the rule was explained\n  2  no check reports ID, or the command "
+                         "line is wrong\n");
+        auto* markdown =
+            explain_->add_flag("--markdown", explainMarkdown_, "Print every rule as the Markdown page docs/rules.md");
+        explain_->add_option("ID", explainId_, "The id of a finding, as check prints it")->excludes(markdown);
+    }
+
+    int runCheck(std::ostream& out, std::ostream& err)
+    {
+        for (const auto* patterns : {&select_, &ignore_})
+            if (const auto unknown = UnknownRulePattern(*patterns)) {
+                err << "quillmark-cli: " << (patterns == &select_ ? "--select " : "--ignore ") << *unknown << '\n';
+                return ExitStatus::Usage;
+            }
+        auto& given = checkOptions_.settings;
+        if (check_->count("--select") > 0)
+            given.select = select_;
+        if (check_->count("--ignore") > 0)
+            given.ignore = ignore_;
+        if (!failOn_.empty())
+            given.failOn = FailOnNamed(failOn_);
+        given.noLengthLimit = noLengthLimit_;
+        return RunCheck(files_, checkOptions_, batch_, out, err);
     }
 
     void addSaveOptions(CLI::App* command)
@@ -215,8 +266,11 @@ private:
     }
 
     CLI::App app_{"quillmark-cli: reads LDraw part files (*.dat) the way the Quillmark editor opens them."};
-    CLI::App *fields_ = nullptr, *check_ = nullptr, *save_ = nullptr, *edit_ = nullptr, *fix_ = nullptr;
-    std::vector<std::string> files_;
+    CLI::App *fields_ = nullptr, *check_ = nullptr, *save_ = nullptr, *edit_ = nullptr, *fix_ = nullptr,
+             *explain_ = nullptr;
+    std::vector<std::string> files_, select_, ignore_;
+    std::string failOn_, explainId_;
+    bool explainMarkdown_ = false;
     std::string printFile_;
     BatchOptions batch_;
     bool noLengthLimit_ = false, noBackup_ = false, noCategory_ = false, backup_ = false;
