@@ -226,10 +226,10 @@ void frmMain::showReadOnly()
     const auto why = WhyNotWritable(app_.Header);
     if (why.empty())
         return;
-    lblStatuszeile->setText(tr("%1 is read-only (%2): Save As (%3) keeps your changes in another file.")
-                                .arg(QFile::decodeName(QByteArray::fromStdString(app_.Header.FilePath)),
-                                     QString::fromStdString(why),
-                                     MDateiSpeichernUnter->shortcut().toString(QKeySequence::NativeText)));
+    // Short, so that it shows whole at any font: the caption names the file.
+    lblStatuszeile->setText(
+        tr("Read-only (%1): Save As (%2) keeps your changes.")
+            .arg(QString::fromStdString(why), MDateiSpeichernUnter->shortcut().toString(QKeySequence::NativeText)));
 }
 
 void frmMain::showRecentFiles()
