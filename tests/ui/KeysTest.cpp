@@ -51,6 +51,8 @@ TEST_F(WindowTest, TabWalksThePreferencesInReadingOrderAndEmptyNamesAreRefused)
     startUp();
     whenDialogShows<frmOption>([](frmOption& dialog) {
         auto* realName = dialog.findChild<QLineEdit*>("txRealName");
+        dialog.activateWindow();
+        EXPECT_TRUE(QTest::qWaitForWindowActive(&dialog));
         realName->setFocus();
         EXPECT_EQ(tabWalk(8), QStringList({"txRealName", "txUserName", "cbLicenses", "chkBackup", "chkDescriptionLimit",
                                            "cmdSave", "cmdCancel", "txRealName"}));
