@@ -8,20 +8,6 @@
 
 namespace {
 
-// The header line each save check is about.
-const char* keywordOfSaveCheck(std::string_view id)
-{
-    if (id == SaveCheckIds::Author || id == SaveCheckIds::UserName)
-        return "Author:";
-    if (id == SaveCheckIds::Bfc)
-        return "BFC";
-    if (id == SaveCheckIds::License)
-        return "!LICENSE";
-    if (id == SaveCheckIds::PartType)
-        return "!LDRAW_ORG";
-    return ""; // the description's line
-}
-
 std::string firstLine(const std::string& text) { return text.substr(0, text.find('\r')); }
 
 Severity severityOf(FindingLevel level) { return level == FindingLevel::Error ? Severity::Error : Severity::Warning; }
@@ -43,7 +29,7 @@ std::vector<FileFinding> SaveCheckFindings(const SaveFindings& save, const Findi
     std::vector<FileFinding> findings;
     for (std::size_t k = 0; k < save.refusals.size(); ++k)
         findings.push_back({save.refusalIds[k], Severity::Error, firstLine(save.refusals[k]),
-                            places.ofHeaderKeyword(keywordOfSaveCheck(save.refusalIds[k]))});
+                            places.ofHeaderKeyword(HeaderKeywordOfSaveCheck(save.refusalIds[k]))});
     if (save.missingUserName)
         findings.push_back({SaveCheckIds::UserName, Severity::Warning, "The author line names no user.",
                             places.ofHeaderKeyword("Author:")});

@@ -74,6 +74,8 @@ FileDescriptor OpenPart::openForWriting() const
 
 int OpenPart::whyNotWritable() const
 {
+    if ((status().st_mode & 0222) == 0)
+        return EACCES;
     return ::faccessat(AT_FDCWD, DescriptorPath(fd_.get()).c_str(), W_OK, AT_EACCESS) == 0 ? 0 : errno;
 }
 

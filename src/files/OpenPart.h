@@ -51,7 +51,8 @@ public:
     bool unchangedSince(const FileStamp& stamp) const { return this->stamp() == stamp && stillNamed(); }
     // The same file opened again for writing, found through this descriptor, never by name.
     FileDescriptor openForWriting() const;
-    // 0 when this user may write the file, else the system's reason (errno) why not.
+    // 0 when this user may write the file, else the system's reason (errno) why not. A file
+    // without any write permission is denied even to root.
     int whyNotWritable() const;
 
     // Said by the restore of an interrupted save, which looked at the part's keep file under its

@@ -33,6 +33,7 @@ struct OpenFileRequest {
     std::string filter;
     std::string defaultSuffix;
     std::string startFolder;
+    bool forSaving = false; // a name to save under, which need not exist yet
 };
 
 class Dialogs {

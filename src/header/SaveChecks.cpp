@@ -75,6 +75,19 @@ void offerFixUps(HeaderData& h, const SaveContext& context)
 
 } // namespace
 
+const char* HeaderKeywordOfSaveCheck(std::string_view id)
+{
+    if (id == SaveCheckIds::Author || id == SaveCheckIds::UserName)
+        return "Author:";
+    if (id == SaveCheckIds::Bfc)
+        return "BFC";
+    if (id == SaveCheckIds::License)
+        return "!LICENSE";
+    if (id == SaveCheckIds::PartType)
+        return "!LDRAW_ORG";
+    return "";
+}
+
 std::string RefusalText(const std::string& sentence)
 {
     return sentence + "\r\n" + Translatable("Messages", "Saving the file is not possible");

@@ -37,6 +37,10 @@ inline constexpr const char* PartType = "save.type";
 inline constexpr const char* NeedsWork = "save.needs-work-comment";
 } // namespace SaveCheckIds
 
+// The keyword of the header line a save check is about ("Author:", "BFC", "!LICENSE",
+// "!LDRAW_ORG"; "" for the description's line).
+const char* HeaderKeywordOfSaveCheck(std::string_view id);
+
 // Every check at once, for tools that list what a save would say.
 struct SaveFindings {
     std::vector<std::string> refusals;   // the stop texts, in the order the save checks them

@@ -23,3 +23,9 @@ std::string HistoryStub(const LocalDateTime& today, const std::string& userName)
 inline constexpr const char* HistoryPrompt =
     Translatable("Messages", "Please enter !History string in the following format:") "\r\n" Translatable(
         "Messages", "'YYYY-MM-DD [Username] what's new/changed'");
+
+// The text typed into a list's input box (prompt, title, defaultText); "" when cancelled. A history
+// line the Parts Tracker would refuse is pointed out before it is taken: the user keeps it, or gets
+// the box back with it to mend it.
+std::string AskForLine(Dialogs& dialogs, const std::string& prompt, const std::string& title,
+                       const std::string& defaultText, bool history);

@@ -1,6 +1,8 @@
 // SPDX-License-Identifier: MIT
 #include "Preferences.h"
 
+#include <QCoreApplication>
+
 #include "SettingsStore.h"
 #include "Text.h"
 
@@ -50,6 +52,16 @@ PreferencesForm OpenPreferencesForm(Preferences& preferences, const SettingsStor
     preferences.MakeBackup = form.backup;
     preferences.LimitDescription = form.descriptionLimit;
     return form;
+}
+
+std::string PreferencesFormRefusal(const PreferencesForm& form)
+{
+    const auto tr = [](const char* text) { return QCoreApplication::translate("Preferences", text).toStdString(); };
+    if (TrimBlanks(form.realName).empty())
+        return tr("Enter your real name: it goes into the Author line of the parts you save.");
+    if (TrimBlanks(form.userName).empty())
+        return tr("Enter your username: it goes into the Author line and into new History lines.");
+    return {};
 }
 
 void SavePreferencesForm(const PreferencesForm& form, Preferences& preferences, SettingsStore& store)

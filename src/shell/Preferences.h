@@ -39,6 +39,10 @@ struct PreferencesForm {
 // DefaultLicense.
 PreferencesForm OpenPreferencesForm(Preferences& preferences, const SettingsStore& store);
 
+// Why the window's values cannot be saved ("" when they can): a real name and a user name are
+// needed, as the parts' author line and history lines name them.
+std::string PreferencesFormRefusal(const PreferencesForm& form);
+
 // Saving the window: the texts trimmed, "Backup" and "DescriptionLimit" as "True" or "False";
 // preferences takes every value saved.
 void SavePreferencesForm(const PreferencesForm& form, Preferences& preferences, SettingsStore& store);

@@ -135,8 +135,9 @@ std::optional<std::string> QtDialogs::openFile(const OpenFileRequest& request)
     QFileDialog dialog(parent_, shown(request.title), text(request.startFolder), shown(request.filter));
     // Qt's own dialog works with every event loop and desktop.
     dialog.setOption(QFileDialog::DontUseNativeDialog);
-    dialog.setFileMode(QFileDialog::ExistingFile);
-    dialog.setAcceptMode(QFileDialog::AcceptOpen);
+    dialog.setFileMode(request.forSaving ? QFileDialog::AnyFile : QFileDialog::ExistingFile);
+    dialog.setAcceptMode(request.forSaving ? QFileDialog::AcceptSave : QFileDialog::AcceptOpen);
+    dialog.setOption(QFileDialog::DontConfirmOverwrite); // the save road asks, in the program's words
     dialog.setDefaultSuffix(text(request.defaultSuffix));
     if (dialog.exec() != QDialog::Accepted || dialog.selectedFiles().isEmpty())
         return std::nullopt;

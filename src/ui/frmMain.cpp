@@ -3,6 +3,7 @@
 
 #include <QComboBox>
 #include <QFile>
+#include <QFileSystemWatcher>
 #include <QFrame>
 #include <QIcon>
 #include <QLabel>
@@ -68,6 +69,9 @@ frmMain::frmMain(AppState& app, Services& services, QWidget* parent)
     createControls();
     createMenus();
     setTabOrder();
+    watcher_ = new QFileSystemWatcher(this);
+    connect(watcher_, &QFileSystemWatcher::fileChanged, this, &frmMain::partChangedOnDisk);
+    connect(watcher_, &QFileSystemWatcher::directoryChanged, this, &frmMain::partChangedOnDisk);
     progress_ = std::make_unique<WindowProgress>(*lblStatuszeile);
     for (QWidget* field : std::initializer_list<QWidget*>{txPartDescription, txAuthorRealName, txAuthorUserName,
                                                           cbPartTypes, cbLicenses, cbBFCStatement, cbCategory})
@@ -134,6 +138,7 @@ void frmMain::createControls()
         box->setLineWrapMode(QPlainTextEdit::NoWrap);
         box->setHorizontalScrollBarPolicy(Qt::ScrollBarAlwaysOn);
         box->setVerticalScrollBarPolicy(Qt::ScrollBarAlwaysOn);
+        box->setTabChangesFocus(true); // read-only: Tab goes on to the next control
     }
     for (auto* line : {Line1, Line2})
         line->setFrameShape(QFrame::HLine);
@@ -143,7 +148,7 @@ void frmMain::createControls()
 void frmMain::createMenus()
 {
     struct MenuRow {
-        const char* menu;          // the menu's name; nullptr for an item of the menu bar itself
+        const char* menu;          // the menu's name
         QAction* frmMain::*member; // nullptr for a separator
         const char* name;
         const char* caption;
@@ -151,13 +156,18 @@ void frmMain::createMenus()
         QKeySequence::StandardKey shortcut = QKeySequence::UnknownKey; // beside the access keys
         QKeySequence ownShortcut = {};                                 // where no standard key fits
     };
-    static const std::pair<const char*, const char*> menus[] = {
-        {"MDatei", QT_TR_NOOP("F&ile")}, {"MEdit", QT_TR_NOOP("&Edit")}, {"MEinstellungen", QT_TR_NOOP("&Option")}};
+    static const std::pair<const char*, const char*> menus[] = {{"MDatei", QT_TR_NOOP("F&ile")},
+                                                                {"MEdit", QT_TR_NOOP("&Edit")},
+                                                                {"MEinstellungen", QT_TR_NOOP("&Option")},
+                                                                {"MHilfe", QT_TR_NOOP("&Help")}};
     static const MenuRow items[] = {
         {"MDatei", &frmMain::MDateiOeffnen, "MDateiOeffnen", QT_TR_NOOP("O&pen"), &frmMain::MDateiOeffnen_Click,
          QKeySequence::Open},
         {"MDatei", &frmMain::MDateiSpeichern, "MDateiSpeichern", QT_TR_NOOP("&Save"), &frmMain::MDateiSpeichern_Click,
          QKeySequence::Save},
+        {"MDatei", &frmMain::MDateiSpeichernUnter, "MDateiSpeichernUnter", QT_TR_NOOP("Save &As…"),
+         &frmMain::MDateiSpeichernUnter_Click, QKeySequence::UnknownKey,
+         QKeySequence(Qt::CTRL | Qt::SHIFT | Qt::Key_S)},
         {"MDatei", &frmMain::MTrackerCheck, "MTrackerCheck", QT_TR_NOOP("Check for the Parts &Tracker"),
          &frmMain::MTrackerCheck_Click, QKeySequence::UnknownKey, QKeySequence(Qt::CTRL | Qt::Key_T)},
         {"MDatei", nullptr, "MDateiTrenner2", nullptr, nullptr},
@@ -170,17 +180,19 @@ void frmMain::createMenus()
         {"MEdit", &frmMain::MEditLicense, "MEditLicense", QT_TR_NOOP("&License Types"), &frmMain::MEditLicense_Click},
         {"MEinstellungen", &frmMain::MEinstellDefault, "MEinstellDefault", QT_TR_NOOP("Preferences"),
          &frmMain::MEinstellDefault_Click},
-        {nullptr, &frmMain::MInfo, "MInfo", "?", &frmMain::MInfo_Click, QKeySequence::HelpContents},
+        {"MHilfe", &frmMain::MHilfeInhalt, "MHilfeInhalt", QT_TR_NOOP("&Contents"), &frmMain::MHilfeInhalt_Click,
+         QKeySequence::HelpContents},
+        {"MHilfe", &frmMain::MInfo, "MInfo", QT_TR_NOOP("&About Quillmark"), &frmMain::MInfo_Click},
     };
     for (const auto& [name, caption] : menus)
         menuBar()->addMenu(tr(caption))->setObjectName(name);
     for (const auto& item : items) {
-        auto* menu = item.menu ? menuBar()->findChild<QMenu*>(item.menu) : nullptr;
+        auto* menu = menuBar()->findChild<QMenu*>(item.menu);
         if (item.member == nullptr) {
             menu->addSeparator()->setObjectName(item.name);
             continue;
         }
-        auto* action = menu ? menu->addAction(tr(item.caption)) : menuBar()->addAction(tr(item.caption));
+        auto* action = menu->addAction(tr(item.caption));
         action->setObjectName(item.name);
         auto keys = shortcutsFor(item.shortcut);
         if (!item.ownShortcut.isEmpty())
@@ -221,11 +233,12 @@ void frmMain::addRecentFileItems(QMenu& menu)
 
 void frmMain::setTabOrder()
 {
-    ChainTabOrder({txPartDescription, txFileName,     txAuthorRealName, txAuthorUserName, cbPartTypes,
-                   cbLicenses,        cbBFCStatement, cbCategory,       txOldHeader,      txNewHeader,
-                   lsKeyWords,        cmdAdd,         cmdDelete,        cmdEdit,          cmdSetPreferences,
-                   lsHistory,         cmdHistoryEdit, cmdHistoryDelete, cmdHistoryAdd,    lsComments,
-                   cmdCommentsEdit,   cmdCommentsAdd, cmdCommentsDelete});
+    // Reading order: each field, top to bottom and left to right, then each list with its buttons,
+    // then the two headers.
+    ChainTabOrder({txPartDescription, txFileName,     txAuthorRealName, txAuthorUserName, cbPartTypes,       cbLicenses,
+                   cmdSetPreferences, cbBFCStatement, cbCategory,       lsKeyWords,       cmdEdit,           cmdAdd,
+                   cmdDelete,         lsComments,     cmdCommentsEdit,  cmdCommentsAdd,   cmdCommentsDelete, lsHistory,
+                   cmdHistoryEdit,    cmdHistoryAdd,  cmdHistoryDelete, txNewHeader,      txOldHeader});
     for (QLabel* text : {Label1, lblLength, Label4, Label3, Label6, Label8, Label9, Label11, Label10, Label7, Label5,
                          lblStatuszeile, Label2_0, Label2_1, Label2_2, Label2_3})
         text->setFocusPolicy(Qt::NoFocus);
@@ -319,12 +332,13 @@ void frmMain::EnableControls()
              cmdHistoryEdit, cmdCommentsAdd, cmdCommentsDelete, cmdCommentsEdit, cmdSetPreferences})
         control->setEnabled(enabled);
     MDateiSpeichern->setEnabled(enabled);
+    MDateiSpeichernUnter->setEnabled(enabled);
     MTrackerCheck->setEnabled(enabled);
     // The file name is only shown: it never takes input once the program runs.
     txFileName->setEnabled(false);
 }
 
-void frmMain::StartUp(const QStringList& arguments)
+void frmMain::StartUp(const QStringList& arguments, bool offerPreferences)
 {
     StartUpState(app_, services_);
     showRecentFiles();
@@ -338,9 +352,14 @@ void frmMain::StartUp(const QStringList& arguments)
     app_.PendingFile =
         arguments.isEmpty() ? std::string() : AbsolutePath(QFile::encodeName(arguments.first()).toStdString());
     show();
-    // Once the window manager has placed the window, so that what the open tells shows over it.
-    if (!app_.PendingFile.empty())
-        QTimer::singleShot(0, this, [this] { MDateiOeffnen_Click(); });
+    // Once the window manager has placed the window, so that what the open tells shows over it; the
+    // file first, so that the preferences offered then show over it.
+    QTimer::singleShot(0, this, [this, offerPreferences] {
+        if (!app_.PendingFile.empty())
+            MDateiOeffnen_Click();
+        if (offerPreferences)
+            OfferPreferencesWithoutNames();
+    });
 }
 
 void frmMain::MInfo_Click()

@@ -12,9 +12,10 @@
 #include "ErrorReport.h"
 #include "OpenRoad.h"
 #include "SaveChecks.h"
-#include "TrackerCheck.h"
+#include "SaveStops.h"
 
 class QAction;
+class QFileSystemWatcher;
 class QComboBox;
 class QFrame;
 class QLabel;
@@ -37,15 +38,18 @@ public:
     ~frmMain() override;
 
     // Start-up from the window's side: lists, recent files, caption, greeting, and the file named
-    // by the first argument, which is opened once the window shows.
-    void StartUp(const QStringList& arguments);
+    // by the first argument, which is opened once the window shows; then, with offerPreferences,
+    // the preferences while they hold no name.
+    void StartUp(const QStringList& arguments, bool offerPreferences = false);
 
     void MDateiOeffnen_Click();
     void MDateiSpeichern_Click();
+    void MDateiSpeichernUnter_Click();
     void MDateiBeenden_Click() { close(); }
     void MTrackerCheck_Click();
     void OpenFile(const std::string& path);
     void MInfo_Click();
+    void MHilfeInhalt_Click();
     void MRecentFile_Click(int index);
     void MEditCategory_Click();
     void MEditPartTyps_Click();
@@ -53,7 +57,7 @@ public:
     void MEditLicense_Click();
     void MEinstellDefault_Click();
     // While the preferences hold no real name and no user name: the preferences window, saying
-    // what the names are for. Run once the window shows.
+    // what the names are for. Run once the window shows and the file named at start is open.
     void OfferPreferencesWithoutNames();
     void cmdSetPreferences_Click();
 
@@ -100,13 +104,20 @@ private:
     void showTextsFromTheirStart();
     void SelectComboItem(QComboBox& combo, const std::string& text);
     void showCaption();
+    void showReadOnly(); // the status line says why a part read cannot be written
     void showModified(); // the caption's mark for unsaved changes
     void showRecentFiles();
     void finishCloseRequestedDuringOpen();
 
     // Saving.
     SaveResult checkHeaderAndSave();
+    void saveUnderNewName();
+    // After a save: the file read again as it now stands on disk, and the status line's word.
     void showSaved(const std::string& backupPath);
+
+    // Another program's changes to the open part.
+    void watchPart();
+    void partChangedOnDisk();
     void showDescriptionTooLong();
 
     // Field editing.
@@ -117,8 +128,8 @@ private:
     void showLength();
 
     // The Parts Tracker's repairs on the open document.
-    std::vector<TrackerFinding> fixForTracker(const std::set<std::string>& ids, const StringList& categories,
-                                              const ColourCodes& colours);
+    std::vector<StopRow> fixForTracker(const std::set<std::string>& ids, const StringList& categories,
+                                       const ColourCodes& colours);
     void showFixedFields();
 
     // Line lists.
@@ -138,8 +149,10 @@ private:
     void deleteLine(EntryList& list, QListWidget& box);
     void refillLists();
 
-    // The Parts Tracker's view of the file as it would be saved.
-    std::vector<TrackerFinding> trackerFindings(const std::function<void(const std::string&)>& report);
+    // What stops a save and what the Parts Tracker would say of the file as it would be saved.
+    std::vector<StopRow> stopRows(const StringList& categories, const ColourCodes& colours);
+    // The same with the program's colour list; report tells what could not be read.
+    std::vector<StopRow> stopRows(const std::function<void(const std::string&)>& report);
     QWidget* fieldOf(const TrackerFinding& finding) const;
     bool focusFieldOf(const TrackerFinding& finding);
     QString trackerSummary();
@@ -156,6 +169,8 @@ private:
     std::string baseTitle_;
     std::string newHeaderText_;
     bool closeRequestedDuringOpen_ = false;
+    QFileSystemWatcher* watcher_;    // the part and its folder, for another program's changes
+    std::string diskMarkAskedAbout_; // the part on disk as it was when the user chose to keep editing
     std::set<std::pair<const QObject*, int>> keysPressedInBox_; // (box, key) pressed and not yet released
 
     // The controls, by the names the program has always used.
@@ -205,6 +220,7 @@ private:
 
     QAction* MDateiOeffnen;
     QAction* MDateiSpeichern;
+    QAction* MDateiSpeichernUnter;
     QAction* MTrackerCheck;
     QAction* MDateiBeenden;
     std::array<QAction*, 11> MRecentFile;
@@ -213,6 +229,7 @@ private:
     QAction* MEditBFCStatement;
     QAction* MEditLicense;
     QAction* MEinstellDefault;
+    QAction* MHilfeInhalt;
     QAction* MInfo;
 
     std::unique_ptr<WindowProgress> progress_;

@@ -8,13 +8,13 @@
 #include "frmMain.h"
 
 // The repairs change the record as an edit does; nothing is saved until the user saves.
-std::vector<TrackerFinding> frmMain::fixForTracker(const std::set<std::string>& ids, const StringList& categories,
-                                                   const ColourCodes& colours)
+std::vector<StopRow> frmMain::fixForTracker(const std::set<std::string>& ids, const StringList& categories,
+                                            const ColourCodes& colours)
 {
     const FixContext context{{categories, app_.Prefs.LimitDescription, services_.clock.now()}, colours};
     FixForTracker(app_.Header, ids, context);
     showFixedFields();
-    return CheckRecordForTracker(app_.Header, newHeaderText_, categories, colours);
+    return stopRows(categories, colours);
 }
 
 // The fields a repair may change, shown in their controls, and the header composed again.

@@ -5,18 +5,7 @@
 #include "Dialogs.h"
 #include "FileText.h"
 #include "LineLists.h"
-#include "MetaLine.h"
-#include "Text.h"
 #include "frmMain.h"
-
-namespace {
-
-bool inTrackerHistoryForm(const std::string& typed)
-{
-    return IsHistoryLine(QString::fromUtf8("0 !HISTORY " + std::string(TrimBlanks(typed))));
-}
-
-} // namespace
 
 void frmMain::fillLineList(QListWidget& box, const EntryList& list)
 {
@@ -36,23 +25,9 @@ void frmMain::refillLists()
     FillHistoryList();
 }
 
-// The text typed into the input box. A history line the Parts Tracker would refuse is pointed out
-// before it is taken: the user keeps it, or gets the box back with it to mend it.
 std::string frmMain::askForLine(const LineForm& form, const std::string& defaultText)
 {
-    std::string typed = defaultText;
-    for (;;) {
-        typed = services_.dialogs.input(form.prompt, form.title, typed);
-        if (!form.history || TrimBlanks(typed).empty() || inTrackerHistoryForm(typed))
-            return typed;
-        const auto keep = services_.dialogs.message(
-            {Translatable("Messages", "The Parts Tracker takes history lines only as \"YYYY-MM-DD [user] what "
-                                      "changed\" (or {Real Name} in place of [user]), and would refuse") "\r\n" +
-                 typed + "\r\n" + Translatable("Messages", "Keep it as it is?"),
-             Translatable("Messages", "History"), Buttons::YesNo, Icon::Exclamation, Answer::No});
-        if (keep == Answer::Yes)
-            return typed;
-    }
+    return AskForLine(services_.dialogs, form.prompt, form.title, defaultText, form.history);
 }
 
 void frmMain::addLine(EntryList& list, const LineForm& form, const std::string& defaultText)

@@ -8,6 +8,7 @@
 #include "ErrorReport.h"
 #include "FileText.h"
 #include "ListFolder.h"
+#include "frmHelp.h"
 #include "frmList.h"
 #include "frmMain.h"
 #include "frmOption.h"
@@ -76,4 +77,10 @@ void frmMain::cmdSetPreferences_Click()
     txAuthorUserName->setText(ToWidget(app_.Header.AuthorUserName, encoding));
     SelectComboItem(*cbLicenses, app_.Header.License);
     MakeNewHeader();
+}
+
+void frmMain::MHilfeInhalt_Click()
+{
+    frmHelp help(this);
+    help.exec();
 }

@@ -1,10 +1,12 @@
 // SPDX-License-Identifier: MIT
 // The two roads of opening a file, saving, closing, and files dropped on the window.
+#include <QApplication>
 #include <QCloseEvent>
 #include <QComboBox>
 #include <QDragEnterEvent>
 #include <QDropEvent>
 #include <QFile>
+#include <QFileSystemWatcher>
 #include <QLabel>
 #include <QLineEdit>
 #include <QListWidget>
@@ -13,6 +15,7 @@
 
 #include "DescriptionTabs.h"
 #include "Dialogs.h"
+#include "DiskChanges.h"
 #include "DocumentQuestions.h"
 #include "ErrorReport.h"
 #include "FileSave.h"
@@ -21,6 +24,7 @@
 #include "OpenRoad.h"
 #include "Parser.h"
 #include "Paths.h"
+#include "SaveAs.h"
 #include "WindowProgress.h"
 #include "frmMain.h"
 #include "frmOption.h"
@@ -30,6 +34,7 @@ namespace {
 const Procedure OpenCommand{"MDateiOeffnen_Click", OwnerKind::Formular, "frmMain"};
 const Procedure OpenRecentFile{"OpenFile", OwnerKind::Modul, "modQuillmark"};
 const Procedure SaveCommand{"MDateiSpeichern_Click", OwnerKind::Formular, "frmMain"};
+const Procedure SaveAsCommand{"MDateiSpeichernUnter_Click", OwnerKind::Formular, "frmMain"};
 
 std::optional<std::string> firstLocalFile(const QMimeData& data)
 {
@@ -116,6 +121,8 @@ void frmMain::readChosenFile(const std::string& path, OpenRoad road)
     app_.Header.HeaderAtOpenOrSave = newHeaderText_;
     app_.Header.Loading = false;
     showModified();
+    showReadOnly();
+    watchPart();
 }
 
 void frmMain::abandonOpen(const std::exception& error, const Procedure& procedure)
@@ -205,13 +212,26 @@ void frmMain::SelectComboItem(QComboBox& combo, const std::string& text)
 void frmMain::showCaption()
 {
     // The name of the file as it is on disk; its "Name:" line may say another.
-    const auto caption =
+    auto caption =
         QString::fromStdString(CaptionFor(baseTitle_, DateiNurName(app_.Header.FilePath, services_.dialogs)));
-    setWindowTitle(QString(caption).replace("[*]", "[*][*]") + "[*]");
+    if (!WhyNotWritable(app_.Header).empty())
+        caption += tr(" [read-only]");
+    setWindowTitle(caption.replace("[*]", "[*][*]") + "[*]");
     showModified();
 }
 
 void frmMain::showModified() { setWindowModified(app_.Header.FileChanged); }
+
+void frmMain::showReadOnly()
+{
+    const auto why = WhyNotWritable(app_.Header);
+    if (why.empty())
+        return;
+    // Short, so that it shows whole at any font: the caption names the file.
+    lblStatuszeile->setText(
+        tr("Read-only (%1): Save As (%2) keeps your changes.")
+            .arg(QString::fromStdString(why), MDateiSpeichernUnter->shortcut().toString(QKeySequence::NativeText)));
+}
 
 void frmMain::showRecentFiles()
 {
@@ -229,10 +249,47 @@ void frmMain::MDateiSpeichern_Click()
     if (openInProgress())
         return;
     try {
-        checkHeaderAndSave();
+        switch (AskAboutUnwritablePart(app_.Header, services_.dialogs)) {
+        case UnwritableAnswer::Writable:
+            if (const auto result = checkHeaderAndSave(); result.outcome == SaveOutcome::Saved)
+                showSaved(result.backupPath);
+            break;
+        case UnwritableAnswer::SaveAs: saveUnderNewName(); break;
+        case UnwritableAnswer::Stay: break;
+        }
     } catch (const std::exception& error) {
         ReportError(services_.dialogs, ErrorOf(error), SaveCommand);
     }
+}
+
+void frmMain::MDateiSpeichernUnter_Click()
+{
+    if (openInProgress() || !app_.Header.FileLoaded)
+        return;
+    try {
+        saveUnderNewName();
+    } catch (const std::exception& error) {
+        ReportError(services_.dialogs, ErrorOf(error), SaveAsCommand);
+    }
+}
+
+void frmMain::saveUnderNewName()
+{
+    const auto path = ChooseNewName(app_.Header, services_.dialogs);
+    if (!path)
+        return;
+    std::string backupPath;
+    const auto save = [this, &backupPath] {
+        const auto result = checkHeaderAndSave();
+        backupPath = result.backupPath;
+        return result.outcome;
+    };
+    const auto showName = [this] {
+        txFileName->setText(ToWidget(app_.Header.PartName, app_.Header.Encoding));
+        MakeNewHeader();
+    };
+    if (SaveUnderNewName(app_, services_, *path, save, showName) == SaveOutcome::Saved)
+        showSaved(backupPath);
 }
 
 SaveResult frmMain::checkHeaderAndSave()
@@ -247,20 +304,55 @@ SaveResult frmMain::checkHeaderAndSave()
     auto result = CheckHeaderAndSave(app_.Header, context);
     if (result.outcome == SaveOutcome::DescriptionTooLong)
         showDescriptionTooLong();
-    if (result.outcome == SaveOutcome::Saved)
-        showSaved(result.backupPath);
+    showModified();
     return result;
 }
 
+// The file is read again, so that the old header, the caption and the line numbers of the
+// findings are the file's as it now stands on disk.
 void frmMain::showSaved(const std::string& backupPath)
 {
-    const auto name = [](const std::string& path) { return QFile::decodeName(QByteArray::fromStdString(path)); };
-    auto status = tr("Saved %1").arg(name(app_.Header.FilePath));
-    if (!backupPath.empty())
-        status = tr("Saved %1 (backup %2)")
-                     .arg(name(app_.Header.FilePath), name(DateiNurName(backupPath, services_.dialogs)));
+    QWidget* focused = focusWidget();
+    readChosenFile(app_.Header.FilePath, OpenRoad::Recent);
+    if (focused != nullptr && focused->isEnabled())
+        focused->setFocus(Qt::OtherFocusReason);
+    const auto path = QFile::decodeName(QByteArray::fromStdString(app_.Header.FilePath));
+    auto status =
+        backupPath.empty()
+            ? tr("Saved %1").arg(path)
+            : tr("Saved %1 (backup %2)")
+                  .arg(path, QFile::decodeName(QByteArray::fromStdString(DateiNurName(backupPath, services_.dialogs))));
     lblStatuszeile->setText(status + "; " + trackerSummary());
-    showModified();
+}
+
+void frmMain::watchPart()
+{
+    if (!watcher_->files().isEmpty())
+        watcher_->removePaths(watcher_->files());
+    if (!watcher_->directories().isEmpty())
+        watcher_->removePaths(watcher_->directories());
+    diskMarkAskedAbout_.clear();
+    const auto& header = app_.Header;
+    // The folder too: a program that saves by renaming a new file over the part replaces it there.
+    for (const auto& path : {header.FilePath, header.Part ? DateiNurPfad(header.Part->path()) : header.FileFolder})
+        if (!path.empty())
+            watcher_->addPath(QFile::decodeName(QByteArray::fromStdString(path)));
+}
+
+void frmMain::partChangedOnDisk()
+{
+    if (openInProgress() || !app_.Header.FileLoaded || !ChangedOnDisk(app_.Header))
+        return;
+    const auto mark = DiskMark(app_.Header.FilePath);
+    if (mark == diskMarkAskedAbout_ || QApplication::activeModalWidget() != nullptr)
+        return; // asked about already, or asked once the box or dialog open now is closed
+    diskMarkAskedAbout_ = mark;
+    if (AskToReload(app_.Header, services_.dialogs)) {
+        openChosenFile(app_.Header.FilePath, OpenRoad::Recent, OpenRecentFile);
+        return;
+    }
+    if (!watcher_->files().contains(QFile::decodeName(QByteArray::fromStdString(app_.Header.FilePath))))
+        watcher_->addPath(QFile::decodeName(QByteArray::fromStdString(app_.Header.FilePath)));
 }
 
 void frmMain::showDescriptionTooLong()

@@ -12,25 +12,30 @@
 #include "Dialogs.h"
 #include "ErrorReport.h"
 #include "ListFolder.h"
+#include "SaveChecks.h"
 #include "frmMain.h"
+#include "frmOption.h"
 #include "frmTracker.h"
 
 namespace {
 
-// "1 error", "2 errors": one form for one thing, the other for any other number.
-QString counted(long long count, const QString& one, const QString& many)
-{
-    return (count == 1 ? one : many).arg(count);
-}
+QString counted(long long count, const QString& one, const QString& many) { return count == 1 ? one : many.arg(count); }
 
 } // namespace
 
-std::vector<TrackerFinding> frmMain::trackerFindings(const std::function<void(const std::string&)>& report)
+std::vector<StopRow> frmMain::stopRows(const StringList& categories, const ColourCodes& colours)
+{
+    const StopContext context{categories, colours, app_.Prefs.LimitDescription,
+                              tr("%1 in Option › Preferences").arg(tr(DescriptionLimitCaption)).toStdString(),
+                              services_.clock.now()};
+    return WhatStopsTheSave(app_.Header, newHeaderText_, context);
+}
+
+std::vector<StopRow> frmMain::stopRows(const std::function<void(const std::string&)>& report)
 {
     const auto builtIn = ReadBuiltInColours(DataFileOfThisProgram(app_.ProgramFolder, BuiltInColoursFile));
     ColourSource colours(builtIn, "", report);
-    return CheckRecordForTracker(app_.Header, newHeaderText_, EntriesOf(app_.Lists, ListKind::Category),
-                                 colours.forPart(app_.Header.FilePath, report));
+    return stopRows(EntriesOf(app_.Lists, ListKind::Category), colours.forPart(app_.Header.FilePath, report));
 }
 
 void frmMain::MTrackerCheck_Click()
@@ -45,9 +50,8 @@ void frmMain::MTrackerCheck_Click()
         ColourSource colours(builtIn, "", report);
         const auto& codes = colours.forPart(app_.Header.FilePath, report);
         const auto categories = EntriesOf(app_.Lists, ListKind::Category);
-        const auto findings = CheckRecordForTracker(app_.Header, newHeaderText_, categories, codes);
         const auto repair = [&](const std::set<std::string>& ids) { return fixForTracker(ids, categories, codes); };
-        frmTracker dialog(findings, QString::fromStdString(app_.Header.FilePath), this, repair);
+        frmTracker dialog(stopRows(categories, codes), QString::fromStdString(app_.Header.FilePath), this, repair);
         dialog.leadToFields([this](const TrackerFinding& finding) { return focusFieldOf(finding); });
         dialog.exec();
     } catch (const std::exception& error) {
@@ -59,7 +63,14 @@ void frmMain::MTrackerCheck_Click()
 // no field of the window can mend.
 QWidget* frmMain::fieldOf(const TrackerFinding& finding) const
 {
-    const std::pair<const char*, QWidget*> byId[] = {{"description.", txPartDescription},
+    const std::pair<const char*, QWidget*> byId[] = {{SaveCheckIds::DescriptionLength, txPartDescription},
+                                                     {SaveCheckIds::Author, txAuthorRealName},
+                                                     {SaveCheckIds::UserName, txAuthorUserName},
+                                                     {SaveCheckIds::Bfc, cbBFCStatement},
+                                                     {SaveCheckIds::License, cbLicenses},
+                                                     {SaveCheckIds::PartType, cbPartTypes},
+                                                     {SaveCheckIds::NeedsWork, lsComments},
+                                                     {"description.", txPartDescription},
                                                      {"warning.description", txPartDescription},
                                                      {"obsoleteimproper", txPartDescription},
                                                      {"name.", txFileName},
@@ -95,25 +106,27 @@ bool frmMain::focusFieldOf(const TrackerFinding& finding)
     return true;
 }
 
-// "Parts Tracker: 2 errors, 1 warning (Ctrl+T)", or "Parts Tracker: no findings". Colour lists
-// that cannot be read are told about by the dialog, not after every save.
+// "Checks: 2 errors, 1 warning (Ctrl+T)", counting the save checks' rows and the Parts Tracker's
+// findings, or "Checks: nothing found". Colour lists that cannot be read are told about by the
+// dialog, not after every save.
 QString frmMain::trackerSummary()
 {
-    std::vector<TrackerFinding> findings;
+    std::vector<StopRow> rows;
+    const auto keys = MTrackerCheck->shortcut().toString(QKeySequence::NativeText);
     try {
-        findings = trackerFindings([](const std::string&) {});
+        rows = stopRows([](const std::string&) {});
     } catch (const std::exception&) { // the file is saved all the same; the dialog tells what failed
-        return tr("Parts Tracker: not checked (%1)").arg(MTrackerCheck->shortcut().toString());
+        return tr("Checks: not made (%1)").arg(keys);
     }
-    if (findings.empty())
-        return tr("Parts Tracker: no findings");
-    const auto errors = std::count_if(findings.begin(), findings.end(),
-                                      [](const TrackerFinding& f) { return f.level == FindingLevel::Error; });
-    const auto warnings = static_cast<long long>(findings.size()) - errors;
+    if (rows.empty())
+        return tr("Checks: nothing found");
+    const auto errors = std::count_if(rows.begin(), rows.end(),
+                                      [](const StopRow& row) { return row.finding.level == FindingLevel::Error; });
+    const auto warnings = static_cast<long long>(rows.size()) - errors;
     QStringList counts;
     if (errors > 0)
-        counts << counted(errors, tr("%1 error"), tr("%1 errors"));
+        counts << counted(errors, tr("1 error"), tr("%1 errors"));
     if (warnings > 0)
-        counts << counted(warnings, tr("%1 warning"), tr("%1 warnings"));
-    return tr("Parts Tracker: %1 (%2)").arg(counts.join(", "), MTrackerCheck->shortcut().toString());
+        counts << counted(warnings, tr("1 warning"), tr("%1 warnings"));
+    return tr("Checks: %1 (%2)").arg(counts.join(", "), keys);
 }

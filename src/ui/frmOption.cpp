@@ -15,23 +15,26 @@ frmOption::frmOption(const PreferencesForm& form, const QStringList& sortedLicen
     setWindowTitle(tr("Preferences"));
     setModal(true);
     const double scale = LayoutScale(font());
-    setFixedSize(Pixels(7455, scale), Pixels(2250, scale));
+    setFixedSize(Pixels(7455, scale), Pixels(heightTwips_, scale));
     using Row = ControlRow<frmOption, QLabel, QLineEdit, QPushButton, QComboBox, QCheckBox>;
     static const Row rows[] = {
-        {&frmOption::Label1, "Label1", QT_TR_NOOP("Your Real Name"), 120, 240, 1215, 255},
+        {&frmOption::Label1, "Label1", QT_TR_NOOP("Your &Real Name"), 120, 240, 1215, 255},
         {&frmOption::txRealName, "txRealName", nullptr, 1560, 240, 4455, 285},
-        {&frmOption::Label2_0, "Label2_0", QT_TR_NOOP("Your Username"), 120, 600, 1215, 255},
+        {&frmOption::Label2_0, "Label2_0", QT_TR_NOOP("Your &Username"), 120, 600, 1215, 255},
         {&frmOption::txUserName, "txUserName", nullptr, 1560, 600, 4455, 285},
         {&frmOption::cmdSave, "cmdSave", QT_TR_NOOP("&Save"), 6240, 240, 1095, 375},
         {&frmOption::cmdCancel, "cmdCancel", QT_TR_NOOP("&Cancel"), 6240, 720, 1095, 375},
         {&frmOption::cbLicenses, "cbLicenses", nullptr, 1560, 960, 4455, 315},
-        {&frmOption::Label2_3, "Label2_3", QT_TR_NOOP("License Type:"), 120, 960, 1335, 255},
-        {&frmOption::chkBackup, "chkBackup", QT_TR_NOOP("Backup file"), 120, 1440, 1695, 255},
+        {&frmOption::Label2_3, "Label2_3", QT_TR_NOOP("&License Type:"), 120, 960, 1335, 255},
+        {&frmOption::chkBackup, "chkBackup", QT_TR_NOOP("&Backup file"), 120, 1440, 1695, 255},
         {&frmOption::chkDescriptionLimit, "chkDescriptionLimit", DescriptionLimitCaption, 120, 1800, 4455, 255},
     };
     BuildControls(*this, this, rows);
     cmdSave->setDefault(true);
-    ChainTabOrder({txRealName, txUserName, cmdSave, cmdCancel, cbLicenses, chkBackup, chkDescriptionLimit});
+    ChainTabOrder({txRealName, txUserName, cbLicenses, chkBackup, chkDescriptionLimit, cmdSave, cmdCancel});
+    Label1->setBuddy(txRealName);
+    Label2_0->setBuddy(txUserName);
+    Label2_3->setBuddy(cbLicenses);
 
     txRealName->setText(QString::fromStdString(form.realName));
     txUserName->setText(QString::fromStdString(form.userName));
@@ -43,7 +46,7 @@ frmOption::frmOption(const PreferencesForm& form, const QStringList& sortedLicen
             cbLicenses->setCurrentIndex(i); // the last equal entry stays selected
     chkBackup->setChecked(form.backup);
     chkDescriptionLimit->setChecked(form.descriptionLimit);
-    connect(cmdSave, &QPushButton::clicked, this, &QDialog::accept);
+    connect(cmdSave, &QPushButton::clicked, this, &frmOption::cmdSave_Click);
     connect(cmdCancel, &QPushButton::clicked, this, &QDialog::reject);
 }
 
@@ -56,9 +59,30 @@ PreferencesForm frmOption::form() const
 
 void frmOption::explainNames()
 {
+    addLine("lblNamesUse", tr("Your names go into the Author line of the parts you save and into new History lines."));
+}
+
+// A line of text under the others, the window grown to hold it.
+QLabel* frmOption::addLine(const char* name, const QString& text)
+{
     const double scale = LayoutScale(font());
-    PlaceCaptioned<QLabel>(this, "lblNamesUse",
-                           tr("Your names go into the Author line of the parts you save and into new History lines."),
-                           120, 2160, 7215, 255, scale);
-    setFixedSize(width(), Pixels(2520, scale));
+    auto* line = PlaceChild<QLabel>(this, name, 120, heightTwips_ - 90, 7215, 255, scale);
+    line->setText(text);
+    line->show();
+    heightTwips_ += 360;
+    setFixedSize(width(), Pixels(heightTwips_, scale));
+    return line;
+}
+
+void frmOption::cmdSave_Click()
+{
+    const auto refusal = QString::fromStdString(PreferencesFormRefusal(form()));
+    if (refusal.isEmpty()) {
+        accept();
+        return;
+    }
+    if (lblRefusal == nullptr)
+        lblRefusal = addLine("lblRefusal", refusal);
+    lblRefusal->setText(refusal);
+    (txRealName->text().trimmed().isEmpty() ? txRealName : txUserName)->setFocus(Qt::OtherFocusReason);
 }

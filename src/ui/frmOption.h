@@ -29,6 +29,11 @@ public:
     void explainNames();
 
 private:
+    // Save: the values are taken only when the preferences may hold them; otherwise a line under
+    // the others says why, and the window stays.
+    void cmdSave_Click();
+    QLabel* addLine(const char* name, const QString& text);
+
     QLabel* Label1;
     QLineEdit* txRealName;
     QLabel* Label2_0;
@@ -39,4 +44,6 @@ private:
     QLabel* Label2_3;
     QCheckBox* chkBackup;
     QCheckBox* chkDescriptionLimit;
+    QLabel* lblRefusal = nullptr;
+    int heightTwips_ = 2250; // grows with each line added under the others
 };

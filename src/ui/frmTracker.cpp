@@ -19,26 +19,52 @@ namespace {
 
 enum Column { LevelColumn, IdColumn, LineColumn, FixColumn, MessageColumn };
 
-bool hasRepair(const QString& id)
+QString counted(long long count, const QString& one, const QString& many) { return count == 1 ? one : many.arg(count); }
+
+long long countOf(const std::vector<StopRow>& rows, bool saveChecks, FindingLevel level)
 {
-    const auto& fixes = TrackerFixes();
-    return std::any_of(fixes.begin(), fixes.end(), [&id](const TrackerFix& fix) { return id == fix.id; });
+    return std::count_if(rows.begin(), rows.end(), [&](const StopRow& row) {
+        return IsSaveCheckRow(row) == saveChecks && row.finding.level == level;
+    });
 }
 
-QString verdict(const std::vector<TrackerFinding>& findings)
+// What the rows add up to: whether a save goes through, what the Tracker would say, and whether
+// Fix has anything to do.
+QString verdict(const std::vector<StopRow>& rows)
 {
-    const auto errors = std::count_if(findings.begin(), findings.end(),
-                                      [](const TrackerFinding& f) { return f.level == FindingLevel::Error; });
-    if (findings.empty())
-        return frmTracker::tr("Nothing to fix: the Parts Tracker's rules find nothing.");
-    return errors == 0 ? frmTracker::tr("The Parts Tracker would accept this file, with the warnings below.")
-                       : frmTracker::tr("The Parts Tracker would refuse this file: %1 error(s) to fix.").arg(errors);
+    if (rows.empty())
+        return frmTracker::tr("This part can be saved, and the Parts Tracker's rules find nothing.");
+    QStringList sentences;
+    if (const auto refusals = countOf(rows, true, FindingLevel::Error); refusals > 0)
+        sentences << frmTracker::tr("Save refuses this part: %1.")
+                         .arg(counted(refusals, frmTracker::tr("1 error"), frmTracker::tr("%1 errors")));
+    const auto errors = countOf(rows, false, FindingLevel::Error);
+    const auto warnings = countOf(rows, false, FindingLevel::Warning);
+    if (errors > 0)
+        sentences << frmTracker::tr("The Parts Tracker would refuse this file: %1.")
+                         .arg(counted(errors, frmTracker::tr("1 error"), frmTracker::tr("%1 errors")));
+    else if (warnings > 0)
+        sentences << frmTracker::tr("The Parts Tracker would accept this file, with the warnings below.");
+    else
+        sentences << frmTracker::tr("The Parts Tracker's rules find nothing.");
+    if (std::none_of(rows.begin(), rows.end(), [](const StopRow& row) { return row.repairable; }))
+        sentences << frmTracker::tr("Nothing to fix: no row has a repair that can be made here.");
+    return sentences.join(' ');
 }
 
 // Errors before warnings, then by id, then by line.
-bool listedBefore(const TrackerFinding& a, const TrackerFinding& b)
+bool listedBefore(const StopRow& a, const StopRow& b)
 {
-    return std::tie(a.level, a.id, a.line) < std::tie(b.level, b.id, b.line);
+    return std::tie(a.finding.level, a.finding.id, a.finding.line) <
+           std::tie(b.finding.level, b.finding.id, b.finding.line);
+}
+
+QString messageOf(const StopRow& row)
+{
+    auto message = QString::fromStdString(row.finding.text);
+    if (!row.note.empty())
+        message += '\n' + QString::fromStdString(row.note);
+    return message;
 }
 
 // A line number that sorts as a number; empty for a finding about the whole file, which sorts first.
@@ -56,22 +82,21 @@ private:
 
 } // namespace
 
-frmTracker::frmTracker(const std::vector<TrackerFinding>& findings, const QString& filePath, QWidget* parent,
-                       Repairer repair)
+frmTracker::frmTracker(const std::vector<StopRow>& rows, const QString& filePath, QWidget* parent, Repairer repair)
     : QDialog(parent), filePath_(filePath), repair_(std::move(repair))
 {
     setObjectName("frmTracker");
     setWindowTitle(tr("Check for the Parts Tracker"));
     setModal(true);
     resize(Pixels(9240), Pixels(4200));
-    lblVerdict = new QLabel(verdict(findings), this);
+    lblVerdict = new QLabel(verdict(rows), this);
     lblVerdict->setObjectName("lblVerdict");
     lblVerdict->setWordWrap(true);
     tbFindings = new QTableWidget(this);
     tbFindings->setObjectName("tbFindings");
-    cmdCopy = new QPushButton(tr("Copy"), this);
+    cmdCopy = new QPushButton(tr("&Copy"), this);
     cmdCopy->setObjectName("cmdCopy");
-    cmdClose = new QPushButton(tr("Close"), this);
+    cmdClose = new QPushButton(tr("C&lose"), this);
     cmdClose->setObjectName("cmdClose");
     cmdClose->setDefault(true);
     auto* buttons = new QHBoxLayout;
@@ -83,7 +108,7 @@ frmTracker::frmTracker(const std::vector<TrackerFinding>& findings, const QStrin
     layout->addWidget(lblVerdict);
     layout->addWidget(tbFindings, 1);
     layout->addLayout(buttons);
-    fillTable(findings);
+    fillTable(rows);
     connect(cmdCopy, &QPushButton::clicked, this, [this] { QGuiApplication::clipboard()->setText(findingsText()); });
     connect(cmdClose, &QPushButton::clicked, this, &QDialog::accept);
     tbFindings->installEventFilter(this);
@@ -97,9 +122,7 @@ void frmTracker::leadToFields(std::function<bool(const TrackerFinding&)> showFie
 
 void frmTracker::findingDoubleClicked(int row)
 {
-    const auto index = tbFindings->item(row, LevelColumn)->data(Qt::UserRole).toULongLong();
-    const auto& finding = findings_[static_cast<std::size_t>(index)];
-    if (finding.line == 0 && showField_ && showField_(finding))
+    if (showField_ && showField_(rowAt(row).finding))
         accept();
 }
 
@@ -123,14 +146,21 @@ void frmTracker::copySelectedRows() const
     QGuiApplication::clipboard()->setText(rowsText(rows));
 }
 
-void frmTracker::fillTable(std::vector<TrackerFinding> findings)
+const StopRow& frmTracker::rowAt(int tableRow) const
 {
-    std::stable_sort(findings.begin(), findings.end(), listedBefore);
-    findings_ = findings;
+    const auto index = tbFindings->item(tableRow, LevelColumn)->data(Qt::UserRole).toULongLong();
+    return rows_[static_cast<std::size_t>(index)];
+}
+
+void frmTracker::fillTable(std::vector<StopRow> rows)
+{
+    std::stable_sort(rows.begin(), rows.end(), listedBefore);
+    rows_ = std::move(rows);
     tbFindings->setSortingEnabled(false); // rows filled again stay where they are put
     tbFindings->setColumnCount(5);
     tbFindings->setHorizontalHeaderLabels({tr("Level"), tr("Id"), tr("Line"), tr("Fix"), tr("Message")});
-    tbFindings->setRowCount(static_cast<int>(findings.size()));
+    tbFindings->setRowCount(static_cast<int>(rows_.size()));
+    tbFindings->setTabKeyNavigation(false); // one Tab stop; the arrows move within the table
     tbFindings->setEditTriggers(QAbstractItemView::NoEditTriggers);
     tbFindings->setSelectionBehavior(QAbstractItemView::SelectRows);
     tbFindings->setWordWrap(true);
@@ -138,21 +168,23 @@ void frmTracker::fillTable(std::vector<TrackerFinding> findings)
     tbFindings->verticalHeader()->setSectionResizeMode(QHeaderView::ResizeToContents);
     tbFindings->horizontalHeader()->setStretchLastSection(true);
     for (int row = 0; row < tbFindings->rowCount(); ++row) {
-        const auto& finding = findings[static_cast<std::size_t>(row)];
+        const auto& [finding, repairable, note] = rows_[static_cast<std::size_t>(row)];
         auto* level = new QTableWidgetItem(finding.level == FindingLevel::Error ? tr("error") : tr("warning"));
         level->setData(Qt::UserRole, row); // the row's finding, wherever sorting moves the row
         tbFindings->setItem(row, LevelColumn, level);
         tbFindings->setItem(row, IdColumn, new QTableWidgetItem(QString::fromStdString(finding.id)));
         tbFindings->setItem(row, LineColumn, new LineItem(finding.line));
-        tbFindings->setItem(row, MessageColumn, new QTableWidgetItem(QString::fromStdString(finding.text)));
+        tbFindings->setItem(row, FixColumn, new QTableWidgetItem(repair_ && repairable ? tr("yes") : QString()));
+        tbFindings->setItem(row, MessageColumn, new QTableWidgetItem(messageOf(rows_[static_cast<std::size_t>(row)])));
     }
-    markFixableRows();
     // Sorting by level keeps the order within each level: errors first, then by id.
     tbFindings->horizontalHeader()->setSortIndicator(LevelColumn, Qt::AscendingOrder);
     tbFindings->setSortingEnabled(true);
     // Measured with the sort arrow in place, so that no column title is cut.
     for (const auto column : {LevelColumn, IdColumn, LineColumn, FixColumn})
         tbFindings->resizeColumnToContents(column);
+    if (tbFindings->rowCount() > 0) // where the focus shows in the table
+        tbFindings->setCurrentCell(0, LevelColumn, QItemSelectionModel::NoUpdate);
 }
 
 QString frmTracker::findingsText() const
@@ -179,40 +211,44 @@ void frmTracker::addFixButtons(QHBoxLayout& buttons)
 {
     if (!repair_)
         return;
-    cmdFix = new QPushButton(tr("Fix"), this);
+    cmdFix = new QPushButton(tr("&Fix"), this);
     cmdFix->setObjectName("cmdFix");
-    cmdFixAll = new QPushButton(tr("Fix All"), this);
+    cmdFixAll = new QPushButton(tr("Fix &All"), this);
     cmdFixAll->setObjectName("cmdFixAll");
     buttons.addWidget(cmdFix);
     buttons.addWidget(cmdFixAll);
+    // Tab in reading order: the table, then the buttons from left to right.
+    setTabOrder(tbFindings, cmdFix);
+    setTabOrder(cmdFix, cmdFixAll);
+    setTabOrder(cmdFixAll, cmdCopy);
     connect(cmdFix, &QPushButton::clicked, this, &frmTracker::cmdFix_Click);
     connect(cmdFixAll, &QPushButton::clicked, this, &frmTracker::cmdFixAll_Click);
-}
-
-// "yes" in the Fix column of each finding that has a repair, when the dialog can repair.
-void frmTracker::markFixableRows()
-{
-    for (int row = 0; row < tbFindings->rowCount(); ++row) {
-        const bool fixable = repair_ && hasRepair(tbFindings->item(row, IdColumn)->text());
-        tbFindings->setItem(row, FixColumn, new QTableWidgetItem(fixable ? tr("yes") : QString()));
-    }
 }
 
 void frmTracker::cmdFix_Click()
 {
     std::set<std::string> ids;
-    for (const auto* item : tbFindings->selectedItems())
-        if (item->column() == IdColumn && hasRepair(item->text()))
-            ids.insert(item->text().toStdString());
+    for (const auto& selected : tbFindings->selectionModel()->selectedRows())
+        if (const auto& row = rowAt(selected.row()); row.repairable)
+            ids.insert(row.finding.id);
     if (!ids.empty())
         showRepaired(ids);
 }
 
-void frmTracker::cmdFixAll_Click() { showRepaired(DefaultFixIds()); }
+void frmTracker::cmdFixAll_Click()
+{
+    std::set<std::string> ids;
+    const auto byDefault = DefaultFixIds();
+    for (const auto& row : rows_)
+        if (row.repairable && byDefault.contains(row.finding.id))
+            ids.insert(row.finding.id);
+    if (!ids.empty())
+        showRepaired(ids);
+}
 
 void frmTracker::showRepaired(const std::set<std::string>& ids)
 {
-    const auto findings = repair_(ids);
-    lblVerdict->setText(verdict(findings));
-    fillTable(findings);
+    auto rows = repair_(ids);
+    lblVerdict->setText(verdict(rows));
+    fillTable(std::move(rows));
 }

@@ -123,6 +123,16 @@ TEST(CliCheck, ListsEveryFindingInLinesOrJsonAndNeverWritesAndExitsWithTheWorst)
     EXPECT_EQ(nlohmann::json::parse(RunCliWith({"check", "--json", latin1}).out)["FilePath"], utf8);
 }
 
+// The demo part that comes with the program teaches what the Parts Tracker accepts: its rules and
+// the save checks find nothing in it.
+TEST(CliCheck, TheDemoPartPassesTheTrackersRules)
+{
+    const std::string demo = QUILLMARK_DATA_DIR "/demo.dat";
+    const auto run = RunCliWith({"check", "--tracker", demo});
+    EXPECT_EQ(run.status, 0) << run.out;
+    EXPECT_EQ(run.out, demo + ": ok\n");
+}
+
 TEST(CliSave, SavesGoodFilesWithBackupSkipsRefusedOnesAndReportsFailures)
 {
     TempDir dir;

@@ -5,6 +5,7 @@
 #include "DocumentQuestions.h"
 #include "FixedClock.h"
 #include "IniSettingsStore.h"
+#include "LineLists.h"
 #include "ScriptedDialogs.h"
 #include "TempDir.h"
 
@@ -99,6 +100,32 @@ TEST_F(DocumentQuestions, SetPreferencesTakesTheStoredValuesOnYes)
     EXPECT_EQ(app.Header.AuthorRealName, "Jane Doe");
     EXPECT_EQ(app.Header.AuthorUserName, "sam") << "a user name the preferences lack leaves the record's";
     EXPECT_EQ(app.Header.License, "L") << "a licence that no entry matches leaves the record's";
+}
+
+// A history line out of the form the Parts Tracker takes is pointed out before it is taken: No
+// gives the box back with the text to mend, Yes keeps it; the other lists take any line.
+TEST(LineQuestions, HistoryLinesTheTrackerWouldRefuseAreAskedAbout)
+{
+    ScriptedDialogs dialogs;
+    dialogs.expectInput("2008-03-05 [] Changed licence to CC BY 4.0");
+    dialogs.expectMessage(Answer::No);
+    dialogs.expectInput("2008-03-05 {Jane Doe} Changed licence to CC BY 4.0");
+    EXPECT_EQ(AskForLine(dialogs, HistoryPrompt, "History", "2008-03-05 [] ", true),
+              "2008-03-05 {Jane Doe} Changed licence to CC BY 4.0");
+    ASSERT_EQ(dialogs.inputsShown.size(), 2u);
+    EXPECT_EQ(dialogs.inputsShown[0].defaultText, "2008-03-05 [] ");
+    EXPECT_EQ(dialogs.inputsShown[1].defaultText, "2008-03-05 [] Changed licence to CC BY 4.0");
+    ASSERT_EQ(dialogs.messages.size(), 1u);
+    EXPECT_EQ(dialogs.messages[0].defaultButton, Answer::No);
+
+    dialogs.expectInput("Changed licence to CC BY 4.0");
+    dialogs.expectMessage(Answer::Yes);
+    EXPECT_EQ(AskForLine(dialogs, HistoryPrompt, "History", "", true), "Changed licence to CC BY 4.0");
+    dialogs.expectInput("   ");
+    EXPECT_EQ(AskForLine(dialogs, HistoryPrompt, "History", "", true), "   ") << "nothing typed, nothing asked";
+    dialogs.expectInput("Changed licence");
+    EXPECT_EQ(AskForLine(dialogs, "Please enter your Comment", "Comment", "", false), "Changed licence");
+    EXPECT_EQ(dialogs.messages.size(), 2u);
 }
 
 } // namespace

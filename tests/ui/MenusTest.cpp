@@ -124,7 +124,7 @@ TEST_F(WindowTest, TrackerFindingsLeadToTheirFieldsAndEverySaveCountsThem)
     EXPECT_EQ(window->focusWidget(), child<QWidget>("cbLicenses"));
     app.Prefs.MakeBackup = false;
     window->MDateiSpeichern_Click();
-    EXPECT_EQ(text("lblStatuszeile"), "Saved " + app.Header.FilePath + "; Parts Tracker: 2 errors, 1 warning (Ctrl+T)");
+    EXPECT_EQ(text("lblStatuszeile"), "Saved " + app.Header.FilePath + "; Checks: 2 errors, 1 warning (Ctrl+T)");
 }
 
 // Two controls of one parent that cover each other by more than the design's own one-pixel
@@ -235,6 +235,7 @@ TEST_F(WindowTest, PreferencesWindowWithAnEmptyStore)
         EXPECT_TRUE(dialog.findChild<QCheckBox*>("chkDescriptionLimit")->isChecked());
         dialog.findChild<QCheckBox*>("chkDescriptionLimit")->setChecked(false);
         dialog.findChild<QLineEdit*>("txRealName")->setText("  Jane Doe ");
+        dialog.findChild<QLineEdit*>("txUserName")->setText("jdoe");
         dialog.findChild<QPushButton*>("cmdSave")->click();
     });
     window->MEinstellDefault_Click();

@@ -13,6 +13,7 @@
 #include <filesystem>
 
 #include "WindowFixture.h"
+#include "frmHelp.h"
 
 namespace {
 
@@ -142,7 +143,7 @@ TEST_F(ChangedFileTest, SaveClearsTheMarkAndSaysWhereItWrote)
     window->MDateiSpeichern_Click();
     EXPECT_EQ(caption(), "Quillmark 1.0.0 [3001.dat]");
     EXPECT_EQ(text("lblStatuszeile"),
-              "Saved " + path + " (backup 3001_Backup_2008-08-10_14-05-09.dat); Parts Tracker: 1 warning (Ctrl+T)");
+              "Saved " + path + " (backup 3001_Backup_2008-08-10_14-05-09.dat); Checks: 1 warning (Ctrl+T)");
     EXPECT_TRUE(window->close()) << "saved: no question";
 }
 
@@ -155,9 +156,18 @@ TEST_F(ChangedFileTest, ShortcutsRunTheirCommands)
     dialogs.expectOpenFile(std::nullopt);
     QTest::keyClick(window.get(), Qt::Key_O, Qt::ControlModifier);
     EXPECT_EQ(dialogs.fileDialogsShown.size(), 1u) << "Ctrl+O";
-    dialogs.expectMessage(Answer::Ok);
+    bool helpShown = false;
+    whenDialogShows<frmHelp>([&helpShown](frmHelp& help) {
+        helpShown = true;
+        help.accept();
+    });
     QTest::keyClick(window.get(), Qt::Key_F1);
-    EXPECT_EQ(dialogs.messages.back().text.rfind("Quillmark Version: 1.0.0", 0), 0u) << "F1";
+    EXPECT_TRUE(helpShown) << "F1";
+    dialogs.expectMessage(Answer::Ok);
+    child<QAction>("MInfo")->trigger();
+    EXPECT_EQ(dialogs.messages.back().text.rfind("Quillmark Version: 1.0.0", 0), 0u) << "Help › About";
+    window->activateWindow();
+    ASSERT_TRUE(QTest::qWaitForWindowActive(window.get()));
     QTest::keyClick(window.get(), Qt::Key_Q, Qt::ControlModifier);
     EXPECT_FALSE(window->isVisible()) << "Ctrl+Q";
 }
@@ -184,6 +194,7 @@ TEST_F(WindowTest, HistoryAddOffersTheUserNameJustSetInThePreferences)
     startUp();
     openThroughPendingFile(part("3001.dat", GoodPart));
     whenDialogShows<QDialog>([](QDialog& preferences) {
+        preferences.findChild<QLineEdit*>("txRealName")->setText("Jo Tester");
         preferences.findChild<QLineEdit*>("txUserName")->setText("jtester");
         preferences.findChild<QPushButton*>("cmdSave")->click();
     });

@@ -7,6 +7,7 @@
 #include <QTableWidget>
 #include <QTest>
 #include <gtest/gtest.h>
+#include <set>
 
 #include "frmTracker.h"
 
@@ -15,10 +16,11 @@ namespace {
 const std::string LongMessage = "The quad is not quite flat: it bends by 2.430 degrees, which the library accepts "
                                 "with a warning but would rather see split into two triangles.";
 
-const std::vector<TrackerFinding> Findings = {{"warning.notcoplaner", FindingLevel::Warning, LongMessage, 12},
-                                              {"line.invalid", FindingLevel::Error, "Not a valid LDraw line.", 30},
-                                              {"bfc", FindingLevel::Error, "The first BFC line is missing.", 0},
-                                              {"line.colinear", FindingLevel::Error, "On one line.", 9}};
+const std::vector<StopRow> Findings = {
+    {{"warning.notcoplaner", FindingLevel::Warning, LongMessage, 12}, false, {}},
+    {{"line.invalid", FindingLevel::Error, "Not a valid LDraw line.", 30}, false, {}},
+    {{"bfc", FindingLevel::Error, "The first BFC line is missing.", 0}, false, {}},
+    {{"line.colinear", FindingLevel::Error, "On one line.", 9}, false, {}}};
 
 QStringList column(const QTableWidget& table, int column)
 {
@@ -47,6 +49,49 @@ TEST(TrackerDialog, ListsErrorsFirstAndSortsByTheClickedColumn)
     EXPECT_EQ(column(table, 2), QStringList({"", "9", "12", "30"}));
     clickHeader(table, 2);
     EXPECT_EQ(column(table, 2), QStringList({"30", "12", "9", ""}));
+}
+
+// After sorting, a double-click hands on the finding of the row as it now stands.
+TEST(TrackerDialog, ADoubleClickAfterSortingLeadsToThatRowsFinding)
+{
+    frmTracker dialog(Findings, "/parts/3001.dat");
+    std::vector<std::string> ledTo;
+    dialog.leadToFields([&ledTo](const TrackerFinding& finding) {
+        ledTo.push_back(finding.id);
+        return false;
+    });
+    dialog.show();
+    ASSERT_TRUE(QTest::qWaitForWindowExposed(&dialog));
+    auto& table = *dialog.findChild<QTableWidget*>("tbFindings");
+    clickHeader(table, 2);
+    clickHeader(table, 2); // lines from the last: 30, 12, 9, none
+    for (const int row : {0, 1}) {
+        const QPoint cell = table.visualItemRect(table.item(row, 1)).center();
+        QTest::mouseClick(table.viewport(), Qt::LeftButton, {}, cell);
+        QTest::mouseDClick(table.viewport(), Qt::LeftButton, {}, cell);
+    }
+    EXPECT_EQ(ledTo, std::vector<std::string>({"line.invalid", "warning.notcoplaner"}));
+}
+
+// Tab stops once in the table (the arrows move within it), then at each button, each with its
+// access key; the table shows where its focus is.
+TEST(TrackerDialog, TabStopsOnceInTheTableThenAtEachButton)
+{
+    frmTracker dialog(Findings, "/parts/3001.dat", nullptr, [](const std::set<std::string>&) { return Findings; });
+    dialog.show();
+    ASSERT_TRUE(QTest::qWaitForWindowExposed(&dialog));
+    auto& table = *dialog.findChild<QTableWidget*>("tbFindings");
+    table.setFocus();
+    QStringList walked;
+    for (int step = 0; step < 5; ++step) {
+        walked << QApplication::focusWidget()->objectName();
+        QTest::keyClick(QApplication::focusWidget(), Qt::Key_Tab);
+    }
+    EXPECT_EQ(walked, QStringList({"tbFindings", "cmdFix", "cmdFixAll", "cmdCopy", "cmdClose"}));
+    EXPECT_EQ(QApplication::focusWidget(), &table) << "round again";
+    EXPECT_TRUE(table.currentIndex().isValid()) << "a current cell, where the focus shows";
+    for (const char* name : {"cmdFix", "cmdFixAll", "cmdCopy", "cmdClose"})
+        EXPECT_TRUE(dialog.findChild<QPushButton*>(name)->text().contains('&')) << name;
 }
 
 TEST(TrackerDialog, GrowsWithTheTableAndWrapsLongMessages)
