@@ -34,22 +34,6 @@
 
 namespace {
 
-using TrackerFindings = std::vector<TrackerFinding>;
-
-// Where the Tracker's colour codes come from; none when the built-in list cannot be read.
-std::unique_ptr<ColourSource> colourSource(const std::string& ldconfig, std::ostream& err)
-{
-    const auto path = DataFileOfThisProgram(ProgramFolder(), BuiltInColoursFile);
-    try {
-        return std::make_unique<ColourSource>(ReadBuiltInColours(path), ldconfig, [&err](const std::string& text) {
-            err << "quillmark-cli: " << text << '\n';
-        });
-    } catch (const QmError& failure) {
-        err << "quillmark-cli: cannot read the colour list " << path << ": " << failure.description() << '\n';
-        return nullptr;
-    }
-}
-
 std::string firstLine(const std::string& text) { return text.substr(0, text.find('\r')); }
 
 void noteFindings(FileReport& report, const SaveFindings& findings)
@@ -228,37 +212,30 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
     StringList categories;
     std::unique_ptr<ColourSource> colours;
     if (options.tracker &&
-        (!ReadStandardList(ListKind::Category, categories, err) || !(colours = colourSource(options.ldconfig, err))))
+        (!ReadStandardList(ListKind::Category, categories, err) || !(colours = ColourSourceFor(options.ldconfig, err))))
         return ExitStatus::Unreadable;
+    const CheckSetup setup{batch.limitDescription, options.tracker ? &categories : nullptr, colours.get()};
     MemoryClaims memory;
     // A SARIF log is one document: its results are gathered and written at the end.
     const bool sarif = options.format == OutputFormat::Sarif;
     std::ostringstream sarifResults;
     const auto status = runBatch(arguments, batch, sarif ? sarifResults : out, err, [&](const PartFileEntry& entry) {
-        const auto& path = entry.path;
         // A check never writes, not even to undo what a killed save left: the next save does that.
-        return reportOn(
-            entry, batch.quiet, {}, nullptr, memory,
-            [&](const HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
-                const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
-                const auto composed = ComposeHeader(header);
-                TrackerFindings tracker; // empty unless asked for
-                if (options.tracker) {
-                    const auto& codes =
-                        colours->forPart(path, [&dialogs](const std::string& text) { dialogs.message({text}); });
-                    tracker = CheckRecordForTracker(header, composed, categories, codes);
-                }
-                report.out =
-                    CheckOutput(options.format, header, composed, findings, options.tracker ? &tracker : nullptr);
-                noteFindings(report, findings);
-                bool trackerRefuses = false;
-                for (const auto& finding : tracker) {
-                    report.trackerIds.push_back(finding.id);
-                    trackerRefuses = trackerRefuses || finding.level == FindingLevel::Error;
-                }
-                report.refused = trackerRefuses;
-                report.status = findings.refusals.empty() && !trackerRefuses ? ExitStatus::Ok : ExitStatus::Refused;
-            });
+        return reportOn(entry, batch.quiet, {}, nullptr, memory,
+                        [&](const HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
+                            const auto check = CheckRecord(header, setup, dialogs);
+                            report.out = CheckOutput(options.format, header, check, options.tracker);
+                            const auto& findings = check.save;
+                            noteFindings(report, findings);
+                            bool trackerRefuses = false;
+                            for (const auto& finding : check.tracker) {
+                                report.trackerIds.push_back(finding.id);
+                                trackerRefuses = trackerRefuses || finding.level == FindingLevel::Error;
+                            }
+                            report.refused = trackerRefuses;
+                            report.status =
+                                findings.refusals.empty() && !trackerRefuses ? ExitStatus::Ok : ExitStatus::Refused;
+                        });
     });
     if (sarif)
         WriteSarifLog(sarifResults.view(), out);

@@ -28,16 +28,13 @@ nlohmann::ordered_json CheckJson(const HeaderData& header, const SaveFindings& s
     return json;
 }
 
-std::string CheckOutput(OutputFormat format, const HeaderData& header, const std::string& composedHeader,
-                        const SaveFindings& save, const std::vector<TrackerFinding>* tracker)
+std::string CheckOutput(OutputFormat format, const HeaderData& header, const RecordCheck& check, bool tracker)
 {
-    const FileLinePlaces places(header, composedHeader);
-    const auto trackerFindings =
-        tracker != nullptr ? TrackerFileFindings(*tracker, places) : std::vector<FileFinding>{};
-    if (format == OutputFormat::Json)
-        return CheckJson(header, save, tracker != nullptr ? &trackerFindings : nullptr).dump() + '\n';
-    auto findings = SaveCheckFindings(save, places);
-    findings.insert(findings.end(), trackerFindings.begin(), trackerFindings.end());
+    if (format == OutputFormat::Json) {
+        const auto trackerFindings = TrackerFileFindings(check.tracker, FileLinePlaces(header, check.composed));
+        return CheckJson(header, check.save, tracker ? &trackerFindings : nullptr).dump() + '\n';
+    }
+    const auto findings = FindingsOfRecord(header, check, tracker);
     switch (format) {
     case OutputFormat::Sarif: return SarifResultLines(header.FilePath, findings);
     case OutputFormat::Github: return GithubFindingLines(header.FilePath, findings);

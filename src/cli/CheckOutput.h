@@ -7,11 +7,11 @@
 
 #include "FileFindings.h"
 #include "FindingLines.h"
+#include "TextCheck.h"
 
-// One file's output of check in the chosen form; tracker is null unless the Parts Tracker's
-// rules were checked. composedHeader is the header a save would write.
-std::string CheckOutput(OutputFormat format, const HeaderData& header, const std::string& composedHeader,
-                        const SaveFindings& save, const std::vector<TrackerFinding>* tracker);
+// One file's output of check in the chosen form; tracker tells whether the Parts Tracker's rules
+// were checked.
+std::string CheckOutput(OutputFormat format, const HeaderData& header, const RecordCheck& check, bool tracker);
 
 // The JSON object of a file's save checks, and of its Tracker findings when given.
 nlohmann::ordered_json CheckJson(const HeaderData& header, const SaveFindings& save,

@@ -1,0 +1,38 @@
+// SPDX-License-Identifier: MIT
+#pragma once
+
+#include <string>
+#include <vector>
+
+#include "FileFindings.h"
+#include "HeaderData.h"
+#include "SaveChecks.h"
+#include "TrackerCheck.h"
+
+class ColourSource;
+class Dialogs;
+
+// What check weighs a part by: the save checks, and the Parts Tracker's rules when their lists are given.
+struct CheckSetup {
+    bool limitDescription = true;           // the description's 64 characters
+    const StringList* categories = nullptr; // the official categories; null: no Tracker rules
+    ColourSource* colours = nullptr;        // where each part's colour codes come from
+};
+
+// What the checks say about one record.
+struct RecordCheck {
+    SaveFindings save;
+    std::string composed;                // the header a save would write
+    std::vector<TrackerFinding> tracker; // empty unless the Tracker's rules were checked
+};
+
+// The checks of check on an open record; dialogs hears of an unusable LDConfig.ldr.
+RecordCheck CheckRecord(const HeaderData& header, const CheckSetup& setup, Dialogs& dialogs);
+
+// Every finding of check, save checks first, each on the line of the file it is about.
+std::vector<FileFinding> FindingsOfRecord(const HeaderData& header, const RecordCheck& check, bool tracker);
+
+// check on a part's text held in memory, as if path held these bytes: the same reading as a file's
+// (an LF-only text is read as CR LF), the same checks, the same findings. Files near path (the
+// colour list) are read, nothing is written. Throws what reading the text throws (a binary text).
+std::vector<FileFinding> CheckPartText(std::string bytes, const std::string& path, const CheckSetup& setup);
