@@ -3,6 +3,7 @@
 
 #include <array>
 
+#include "HeaderFacts.h"
 #include "Text.h"
 
 namespace {
@@ -22,6 +23,14 @@ std::vector<std::string> startingWith(const StringList& entries, std::string_vie
 }
 
 } // namespace
+
+StringList CategoriesInForce(StringList categories)
+{
+    std::erase_if(categories, [](const std::string& category) {
+        return category.starts_with('<') || RetiredCategories.contains(QString::fromStdString(category));
+    });
+    return categories;
+}
 
 Completions CompleteHeaderLine(std::string_view lineStart, const CompletionLists& lists)
 {

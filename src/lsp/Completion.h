@@ -16,6 +16,10 @@ struct CompletionLists {
     std::string historyStart; // "YYYY-MM-DD [user] " of today
 };
 
+// The categories an author may choose: the list's entries without the retired ones and the
+// window's "<none>".
+StringList CategoriesInForce(StringList categories);
+
 // The texts that may follow the start of a line (the bytes before the cursor), and how many of
 // the start's last bytes each replaces (the part of the value typed so far).
 struct Completions {

@@ -9,21 +9,10 @@
 #include "ColourSource.h"
 #include "Dates.h"
 #include "EditCommandLine.h"
-#include "HeaderFacts.h"
 #include "ServerLoop.h"
 #include "TextCheck.h"
 
 namespace {
-
-// The categories an author may choose: the list's entries without the retired ones and the
-// window's "<none>".
-StringList categoriesInForce(StringList categories)
-{
-    std::erase_if(categories, [](const std::string& category) {
-        return category.starts_with('<') || RetiredCategories.contains(QString::fromStdString(category));
-    });
-    return categories;
-}
 
 std::string historyStart()
 {
@@ -45,7 +34,7 @@ int RunLanguageServer(const LanguageServerOptions& options, std::ostream& err)
         !ReadStandardList(ListKind::License, lists.licences, err) ||
         !ReadStandardList(ListKind::Bfc, lists.bfcStatements, err))
         return ExitStatus::Unreadable;
-    lists.categories = categoriesInForce(categories);
+    lists.categories = CategoriesInForce(categories);
     const CheckSetup checks{options.limitDescription, &categories, colours.get()};
     setup.check = [&checks](std::string bytes, const std::string& path) {
         return CheckPartText(std::move(bytes), path, checks);

@@ -1,0 +1,284 @@
+// SPDX-License-Identifier: MIT
+#include <gtest/gtest.h>
+#include <set>
+#include <tuple>
+
+#include "CliRun.h"
+#include "Clock.h"
+#include "Corpus.h"
+#include "Dates.h"
+#include "LspClient.h"
+#include "TempDir.h"
+#include "Text.h"
+
+namespace {
+
+using Json = nlohmann::json;
+
+// A finding as the two sides give it: line (from 1), severity number, id, message.
+using Finding = std::tuple<std::size_t, int, std::string, std::string>;
+
+int severityNumber(const std::string& level) { return level == "error" ? 1 : level == "warning" ? 2 : 3; }
+
+// What check --tracker prints for the file, one finding per line: "path:line: level id: message",
+// or "path: level id: message" for the file as a whole (which the server shows on the first line).
+std::multiset<Finding> checkFindings(const std::string& path)
+{
+    const auto run = RunCliWith({"check", "--tracker", "--quiet", path});
+    std::multiset<Finding> findings;
+    std::istringstream lines(run.out);
+    for (std::string line; std::getline(lines, line);) {
+        if (line == path + ": ok")
+            continue;
+        EXPECT_TRUE(line.starts_with(path + ":")) << line;
+        auto rest = line.substr(path.size() + 1);
+        std::size_t number = 1;
+        if (rest.front() != ' ') {
+            const auto colon = rest.find(':');
+            number = std::stoul(rest.substr(0, colon));
+            rest.erase(0, colon + 1);
+        }
+        const auto level = rest.substr(1, rest.find(' ', 1) - 1);
+        rest.erase(0, level.size() + 2);
+        const auto colon = rest.find(": ");
+        findings.insert({number, severityNumber(level), rest.substr(0, colon), rest.substr(colon + 2)});
+    }
+    return findings;
+}
+
+std::multiset<Finding> serverFindings(const Json& diagnostics)
+{
+    std::multiset<Finding> findings;
+    for (const auto& diagnostic : diagnostics) {
+        EXPECT_EQ(diagnostic["source"], "quillmark");
+        findings.insert({diagnostic["range"]["start"]["line"].get<std::size_t>() + 1, diagnostic["severity"].get<int>(),
+                         diagnostic.value("code", ""), diagnostic["message"].get<std::string>()});
+    }
+    return findings;
+}
+
+Json textDocument(const std::string& uri) { return {{"uri", uri}}; }
+
+Json at(std::size_t line, std::size_t character) { return {{"line", line}, {"character", character}}; }
+
+Json change(std::size_t fromLine, std::size_t fromCharacter, std::size_t toLine, std::size_t toCharacter,
+            const std::string& text)
+{
+    return {{"range", {{"start", at(fromLine, fromCharacter)}, {"end", at(toLine, toCharacter)}}}, {"text", text}};
+}
+
+int errorCode(const Json& response) { return response["error"].value("code", 0); }
+
+std::string hoverText(LspClient& client, const std::string& uri, std::size_t line)
+{
+    const auto answer = client.responseTo(
+        client.request("textDocument/hover", {{"textDocument", textDocument(uri)}, {"position", at(line, 2)}}));
+    return answer["result"].is_null() ? std::string() : answer["result"]["contents"]["value"].get<std::string>();
+}
+
+std::vector<std::string> completionLabels(LspClient& client, const std::string& uri, std::size_t line,
+                                          std::size_t character)
+{
+    const auto answer = client.responseTo(client.request(
+        "textDocument/completion", {{"textDocument", textDocument(uri)}, {"position", at(line, character)}}));
+    std::vector<std::string> labels;
+    for (const auto& item : answer["result"])
+        labels.push_back(item["label"]);
+    return labels;
+}
+
+const std::string SmallPart = "0 Brick  1 x  2\r\n"
+                              "0 Name: 3004.dat\r\n"
+                              "0 Author: Ann Example [ann]\r\n"
+                              "0 !LDRAW_ORG Unofficial_Part\r\n"
+                              "0 !LICENSE Redistributable under CCAL version 2.0 : see CAreadme.txt\r\n"
+                              "\r\n"
+                              "0 BFC CERTIFY CCW\r\n"
+                              "\r\n"
+                              "1 16 0 0 0 1 0 0 0 1 0 0 0 1 stud.dat\r\n";
+
+} // namespace
+
+TEST(LspProtocol, LivesFromInitializeToExit)
+{
+    LspClient client;
+    const auto capabilities = client.initialize();
+    EXPECT_EQ(capabilities["positionEncoding"], "utf-16"); // the protocol's default
+    EXPECT_EQ(capabilities["textDocumentSync"]["change"], 2);
+    EXPECT_TRUE(capabilities["hoverProvider"].get<bool>());
+    const auto shutdown = client.responseTo(client.request("shutdown", nullptr));
+    EXPECT_TRUE(shutdown.contains("result") && shutdown["result"].is_null());
+    // Once shut down, requests are refused.
+    EXPECT_EQ(errorCode(client.responseTo(client.request("textDocument/hover", Json::object()))), -32600);
+    client.notify("exit", nullptr);
+    EXPECT_EQ(client.exitStatus(), 0);
+
+    LspClient utf8;
+    EXPECT_EQ(utf8.initialize({{"general", {{"positionEncodings", {"utf-8", "utf-16"}}}}})["positionEncoding"],
+              "utf-8");
+    utf8.notify("exit", nullptr); // without shutdown
+    EXPECT_EQ(utf8.exitStatus(), 1);
+
+    LspClient ended;
+    ended.initialize();
+    EXPECT_EQ(ended.exitStatus(), 1); // the end of the input without shutdown
+
+    LspClient early;
+    // Before initialize, requests are refused.
+    EXPECT_EQ(errorCode(early.responseTo(early.request("shutdown", nullptr))), -32002);
+}
+
+TEST(LspProtocol, PublishesCheckTrackersFindingsOfCorpusParts)
+{
+    const auto parts = CorpusPartFiles();
+    if (parts.empty())
+        GTEST_SKIP() << "the shared corpus is absent";
+    const TempDir folder;
+    LspClient client;
+    client.initialize();
+    // Every 97th part: LF and CR LF files, parts, subparts and primitives, with and without findings.
+    std::size_t compared = 0, withFindings = 0;
+    for (std::size_t k = 0; k < parts.size(); k += 97) {
+        // An editor reads a file in ISO-8859-1 as such, and hands the server its text in UTF-8.
+        auto bytes = ReadBytes(parts[k].string());
+        if (!IsValidUtf8(bytes))
+            bytes = Latin1ToUtf8(bytes);
+        const auto path = folder.write(parts[k].filename().string(), bytes);
+        const auto expected = checkFindings(path);
+        client.open(UriOf(path), ReadBytes(path));
+        EXPECT_EQ(serverFindings(client.diagnosticsOf(UriOf(path))), expected) << parts[k];
+        ++compared;
+        withFindings += expected.empty() ? 0 : 1;
+    }
+    EXPECT_GT(withFindings, 3u);
+    EXPECT_GT(compared, 10u);
+    // Nothing is written beside the documents.
+    EXPECT_EQ(NamesIn(folder.path()).size(), compared);
+}
+
+TEST(LspProtocol, FollowsIncrementalAndFullChanges)
+{
+    const TempDir folder;
+    const auto path = folder.file("3004.dat");
+    const auto uri = UriOf(path);
+    LspClient client;
+    client.initialize();
+    client.open(uri, SmallPart);
+    client.diagnosticsOf(uri);
+    const auto changes = Json::array({
+        // an insert: the licence the library accepts before the old one's text, which is then deleted
+        change(4, 11, 4, 11, "Licensed under CC BY 4.0 : see CAreadme.txt"),
+        change(4, 54, 4, 113, ""),
+        // a change across lines: the blank line and the BFC line become one line
+        change(5, 0, 6, 17, "0 BFC CERTIFY CW"),
+        // a CR LF split: the CR stays, what follows it starts a line of its own
+        change(6, 0, 7, 0, "\r"),
+        change(7, 0, 7, 0, "0 // \xF0\x9F\x98\x80 comment\n"),
+        // a UTF-16 column after a character of two code units
+        change(7, 7, 7, 7, "ed"),
+    });
+    client.notify("textDocument/didChange",
+                  {{"textDocument", {{"uri", uri}, {"version", 2}}}, {"contentChanges", changes}});
+    const std::string expected = "0 Brick  1 x  2\r\n"
+                                 "0 Name: 3004.dat\r\n"
+                                 "0 Author: Ann Example [ann]\r\n"
+                                 "0 !LDRAW_ORG Unofficial_Part\r\n"
+                                 "0 !LICENSE Licensed under CC BY 4.0 : see CAreadme.txt\r\n"
+                                 "0 BFC CERTIFY CW\r\n"
+                                 "\r"
+                                 "0 // \xF0\x9F\x98\x80"
+                                 "ed comment\n"
+                                 "1 16 0 0 0 1 0 0 0 1 0 0 0 1 stud.dat\r\n";
+    TempDir::writeTo(path, expected);
+    EXPECT_EQ(serverFindings(client.diagnosticsOf(uri)), checkFindings(path));
+    EXPECT_EQ(hoverText(client, uri, 5).substr(0, 4), "BFC:");
+    EXPECT_EQ(hoverText(client, uri, 6), "");
+
+    // A full change replaces the whole text.
+    client.notify("textDocument/didChange",
+                  {{"textDocument", {{"uri", uri}, {"version", 3}}}, {"contentChanges", {{{"text", SmallPart}}}}});
+    TempDir::writeTo(path, SmallPart);
+    EXPECT_EQ(serverFindings(client.diagnosticsOf(uri)), checkFindings(path));
+}
+
+TEST(LspProtocol, AnswersBrokenMessagesAndGoesOn)
+{
+    LspClient client;
+    client.initialize();
+    client.sendBytes("Content-Length: 8\r\n\r\n{\"jsonrp");
+    EXPECT_EQ(errorCode(client.next()), -32700);
+    client.sendBytes("Content-Type: x\r\n\r\n");
+    const auto noLength = client.next();
+    EXPECT_EQ(errorCode(noLength), -32700);
+    EXPECT_TRUE(noLength["id"].is_null());
+    client.send(Json::array({1, 2}));
+    EXPECT_EQ(errorCode(client.next()), -32600);
+    client.send({{"jsonrpc", "2.0"}, {"id", 77}, {"method", 3}});
+    const auto notAMethod = client.next();
+    EXPECT_EQ(errorCode(notAMethod), -32600);
+    EXPECT_EQ(notAMethod["id"], 77);
+    // An unknown notification is ignored: the next message answers the next request.
+    client.notify("workspace/didChangeConfiguration", {{"settings", Json::object()}});
+    const auto unknown = client.request("textDocument/formatting", Json::object());
+    const auto answer = client.next();
+    EXPECT_EQ(answer["id"], unknown);
+    EXPECT_EQ(errorCode(answer), -32601);
+    EXPECT_TRUE(client.responseTo(client.request("shutdown", nullptr))["result"].is_null());
+}
+
+TEST(LspProtocol, CancelAnswersAWaitingRequest)
+{
+    const TempDir folder;
+    const auto uri = UriOf(folder.file("3004.dat"));
+    LspClient client;
+    client.initialize();
+    client.open(uri, SmallPart);
+    // A hover waits for the findings of the text as it stands, whose check waits for the typing to pause.
+    const auto hover =
+        client.request("textDocument/hover", {{"textDocument", textDocument(uri)}, {"position", at(4, 3)}});
+    client.notify("$/cancelRequest", {{"id", hover}});
+    EXPECT_EQ(errorCode(client.responseTo(hover)), -32800);
+    EXPECT_FALSE(client.diagnosticsOf(uri).empty());
+}
+
+TEST(LspProtocol, HoverTellsTheLinesMeaningAndItsFindings)
+{
+    const TempDir folder;
+    const auto uri = UriOf(folder.file("3004.dat"));
+    LspClient client;
+    client.initialize();
+    client.open(uri, SmallPart);
+    const auto licence = hoverText(client, uri, 4);
+    EXPECT_TRUE(licence.starts_with("!LICENSE: ")) << licence;
+    EXPECT_NE(licence.find("license.approved"), std::string::npos) << licence;
+    EXPECT_TRUE(hoverText(client, uri, 1).starts_with("Name: "));
+    EXPECT_EQ(hoverText(client, uri, 8), ""); // a type 1 line without a finding
+}
+
+TEST(LspProtocol, CompletesHeaderValues)
+{
+    const TempDir config;
+    std::filesystem::create_directory(config.path() / "Quillmark");
+    TempDir::writeTo(config.file("Quillmark/Quillmark.ini"), "[DEFAULT]\nUserName=ann\n");
+    const TempDir folder;
+    const auto uri = UriOf(folder.file("3004.dat"));
+    LspClient client({"XDG_CONFIG_HOME=" + config.path().string()});
+    client.initialize();
+    client.open(uri,
+                "0 \r\n0 !CATEGORY Mini\r\n0 !HISTORY \r\n0 !LICENSE \r\n0 BFC NO\r\n0 !LDRAW_ORG Unofficial_P\r\n");
+    const auto keywords = completionLabels(client, uri, 0, 2);
+    EXPECT_EQ(keywords.size(), 10u);
+    EXPECT_NE(std::find(keywords.begin(), keywords.end(), "!LDRAW_ORG "), keywords.end());
+    const auto categories = completionLabels(client, uri, 1, 16);
+    EXPECT_FALSE(categories.empty());
+    for (const auto& category : categories)
+        EXPECT_TRUE(category.starts_with("Minifig ")) << category;
+    const auto today = SystemClock().now();
+    EXPECT_EQ(completionLabels(client, uri, 2, 11),
+              std::vector<std::string>{FormatDate(today.year, today.month, today.day) + " [ann] "});
+    EXPECT_EQ(completionLabels(client, uri, 3, 11).front(), "Licensed under CC BY 4.0 : see CAreadme.txt");
+    EXPECT_EQ(completionLabels(client, uri, 4, 8), std::vector<std::string>{"NOCERTIFY"});
+    EXPECT_EQ(completionLabels(client, uri, 5, 25),
+              (std::vector<std::string>{"Unofficial_Part", "Unofficial_Primitive", "Unofficial_Part Alias",
+                                        "Unofficial_Part Flexible_Section"}));
+}
