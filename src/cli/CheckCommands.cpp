@@ -224,7 +224,9 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
         return reportOn(entry, batch.quiet, {}, nullptr, memory,
                         [&](const HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
                             const auto check = CheckRecord(header, setup, dialogs);
-                            report.out = CheckOutput(options.format, header, check, options.tracker);
+                            // The file is read again for the places of its findings only when it has any.
+                            const auto bytes = HasFindings(check) ? FileBytes(*header.Part).takeBytes() : std::string();
+                            report.out = CheckOutput(options.format, header, check, bytes, options.tracker);
                             const auto& findings = check.save;
                             noteFindings(report, findings);
                             bool trackerRefuses = false;

@@ -2,7 +2,6 @@
 #include "CheckOutput.h"
 
 #include "FieldsJson.h"
-#include "FileLinePlaces.h"
 #include "SarifLog.h"
 
 nlohmann::ordered_json CheckJson(const HeaderData& header, const SaveFindings& save,
@@ -21,20 +20,24 @@ nlohmann::ordered_json CheckJson(const HeaderData& header, const SaveFindings& s
         for (const auto& finding : *tracker) {
             auto& entry = json["tracker"].emplace_back(nlohmann::ordered_json{
                 {"id", finding.id}, {"level", SeverityText(finding.severity)}, {"text", finding.message}});
-            if (finding.line > 0)
-                entry["line"] = finding.line;
+            if (!finding.place.wholeFile) {
+                entry["line"] = finding.place.line;
+                entry["column"] = finding.place.column;
+            }
         }
     }
     return json;
 }
 
-std::string CheckOutput(OutputFormat format, const HeaderData& header, const RecordCheck& check, bool tracker)
+std::string CheckOutput(OutputFormat format, const HeaderData& header, const RecordCheck& check,
+                        std::string_view fileBytes, bool tracker)
 {
     if (format == OutputFormat::Json) {
-        const auto trackerFindings = TrackerFileFindings(check.tracker, FileLinePlaces(header, check.composed));
+        const auto trackerFindings =
+            TrackerFileFindings(check.tracker, FindingPlaces(fileBytes, header, check.composed));
         return CheckJson(header, check.save, tracker ? &trackerFindings : nullptr).dump() + '\n';
     }
-    const auto findings = FindingsOfRecord(header, check, tracker);
+    const auto findings = FindingsOfRecord(header, check, fileBytes, tracker);
     switch (format) {
     case OutputFormat::Sarif: return SarifResultLines(header.FilePath, findings);
     case OutputFormat::Github: return GithubFindingLines(header.FilePath, findings);

@@ -1,7 +1,6 @@
 // SPDX-License-Identifier: MIT
 #include "FileFindings.h"
 
-#include "FileLinePlaces.h"
 #include "FileReport.h"
 
 namespace {
@@ -36,7 +35,7 @@ const char* SeverityText(Severity severity)
     return "note";
 }
 
-std::vector<FileFinding> SaveCheckFindings(const SaveFindings& save, const FileLinePlaces& places)
+std::vector<FileFinding> SaveCheckFindings(const SaveFindings& save, const FindingPlaces& places)
 {
     std::vector<FileFinding> findings;
     for (std::size_t k = 0; k < save.refusals.size(); ++k)
@@ -47,17 +46,16 @@ std::vector<FileFinding> SaveCheckFindings(const SaveFindings& save, const FileL
                             places.ofHeaderKeyword("Author:")});
     for (const auto& [offered, what, id] : FixUpNames(save.fixups))
         if (offered)
-            findings.push_back({id, Severity::Note, std::string("A save would offer a fix-up: ") + what + ".",
-                                std::string_view(id) == "save.fixup.color" ? places.ofHeaderKeyword("COLOR") : 0});
+            findings.push_back(
+                {id, Severity::Note, std::string("A save would offer a fix-up: ") + what + ".",
+                 std::string_view(id) == "save.fixup.color" ? places.ofHeaderKeyword("COLOR") : FindingPlace{}});
     return findings;
 }
 
-std::vector<FileFinding> TrackerFileFindings(const std::vector<TrackerFinding>& tracker, const FileLinePlaces& places)
+std::vector<FileFinding> TrackerFileFindings(const std::vector<TrackerFinding>& tracker, const FindingPlaces& places)
 {
     std::vector<FileFinding> findings;
     for (const auto& finding : tracker)
-        findings.push_back({finding.id, severityOf(finding.level), finding.text,
-                            finding.line > 0 ? places.ofCheckedLine(static_cast<std::size_t>(finding.line))
-                                             : places.ofTrackerRule(finding.id)});
+        findings.push_back({finding.id, severityOf(finding.level), finding.text, places.of(finding)});
     return findings;
 }

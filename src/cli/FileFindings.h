@@ -4,6 +4,7 @@
 #include <string>
 #include <vector>
 
+#include "FindingPlaces.h"
 #include "HeaderData.h"
 #include "SaveChecks.h"
 #include "TrackerCheck.h"
@@ -17,14 +18,12 @@ struct FileFinding {
     std::string id; // a save check's ("save.author") or the Parts Tracker's ("license.approved")
     Severity severity;
     std::string message;
-    std::size_t line = 0; // the line of the file on disk; 0 when there is none to name
+    FindingPlace place;
 };
-
-class FileLinePlaces;
 
 // What the save checks say about a file, in their order: a refusal is an error, a missing user
 // name a warning, a fix-up a save would offer a note.
-std::vector<FileFinding> SaveCheckFindings(const SaveFindings& save, const FileLinePlaces& places);
+std::vector<FileFinding> SaveCheckFindings(const SaveFindings& save, const FindingPlaces& places);
 
 // The findings of the Parts Tracker's rules, placed on the file's lines.
-std::vector<FileFinding> TrackerFileFindings(const std::vector<TrackerFinding>& tracker, const FileLinePlaces& places);
+std::vector<FileFinding> TrackerFileFindings(const std::vector<TrackerFinding>& tracker, const FindingPlaces& places);

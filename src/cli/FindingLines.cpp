@@ -43,8 +43,8 @@ std::string TextFindingLines(const std::string& path, const std::vector<FileFind
     std::string lines;
     for (const auto& finding : findings) {
         lines += shownPath + ':';
-        if (finding.line > 0)
-            lines += std::to_string(finding.line) + ':';
+        if (!finding.place.wholeFile)
+            lines += std::to_string(finding.place.line) + ':';
         lines += ' ';
         lines += SeverityText(finding.severity);
         lines += ' ' + ShownText(finding.id) + ": " + ShownText(finding.message) + '\n';
@@ -58,8 +58,8 @@ std::string GithubFindingLines(const std::string& path, const std::vector<FileFi
     std::string lines;
     for (const auto& finding : findings) {
         lines += std::string("::") + workflowCommand(finding.severity) + " file=" + file;
-        if (finding.line > 0)
-            lines += ",line=" + std::to_string(finding.line);
+        if (!finding.place.wholeFile)
+            lines += ",line=" + std::to_string(finding.place.line);
         lines += ",title=" + workflowEscaped(finding.id, true) +
                  "::" + workflowEscaped(ShownText(finding.message), false) + '\n';
     }

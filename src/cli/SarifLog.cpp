@@ -66,8 +66,8 @@ std::string SarifResultLines(const std::string& path, const std::vector<FileFind
         const auto message = TextForJson(finding.message);
         const auto occurrence = std::to_string(seen[{finding.id, message}]++);
         Json location{{"physicalLocation", {{"artifactLocation", {{"uri", TextForJson(uri)}}}}}};
-        if (finding.line > 0)
-            location["physicalLocation"]["region"] = {{"startLine", finding.line}};
+        if (!finding.place.wholeFile)
+            location["physicalLocation"]["region"] = {{"startLine", finding.place.line}};
         const Json result{
             {"ruleId", finding.id},
             {"level", SeverityText(finding.severity)},

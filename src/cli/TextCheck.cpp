@@ -6,7 +6,7 @@
 #include "ColourSource.h"
 #include "Composer.h"
 #include "ConsoleDialogs.h"
-#include "FileLinePlaces.h"
+#include "FindingPlaces.h"
 #include "OpenDocument.h"
 #include "ParseProgress.h"
 
@@ -21,9 +21,16 @@ RecordCheck CheckRecord(const HeaderData& header, const CheckSetup& setup, Dialo
     return check;
 }
 
-std::vector<FileFinding> FindingsOfRecord(const HeaderData& header, const RecordCheck& check, bool tracker)
+bool HasFindings(const RecordCheck& check)
 {
-    const FileLinePlaces places(header, check.composed);
+    const auto& save = check.save;
+    return !check.tracker.empty() || !save.refusals.empty() || save.missingUserName || save.fixups.color;
+}
+
+std::vector<FileFinding> FindingsOfRecord(const HeaderData& header, const RecordCheck& check,
+                                          std::string_view fileBytes, bool tracker)
+{
+    const FindingPlaces places(fileBytes, header, check.composed);
     auto findings = SaveCheckFindings(check.save, places);
     if (tracker) {
         const auto trackerFindings = TrackerFileFindings(check.tracker, places);
@@ -32,12 +39,13 @@ std::vector<FileFinding> FindingsOfRecord(const HeaderData& header, const Record
     return findings;
 }
 
-std::vector<FileFinding> CheckPartText(std::string bytes, const std::string& path, const CheckSetup& setup)
+std::vector<FileFinding> CheckPartText(const std::string& bytes, const std::string& path, const CheckSetup& setup)
 {
     std::ostringstream unheard;
     ConsoleDialogs dialogs(unheard);
     HeaderData header;
     ParseProgress silent;
-    OpenPartFileContent(header, path, std::move(bytes), dialogs, silent);
-    return FindingsOfRecord(header, CheckRecord(header, setup, dialogs), setup.categories != nullptr);
+    // The record's body takes the bytes it reads; the places are found in the text as given.
+    OpenPartFileContent(header, path, bytes, dialogs, silent);
+    return FindingsOfRecord(header, CheckRecord(header, setup, dialogs), bytes, setup.categories != nullptr);
 }

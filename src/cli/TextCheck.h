@@ -2,6 +2,7 @@
 #pragma once
 
 #include <string>
+#include <string_view>
 #include <vector>
 
 #include "FileFindings.h"
@@ -29,10 +30,15 @@ struct RecordCheck {
 // The checks of check on an open record; dialogs hears of an unusable LDConfig.ldr.
 RecordCheck CheckRecord(const HeaderData& header, const CheckSetup& setup, Dialogs& dialogs);
 
-// Every finding of check, save checks first, each on the line of the file it is about.
-std::vector<FileFinding> FindingsOfRecord(const HeaderData& header, const RecordCheck& check, bool tracker);
+// Whether the checks found anything to say (a finding of the Tracker's rules, a refusal, a missing
+// user name, a fix-up of the header's colour lines): only then are the file's bytes needed.
+bool HasFindings(const RecordCheck& check);
+
+// Every finding of check, save checks first, each at its place in fileBytes, the file as read.
+std::vector<FileFinding> FindingsOfRecord(const HeaderData& header, const RecordCheck& check,
+                                          std::string_view fileBytes, bool tracker);
 
 // check on a part's text held in memory, as if path held these bytes: the same reading as a file's
 // (an LF-only text is read as CR LF), the same checks, the same findings. Files near path (the
 // colour list) are read, nothing is written. Throws what reading the text throws (a binary text).
-std::vector<FileFinding> CheckPartText(std::string bytes, const std::string& path, const CheckSetup& setup);
+std::vector<FileFinding> CheckPartText(const std::string& bytes, const std::string& path, const CheckSetup& setup);

@@ -272,7 +272,7 @@ nlohmann::json LanguageServer::hover(const Document& document, TextPosition posi
 {
     std::string text = MetaLineHelp(lineText(document, position.line));
     for (const auto& finding : *currentFindings(document))
-        if (LineOfFinding(finding) == position.line) {
+        if (LineOfFinding(document, finding) == position.line) {
             if (!text.empty())
                 text += "\n\n";
             text += std::string(SeverityText(finding.severity)) + " " + finding.id + ": " + finding.message;

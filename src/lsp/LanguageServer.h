@@ -17,7 +17,7 @@
 struct ServerSetup {
     // The findings of check on a document's bytes, as if its path held them; throws when the
     // bytes cannot be read as a part (a binary text).
-    std::function<std::vector<FileFinding>(std::string bytes, const std::string& path)> check;
+    std::function<std::vector<FileFinding>(const std::string& bytes, const std::string& path)> check;
     CompletionLists lists;                     // historyStart is filled by the next
     std::function<std::string()> historyStart; // "YYYY-MM-DD [user] " of today
     std::chrono::milliseconds pause{150};      // after a change, before its check starts

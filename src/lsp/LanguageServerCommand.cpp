@@ -36,8 +36,8 @@ int RunLanguageServer(const LanguageServerOptions& options, std::ostream& err)
         return ExitStatus::Unreadable;
     lists.categories = CategoriesInForce(categories);
     const CheckSetup checks{options.limitDescription, &categories, colours.get()};
-    setup.check = [&checks](std::string bytes, const std::string& path) {
-        return CheckPartText(std::move(bytes), path, checks);
+    setup.check = [&checks](const std::string& bytes, const std::string& path) {
+        return CheckPartText(bytes, path, checks);
     };
     setup.historyStart = historyStart;
     setup.version = QUILLMARK_VERSION;

@@ -37,11 +37,25 @@ nlohmann::json LineRangeJson(const Document& document, std::size_t line, Positio
     return {{"start", PositionJson({line, 0})}, {"end", PositionJson(end)}};
 }
 
-std::size_t LineOfFinding(const FileFinding& finding) { return finding.line > 0 ? finding.line - 1 : 0; }
+std::size_t LineOfFinding(const Document& document, const FileFinding& finding)
+{
+    const auto& place = finding.place;
+    return place.wholeFile ? 0 : document.lines().positionOf(document.text, place.begin, PositionEncoding::Utf8).line;
+}
+
+nlohmann::json FindingRangeJson(const Document& document, const FileFinding& finding, PositionEncoding encoding)
+{
+    const auto& place = finding.place;
+    if (place.wholeFile || place.begin >= place.end)
+        return LineRangeJson(document, LineOfFinding(document, finding), encoding);
+    const auto& lines = document.lines();
+    return {{"start", PositionJson(lines.positionOf(document.text, place.begin, encoding))},
+            {"end", PositionJson(lines.positionOf(document.text, place.end, encoding))}};
+}
 
 nlohmann::json DiagnosticJson(const Document& document, const FileFinding& finding, PositionEncoding encoding)
 {
-    return {{"range", LineRangeJson(document, LineOfFinding(finding), encoding)},
+    return {{"range", FindingRangeJson(document, finding, encoding)},
             {"severity", severityNumber(finding.severity)},
             {"code", finding.id},
             {"source", "quillmark"},

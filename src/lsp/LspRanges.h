@@ -16,9 +16,13 @@ std::optional<TextPosition> PositionFromJson(const nlohmann::json& json);
 // The range of a whole line's content (without its line end).
 nlohmann::json LineRangeJson(const Document& document, std::size_t line, PositionEncoding encoding);
 
-// The diagnostic of a finding of the document: the range of the line it is about (the first
-// line for one about the file as a whole), its id as code, its severity, source "quillmark".
+// The range of a finding in the document: the bytes it is about (the number, the word, the value),
+// else the whole line; the first line for a finding about the file as a whole.
+nlohmann::json FindingRangeJson(const Document& document, const FileFinding& finding, PositionEncoding encoding);
+
+// The diagnostic of a finding of the document: its range, its id as code, its severity, source
+// "quillmark".
 nlohmann::json DiagnosticJson(const Document& document, const FileFinding& finding, PositionEncoding encoding);
 
-// The protocol's line (from 0) of a finding.
-std::size_t LineOfFinding(const FileFinding& finding);
+// The protocol's line (from 0) a finding starts on.
+std::size_t LineOfFinding(const Document& document, const FileFinding& finding);

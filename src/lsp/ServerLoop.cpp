@@ -64,12 +64,12 @@ void readMessages(int in, int stop, Events& events)
     }
 }
 
-CheckedVersion checkOf(const ServerSetup& setup, std::string uri, long long version, std::string text,
+CheckedVersion checkOf(const ServerSetup& setup, std::string uri, long long version, const std::string& text,
                        const std::string& path)
 {
     CheckedVersion result{std::move(uri), version, {}, {}};
     try {
-        result.findings = setup.check(std::move(text), path);
+        result.findings = setup.check(text, path);
     } catch (const std::exception& failure) {
         result.failure = std::string("The text cannot be checked: ") + failure.what();
     }
