@@ -6,7 +6,7 @@ QUILLMARK_ROOT="$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd)"
 
 # The packages every build needs; scripts add their own.
 QUILLMARK_PACKAGES=(cmake ninja-build g++ qt6-base-dev libcli11-dev nlohmann-json3-dev libgtest-dev libgmock-dev
-                    libgl-dev fonts-dejavu-core desktop-file-utils libxml2-utils appstream clang-format neovim
+                    libgl-dev fonts-dejavu-core desktop-file-utils libxml2-utils appstream clang-format
                     shared-mime-info libglib2.0-bin xdg-utils weston qt6-wayland xvfb x11-utils)
 
 # A package counts as present once installed, also while its triggers still wait to run.
