@@ -20,10 +20,25 @@ using Finding = std::tuple<std::size_t, int, std::string, std::string>;
 
 int severityNumber(const std::string& level) { return level == "error" ? 1 : level == "warning" ? 2 : 3; }
 
+// The protocol's line (from 1 here), which a lone CR ends too, of the line check names (a line
+// ends at LF there).
+std::size_t protocolLine(const std::string& bytes, std::size_t checkLine)
+{
+    std::size_t line = 1;
+    for (std::size_t at = 0, lineFeeds = 1; at < bytes.size() && lineFeeds < checkLine; ++at) {
+        const bool lineFeed = bytes[at] == '\n';
+        const bool loneReturn = bytes[at] == '\r' && (at + 1 == bytes.size() || bytes[at + 1] != '\n');
+        lineFeeds += lineFeed ? 1 : 0;
+        line += lineFeed || loneReturn ? 1 : 0;
+    }
+    return line;
+}
+
 // What check --tracker prints for the file, one finding per line: "path:line: level id: message",
 // or "path: level id: message" for the file as a whole (which the server shows on the first line).
 std::multiset<Finding> checkFindings(const std::string& path)
 {
+    const auto bytes = ReadBytes(path);
     const auto run = RunCliWith({"check", "--tracker", "--quiet", path});
     std::multiset<Finding> findings;
     std::istringstream lines(run.out);
@@ -35,7 +50,7 @@ std::multiset<Finding> checkFindings(const std::string& path)
         std::size_t number = 1;
         if (rest.front() != ' ') {
             const auto colon = rest.find(':');
-            number = std::stoul(rest.substr(0, colon));
+            number = protocolLine(bytes, std::stoul(rest.substr(0, colon)));
             rest.erase(0, colon + 1);
         }
         const auto level = rest.substr(1, rest.find(' ', 1) - 1);
@@ -136,24 +151,33 @@ TEST(LspProtocol, PublishesCheckTrackersFindingsOfCorpusParts)
     const TempDir folder;
     LspClient client;
     client.initialize();
-    // Every 97th part: LF and CR LF files, parts, subparts and primitives, with and without findings.
+    // Every 97th part: LF and CR LF files, parts, subparts and primitives, with and without
+    // findings; and the one with a lone CR.
+    std::vector<std::filesystem::path> sample;
+    for (std::size_t k = 0; k < parts.size(); k += 97)
+        sample.push_back(parts[k]);
+    for (const auto& part : parts)
+        if (part.filename() == "970phba.dat")
+            sample.push_back(part);
     std::size_t compared = 0, withFindings = 0;
-    for (std::size_t k = 0; k < parts.size(); k += 97) {
+    std::set<std::string> written;
+    for (const auto& part : sample) {
         // An editor reads a file in ISO-8859-1 as such, and hands the server its text in UTF-8.
-        auto bytes = ReadBytes(parts[k].string());
+        auto bytes = ReadBytes(part.string());
         if (!IsValidUtf8(bytes))
             bytes = Latin1ToUtf8(bytes);
-        const auto path = folder.write(parts[k].filename().string(), bytes);
+        const auto path = folder.write(part.filename().string(), bytes);
+        written.insert(part.filename().string());
         const auto expected = checkFindings(path);
         client.open(UriOf(path), ReadBytes(path));
-        EXPECT_EQ(serverFindings(client.diagnosticsOf(UriOf(path))), expected) << parts[k];
+        EXPECT_EQ(serverFindings(client.diagnosticsOf(UriOf(path))), expected) << part;
         ++compared;
         withFindings += expected.empty() ? 0 : 1;
     }
     EXPECT_GT(withFindings, 3u);
     EXPECT_GT(compared, 10u);
     // Nothing is written beside the documents.
-    EXPECT_EQ(NamesIn(folder.path()).size(), compared);
+    EXPECT_EQ(NamesIn(folder.path()), written);
 }
 
 TEST(LspProtocol, FollowsIncrementalAndFullChanges)
@@ -199,6 +223,27 @@ TEST(LspProtocol, FollowsIncrementalAndFullChanges)
                   {{"textDocument", {{"uri", uri}, {"version", 3}}}, {"contentChanges", {{{"text", SmallPart}}}}});
     TempDir::writeTo(path, SmallPart);
     EXPECT_EQ(serverFindings(client.diagnosticsOf(uri)), checkFindings(path));
+}
+
+TEST(LspProtocol, PublishesOnlyTheNewestVersionOnTheFindingsWord)
+{
+    const TempDir folder;
+    const auto uri = UriOf(folder.file("3004.dat"));
+    LspClient client;
+    client.initialize();
+    client.open(uri, "0 x\r\n");
+    // Typed before the pause ends: the first version's check is replaced by the second's.
+    client.notify("textDocument/didChange",
+                  {{"textDocument", {{"uri", uri}, {"version", 2}}}, {"contentChanges", {{{"text", SmallPart}}}}});
+    const auto published = client.nextWhere(
+        [](const Json& message) { return message.value("method", "") == "textDocument/publishDiagnostics"; });
+    EXPECT_EQ(published["params"]["version"], 2);
+    // The licence finding covers the licence's text, not its line.
+    const auto& diagnostics = published["params"]["diagnostics"];
+    const auto licence = std::find_if(diagnostics.begin(), diagnostics.end(),
+                                      [](const Json& diagnostic) { return diagnostic["code"] == "license.approved"; });
+    ASSERT_NE(licence, diagnostics.end());
+    EXPECT_EQ((*licence)["range"], Json({{"start", at(4, 11)}, {"end", at(4, 68)}}));
 }
 
 TEST(LspProtocol, AnswersBrokenMessagesAndGoesOn)
