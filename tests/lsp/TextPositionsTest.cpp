@@ -1,6 +1,9 @@
 // SPDX-License-Identifier: MIT
 #include <gtest/gtest.h>
 
+#include <mutex>
+
+#include "CheckQueue.h"
 #include "Completion.h"
 #include "Documents.h"
 #include "TextPositions.h"
@@ -64,6 +67,10 @@ TEST(TextPositions, ChangesEditTheTextInTheirOrder)
     EXPECT_EQ(document->text, "0 the one\r\n0 2\r\n0 three\r\n");
     EXPECT_EQ(document->version, 2);
     EXPECT_EQ(document->lines().lineCount(), 4u);
+    // Both ends of a range count UTF-16 units: the character of two units goes whole.
+    documents.open("file:///p/c.dat", "0 \xF0\x9F\x98\x80 one\r\n", 1);
+    ASSERT_TRUE(documents.change("file:///p/c.dat", 2, {{range(0, 2, 0, 4), ""}}, PositionEncoding::Utf16));
+    EXPECT_EQ(documents.find("file:///p/c.dat")->text, "0  one\r\n");
     EXPECT_FALSE(documents.change("file:///p/b.dat", 2, {{std::nullopt, ""}}, PositionEncoding::Utf16));
     ASSERT_TRUE(documents.change("file:///p/a.dat", 3, {{std::nullopt, "0 new"}}, PositionEncoding::Utf16));
     EXPECT_EQ(document->text, "0 new");
@@ -80,4 +87,30 @@ TEST(LspCompletion, OffersCategoriesInForceOnly)
 {
     EXPECT_EQ(CategoriesInForce({"<none>", "Brick", "Minifig", "Minifig Arm", "Lever", "Plate"}),
               (StringList{"Brick", "Minifig Arm", "Plate"}));
+}
+
+TEST(LspChecks, ANewerVersionReplacesTheCheckThatWaits)
+{
+    std::mutex mutex;
+    std::vector<std::string> ran;
+    std::condition_variable done;
+    {
+        CheckQueue checks(std::chrono::milliseconds(100));
+        const auto job = [&](const std::string& uri, long long version) {
+            return CheckQueue::Job{uri, version, [&, uri, version] {
+                                       const std::lock_guard lock(mutex);
+                                       ran.push_back(uri + " " + std::to_string(version));
+                                       done.notify_all();
+                                   }};
+        };
+        checks.schedule(job("a", 1));
+        checks.schedule(job("b", 1));
+        checks.schedule(job("a", 2));
+        checks.schedule(job("c", 1));
+        checks.forget("c");
+        std::unique_lock lock(mutex);
+        ASSERT_TRUE(done.wait_for(lock, std::chrono::seconds(30),
+                                  [&] { return std::find(ran.begin(), ran.end(), "a 2") != ran.end(); }));
+    }
+    EXPECT_EQ(ran, (std::vector<std::string>{"b 1", "a 2"}));
 }
