@@ -250,85 +250,177 @@ int RunSave(const std::vector<std::string>& arguments, const SaveOptions& option
     return RunEdit(arguments, options, {}, batch, out, err);
 }
 
+namespace {
+
+// What the commands that write share over one run: the answers to a save's questions, the clock,
+// the locks and sweeps of the files, the memory held and the files diffed.
+struct WritingRun {
+    explicit WritingRun(const SaveOptions& options, const BatchOptions& batch)
+        : answer([&options](const MessageBox& box) {
+              // Another program's changes since the file was read are never overwritten from here.
+              if (box.title == ChangedOnDiskTitle)
+                  return Answer::No;
+              const bool userNameQuestion = box.title == MissingUserNameTitle;
+              return (userNameQuestion ? options.allowMissingUserName : options.fix) ? Answer::Yes : Answer::No;
+          })
+    {
+        run.sweeps = &sweeps;
+        run.lockWait.interrupted = InterruptPending;
+        if (!batch.quiet)
+            run.lockWait.waiting = [](const std::string& path) {
+                // Said at once, not when the file's turn in the output comes: the run may wait long.
+                const auto line = "quillmark-cli: waiting for " + ShownText(path) + ": another program holds it\n";
+                [[maybe_unused]] const auto written = ::write(STDERR_FILENO, line.data(), line.size());
+            };
+    }
+    WritingRun(const WritingRun&) = delete;
+
+    ConsoleDialogs::Answerer answer;
+    const SystemClock clock;
+    FileLocks locks;
+    FolderSweeps sweeps;
+    ReplaceOptions run;
+    const Writing writing{run, locks};
+    MemoryClaims memory;
+    DiffedFiles diffed;
+};
+
+using FileHandler = std::function<void(HeaderData&, ConsoleDialogs&, FileReport&)>;
+
+// Runs handle on each file, which it may write unless writes is off; the header edits asked for
+// are made first, and a file they refuse is skipped.
+int runWriting(const std::vector<std::string>& arguments, WritingRun& writing, bool writes, const EditOptions& edit,
+               const BatchOptions& batch, std::ostream& out, std::ostream& err, const FileHandler& handle)
+{
+    return runBatch(arguments, batch, out, err, [&](const PartFileEntry& entry) {
+        return reportOn(entry, batch.quiet, writing.answer, writes ? &writing.writing : nullptr, writing.memory,
+                        [&](HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
+                            if (const auto refusal = ApplyHeaderEdits(header, edit.edits, writing.clock.now())) {
+                                report.saving = FileReport::Saving::Skipped;
+                                report.status = ExitStatus::Refused;
+                                // A dry run prints a diff and only a diff on standard output.
+                                (edit.dryRun ? report.err : report.out) =
+                                    "skipped " + ShownText(entry.path) + ": " + *refusal + '\n';
+                                return;
+                            }
+                            handle(header, dialogs, report);
+                        });
+    });
+}
+
+} // namespace
+
 int RunEdit(const std::vector<std::string>& arguments, const SaveOptions& options, EditOptions edit,
             const BatchOptions& batch, std::ostream& out, std::ostream& err)
 {
     if (!EditsValid(edit.edits, err))
         return ExitStatus::Usage;
-    const auto answer = [&options](const MessageBox& box) {
-        // Another program's changes since the file was read are never overwritten from here.
-        if (box.title == ChangedOnDiskTitle)
-            return Answer::No;
-        const bool userNameQuestion = box.title == MissingUserNameTitle;
-        return (userNameQuestion ? options.allowMissingUserName : options.fix) ? Answer::Yes : Answer::No;
-    };
-    const SystemClock clock;
-    FileLocks locks;
-    FolderSweeps sweeps;
-    ReplaceOptions run;
-    run.sweeps = &sweeps;
-    run.lockWait.interrupted = InterruptPending;
-    if (!batch.quiet)
-        run.lockWait.waiting = [](const std::string& path) {
-            // Said at once, not when the file's turn in the output comes: the run may wait long.
-            const auto line = "quillmark-cli: waiting for " + ShownText(path) + ": another program holds it\n";
-            [[maybe_unused]] const auto written = ::write(STDERR_FILENO, line.data(), line.size());
-        };
-    const Writing writing{run, locks};
-    MemoryClaims memory;
-    DiffedFiles diffed;
+    WritingRun writing(options, batch);
     // A dry run and a JSON listing write nothing.
     const bool writes = !edit.dryRun && !edit.json;
-    return runBatch(arguments, batch, out, err, [&](const PartFileEntry& entry) {
-        const auto& path = entry.path;
-        return reportOn(entry, batch.quiet, answer, writes ? &writing : nullptr, memory,
-                        [&](HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
-                            // A dry run prints a diff and only a diff on standard output.
-                            auto& said = edit.dryRun ? report.err : report.out;
-                            if (const auto refusal = ApplyHeaderEdits(header, edit.edits, clock.now())) {
-                                report.saving = FileReport::Saving::Skipped;
-                                report.status = ExitStatus::Refused;
-                                said = "skipped " + ShownText(path) + ": " + *refusal + '\n';
-                                return;
-                            }
-                            const auto notes = edit.afterEdits ? edit.afterEdits(header) : std::vector<std::string>{};
-                            if (edit.json) {
-                                const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
-                                auto json = CheckJson(header, findings, nullptr);
-                                json["old_header"] = HeaderTextForJson(header.OldHeader, header.Encoding);
-                                json["new_header"] = HeaderTextForJson(ComposeHeader(header), header.Encoding);
-                                if (edit.afterEdits) {
-                                    auto& notesJson = json["notes"] = nlohmann::ordered_json::array();
-                                    for (const auto& note : notes)
-                                        notesJson.push_back(HeaderTextForJson(note, header.Encoding));
-                                }
-                                report.out = json.dump() + '\n';
-                                noteFindings(report, findings);
-                                report.status = findings.refusals.empty() ? ExitStatus::Ok : ExitStatus::Refused;
-                                return;
-                            }
-                            // Nothing a save writes or says comes from the old header: its memory goes back before
-                            // the new header is composed, so that a header of millions of lines is not held thrice.
-                            header.OldHeader.clear();
-                            header.OldHeader.shrink_to_fit();
-                            const SaveContext context{.dialogs = dialogs,
-                                                      .clock = clock,
-                                                      .makeBackup = options.backup,
-                                                      .newHeader = [&header] { return ComposeHeader(header); },
-                                                      .recompose = [] {},
-                                                      .limitDescription = batch.limitDescription,
-                                                      .skipUnchanged = true,
-                                                      .dryRun = edit.dryRun,
-                                                      .run = run};
-                            const auto result = CheckHeaderAndSave(header, context);
-                            const auto line = savedLine(header.FilePath, options, result, dialogs, report);
-                            said += noteLines(path, notes);
-                            if (edit.dryRun &&
-                                (result.outcome == SaveOutcome::NotWritten || result.outcome == SaveOutcome::Unchanged))
-                                report.out = DryRunDiff(path, FileBytes(*header.Part).view(),
-                                                        SavedText(header, ComposeHeader(header)), diffed, report.err);
-                            else
-                                said += line;
-                        });
-    });
+    return runWriting(
+        arguments, writing, writes, edit, batch, out, err,
+        [&](HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
+            const auto& path = header.FilePath;
+            // A dry run prints a diff and only a diff on standard output.
+            auto& said = edit.dryRun ? report.err : report.out;
+            const auto notes = edit.afterEdits ? edit.afterEdits(header) : std::vector<std::string>{};
+            if (edit.json) {
+                const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
+                auto json = CheckJson(header, findings, nullptr);
+                json["old_header"] = HeaderTextForJson(header.OldHeader, header.Encoding);
+                json["new_header"] = HeaderTextForJson(ComposeHeader(header), header.Encoding);
+                if (edit.afterEdits) {
+                    auto& notesJson = json["notes"] = nlohmann::ordered_json::array();
+                    for (const auto& note : notes)
+                        notesJson.push_back(HeaderTextForJson(note, header.Encoding));
+                }
+                report.out = json.dump() + '\n';
+                noteFindings(report, findings);
+                report.status = findings.refusals.empty() ? ExitStatus::Ok : ExitStatus::Refused;
+                return;
+            }
+            // Nothing a save writes or says comes from the old header: its memory goes back before
+            // the new header is composed, so that a header of millions of lines is not held thrice.
+            header.OldHeader.clear();
+            header.OldHeader.shrink_to_fit();
+            const SaveContext context{.dialogs = dialogs,
+                                      .clock = writing.clock,
+                                      .makeBackup = options.backup,
+                                      .newHeader = [&header] { return ComposeHeader(header); },
+                                      .recompose = [] {},
+                                      .limitDescription = batch.limitDescription,
+                                      .skipUnchanged = true,
+                                      .dryRun = edit.dryRun,
+                                      .run = writing.run};
+            const auto result = CheckHeaderAndSave(header, context);
+            const auto line = savedLine(header.FilePath, options, result, dialogs, report);
+            said += noteLines(path, notes);
+            if (edit.dryRun && (result.outcome == SaveOutcome::NotWritten || result.outcome == SaveOutcome::Unchanged))
+                report.out = DryRunDiff(path, FileBytes(*header.Part).view(), SavedText(header, ComposeHeader(header)),
+                                        writing.diffed, report.err);
+            else
+                said += line;
+        });
+}
+
+int RunRepair(const std::vector<std::string>& arguments, const SaveOptions& options, const EditOptions& edit,
+              const BatchOptions& batch, std::ostream& out, std::ostream& err, const Repairer& repair)
+{
+    if (!EditsValid(edit.edits, err))
+        return ExitStatus::Usage;
+    WritingRun writing(options, batch);
+    const bool writes = !edit.dryRun && !edit.json;
+    return runWriting(
+        arguments, writing, writes, {.edits = {}, .dryRun = edit.dryRun, .json = edit.json, .afterEdits = {}}, batch,
+        out, err, [&](HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
+            const auto& path = header.FilePath;
+            auto& said = edit.dryRun ? report.err : report.out;
+            // The record as read, without the body, which no header edit changes.
+            auto body = std::move(header.Body);
+            const HeaderData read = header;
+            header.Body = std::move(body);
+            if (const auto refusal = ApplyHeaderEdits(header, edit.edits, writing.clock.now())) {
+                report.saving = FileReport::Saving::Skipped;
+                report.status = ExitStatus::Refused;
+                said = "skipped " + ShownText(path) + ": " + *refusal + '\n';
+                return;
+            }
+            const auto bytes = FileBytes(*header.Part).takeBytes();
+            const auto repaired = repair(bytes, read, header);
+            if (!repaired.left.empty()) {
+                report.saving = FileReport::Saving::Skipped;
+                report.status = ExitStatus::Refused;
+                said = "left " + ShownText(path) + ": " + OneLine(repaired.left) + '\n';
+                return;
+            }
+            const auto after = ApplyEdits(bytes, repaired.edits);
+            if (edit.json) {
+                nlohmann::ordered_json json;
+                json["FilePath"] = TextForJson(path);
+                auto& edits = json["edits"] = nlohmann::ordered_json::array();
+                for (const auto& change : repaired.edits)
+                    edits.push_back({{"begin", change.begin},
+                                     {"end", change.end},
+                                     {"replacement", HeaderTextForJson(change.replacement, header.Encoding)}});
+                auto& notes = json["notes"] = nlohmann::ordered_json::array();
+                for (const auto& note : repaired.notes)
+                    notes.push_back(HeaderTextForJson(note, header.Encoding));
+                report.out = json.dump() + '\n';
+                return;
+            }
+            said += noteLines(path, repaired.notes);
+            if (after == bytes) {
+                report.saving = FileReport::Saving::Unchanged;
+                said += "unchanged " + ShownText(path) + '\n';
+            } else if (edit.dryRun) {
+                report.saving = FileReport::Saving::Previewed;
+                report.out = DryRunDiff(path, bytes, after, writing.diffed, report.err);
+            } else {
+                const auto result = FileSaveText(header, after, options.backup, writing.clock, dialogs, writing.run);
+                said += savedLine(path, options,
+                                  {result.saved ? SaveOutcome::Saved : SaveOutcome::Failed, result.backupPath}, dialogs,
+                                  report);
+            }
+        });
 }

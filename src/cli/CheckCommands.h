@@ -6,6 +6,7 @@
 #include <string>
 #include <vector>
 
+#include "FileRepairs.h"
 #include "FindingLines.h"
 #include "HeaderEdits.h"
 
@@ -49,3 +50,17 @@ struct EditOptions {
 // list, or an added history line without a user, are refused before any file is read.
 int RunEdit(const std::vector<std::string>& arguments, const SaveOptions& options, EditOptions edit,
             const BatchOptions& batch, std::ostream& out, std::ostream& err);
+
+// What a repair makes of one file: the edits of its bytes as read, what its log says, and why it is
+// left as it is (empty: it is not).
+struct FileEdits {
+    std::vector<TextEdit> edits;
+    std::vector<std::string> notes;
+    std::string left;
+};
+using Repairer = std::function<FileEdits(std::string_view bytes, const HeaderData& read, const HeaderData& edited)>;
+
+// fix as edits: each file's bytes with the edits repair gives (after the header edits asked for on
+// the record), written through the same safe save as edit's, or shown as a diff (dry run) or as JSON.
+int RunRepair(const std::vector<std::string>& arguments, const SaveOptions& options, const EditOptions& edit,
+              const BatchOptions& batch, std::ostream& out, std::ostream& err, const Repairer& repair);

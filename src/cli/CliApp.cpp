@@ -73,8 +73,11 @@ public:
             return RunEdit(files_, saveOptions_, editOptions(), batch_, out, err);
         if (lsp_ != nullptr && *lsp_)
             return languageServer_(checkOptions_.ldconfig, !noLengthLimit_);
-        if (*fix_)
-            return RunFix(files_, only_, saveOptions_, editOptions(), batch_, out, err);
+        if (*fix_) {
+            auto options = saveOptions_;
+            options.backup = fixOptions_.recompose ? !noBackup_ : backup_;
+            return RunFix(files_, fixOptions_, options, editOptions(), batch_, out, err);
+        }
         return RunPrint(printFile_, dialogs, out, err);
     }
 
@@ -202,14 +205,22 @@ private:
         AddEditOptions(*edit_, editOptions_, noCategory_);
         addSaveOptions(edit_);
         fix_ = app_.add_subcommand(
-            "fix", "Repair in each FILE, or each part file below a FOLDER, the Parts Tracker's findings that have one "
-                   "correct repair (licence, Name: folder, description numbers, \"Pattern\", retired category, "
-                   "decimals and zeros of numbers), after edit's changes, and save as edit does. Per file, each "
-                   "repair done is named with its count, and each finding left with why. Exit statuses as for edit.");
-        fix_->add_option("--only", only_,
+            "fix",
+            "Repair in each FILE, or each part file below a FOLDER, the Parts Tracker's findings that have one "
+            "correct repair (licence, Name: folder, description numbers, \"Pattern\", retired category, "
+            "decimals and zeros of numbers), after edit's changes. Each repair edits the file as it stands: line "
+            "ends, blanks and every line without a repaired finding stay byte for byte, and the file is "
+            "written through the same safe save as edit's, without a backup unless --backup. Per file, each "
+            "repair is named with the lines it changed, and each finding left with why. Exit statuses as for "
+            "edit.");
+        fix_->add_option("--only", fixOptions_.only,
                          "Run only these repairs, by the Tracker's ids (a,b); "
                          "line.invalidcoloredlines runs only when named here")
             ->delimiter(',');
+        fix_->add_flag("--recompose", fixOptions_.recompose,
+                       "Repair the header's record and save the header composed anew, after the save checks, as edit "
+                       "saves (with its backup, --no-backup, --fix and --allow-missing-username)");
+        fix_->add_flag("--backup", backup_, "Keep the old file under a dated backup name (without --recompose)");
         AddEditOptions(*fix_, editOptions_, noCategory_);
         addSaveOptions(fix_);
     }
@@ -228,13 +239,14 @@ private:
     CLI::App *fields_ = nullptr, *check_ = nullptr, *save_ = nullptr, *edit_ = nullptr, *fix_ = nullptr,
              *lsp_ = nullptr;
     LanguageServerStart languageServer_;
-    std::vector<std::string> files_, only_;
+    std::vector<std::string> files_;
     std::string printFile_;
     BatchOptions batch_;
-    bool noLengthLimit_ = false, noBackup_ = false, noCategory_ = false;
+    bool noLengthLimit_ = false, noBackup_ = false, noCategory_ = false, backup_ = false;
     CheckOptions checkOptions_;
     SaveOptions saveOptions_;
     EditOptions editOptions_;
+    FixOptions fixOptions_;
 };
 
 } // namespace

@@ -8,8 +8,10 @@
 #include "Batch.h"
 #include "CliFiles.h"
 #include "Clock.h"
+#include "ClosestWord.h"
 #include "ColourSource.h"
 #include "ConsoleDialogs.h"
+#include "FileRepairs.h"
 #include "ListFolder.h"
 #include "QmError.h"
 #include "TrackerFixes.h"
@@ -25,9 +27,15 @@ std::optional<std::set<std::string>> chosenFixes(const std::vector<std::string>&
     for (const auto& id : only) {
         const auto& fixes = TrackerFixes();
         if (std::none_of(fixes.begin(), fixes.end(), [&id](const TrackerFix& fix) { return id == fix.id; })) {
-            err << "quillmark-cli: --only " << ShownText(id) << " is not one of:";
+            std::vector<std::string> ids;
             for (const auto& fix : fixes)
-                err << (&fix == &fixes.front() ? " " : ", ") << fix.id;
+                ids.emplace_back(fix.id);
+            err << "quillmark-cli: --only " << ShownText(id) << " is no repair's id";
+            if (const auto closest = ClosestWord(id, ids); !closest.empty())
+                err << "; did you mean " << closest << "?";
+            err << " The repairs are:";
+            for (const auto& known : ids)
+                err << (&known == &ids.front() ? " " : ", ") << known;
             err << '\n';
             return std::nullopt;
         }
@@ -48,12 +56,44 @@ std::vector<std::string> notesOf(const std::vector<FixDone>& done)
     return notes;
 }
 
+// "line 5", "lines 5, 9", "lines 40–88".
+std::string linesText(const std::vector<std::size_t>& lines)
+{
+    if (lines.size() == 1)
+        return "line " + std::to_string(lines.front());
+    if (lines.size() == 2)
+        return "lines " + std::to_string(lines.front()) + ", " + std::to_string(lines.back());
+    return "lines " + std::to_string(lines.front()) + "\u2013" + std::to_string(lines.back());
+}
+
+// The log of a file's repairs: each one that changed a line, with where, and each finding left.
+std::vector<std::string> repairNotes(const std::vector<FileRepair>& repairs)
+{
+    std::vector<std::string> notes;
+    for (const auto& repair : repairs) {
+        if (!repair.lines.empty()) {
+            const auto where = linesText(repair.lines);
+            if (repair.id.empty())
+                notes.push_back("edited the header (" + where + ")");
+            else if (repair.numbers > 0)
+                notes.push_back("fixed " + repair.id + " (" + std::to_string(repair.numbers) +
+                                (repair.id == "line.invalidcoloredlines" ? " colour" : " number") +
+                                (repair.numbers == 1 ? "" : "s") + ", " + where + ")");
+            else
+                notes.push_back("fixed " + repair.id + " (" + where + ")");
+        }
+        for (const auto& why : repair.left)
+            notes.push_back("left " + repair.id + ": " + why);
+    }
+    return notes;
+}
+
 } // namespace
 
-int RunFix(const std::vector<std::string>& arguments, const std::vector<std::string>& only, const SaveOptions& options,
+int RunFix(const std::vector<std::string>& arguments, const FixOptions& fix, const SaveOptions& options,
            EditOptions edit, const BatchOptions& batch, std::ostream& out, std::ostream& err)
 {
-    const auto chosen = chosenFixes(only, err);
+    const auto chosen = chosenFixes(fix.only, err);
     if (!chosen)
         return ExitStatus::Usage;
     StringList categories;
@@ -69,6 +109,14 @@ int RunFix(const std::vector<std::string>& arguments, const std::vector<std::str
         return ExitStatus::Unreadable;
     }
     const FixContext context{{categories, batch.limitDescription, SystemClock().now()}, *colours};
-    edit.afterEdits = [&](HeaderData& header) { return notesOf(FixForTracker(header, *chosen, context)); };
-    return RunEdit(arguments, options, std::move(edit), batch, out, err);
+    if (fix.recompose) {
+        edit.afterEdits = [&](HeaderData& header) { return notesOf(FixForTracker(header, *chosen, context)); };
+        return RunEdit(arguments, options, std::move(edit), batch, out, err);
+    }
+    return RunRepair(
+        arguments, options, edit, batch, out, err,
+        [&](std::string_view bytes, const HeaderData& read, const HeaderData& edited) {
+            auto repaired = RepairsOf(bytes, read, edited, *chosen, context);
+            return FileEdits{std::move(repaired.edits), repairNotes(repaired.repairs), std::move(repaired.left)};
+        });
 }

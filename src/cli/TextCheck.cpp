@@ -39,6 +39,31 @@ std::vector<FileFinding> FindingsOfRecord(const HeaderData& header, const Record
     return findings;
 }
 
+namespace {
+
+HeaderData openText(const std::string& bytes, const std::string& path)
+{
+    std::ostringstream unheard;
+    ConsoleDialogs dialogs(unheard);
+    HeaderData header;
+    ParseProgress silent;
+    OpenPartFileContent(header, path, bytes, dialogs, silent);
+    return header;
+}
+
+} // namespace
+
+FileRepairs RepairPartText(const std::string& bytes, const std::string& path, const std::set<std::string>& chosen,
+                           const FixContext& context)
+{
+    auto header = openText(bytes, path);
+    // The record as read, without the body, as fix hands it over.
+    auto body = std::move(header.Body);
+    const HeaderData read = header;
+    header.Body = std::move(body);
+    return RepairsOf(bytes, read, header, chosen, context);
+}
+
 std::vector<FileFinding> CheckPartText(const std::string& bytes, const std::string& path, const CheckSetup& setup)
 {
     std::ostringstream unheard;

@@ -1,11 +1,13 @@
 // SPDX-License-Identifier: MIT
 #pragma once
 
+#include <set>
 #include <string>
 #include <string_view>
 #include <vector>
 
 #include "FileFindings.h"
+#include "FileRepairs.h"
 #include "HeaderData.h"
 #include "SaveChecks.h"
 #include "TrackerCheck.h"
@@ -42,3 +44,8 @@ std::vector<FileFinding> FindingsOfRecord(const HeaderData& header, const Record
 // (an LF-only text is read as CR LF), the same checks, the same findings. Files near path (the
 // colour list) are read, nothing is written. Throws what reading the text throws (a binary text).
 std::vector<FileFinding> CheckPartText(const std::string& bytes, const std::string& path, const CheckSetup& setup);
+
+// fix's repairs (those named in chosen) of a part's text held in memory: the edits fix would make
+// of a file with these bytes, without header edits.
+FileRepairs RepairPartText(const std::string& bytes, const std::string& path, const std::set<std::string>& chosen,
+                           const FixContext& context);

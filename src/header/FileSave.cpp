@@ -191,10 +191,9 @@ std::optional<MessageBox> boxFor(const QmError& error)
 
 // Writes the pieces over the part, or as a new file where the part is gone; asks before
 // overwriting another program's change. False when the user would not overwrite it.
-bool replaceAsked(HeaderData& header, const std::array<std::string_view, 4>& pieces, ReplaceOptions options,
+bool replaceAsked(HeaderData& header, std::initializer_list<std::string_view> text, ReplaceOptions options,
                   Dialogs& dialogs, FileSaveResult& result)
 {
-    const std::initializer_list<std::string_view> text{pieces[0], pieces[1], pieces[2], pieces[3]};
     const auto place = placeOf(header);
     auto part = header.Part ? header.Part : fileNamedNow(place);
     bool changed = header.ReadStamp && !(part && part->unchangedSince(*header.ReadStamp));
@@ -218,12 +217,10 @@ bool replaceAsked(HeaderData& header, const std::array<std::string_view, 4>& pie
     }
 }
 
-} // namespace
-
-FileSaveResult FileSave(HeaderData& header, std::string newHeader, bool makeBackup, const Clock& clock,
-                        Dialogs& dialogs, const ReplaceOptions& run)
+// Writes text over the part as FileSave says; false when it was not written.
+bool saveText(HeaderData& header, std::initializer_list<std::string_view> text, bool makeBackup, const Clock& clock,
+              Dialogs& dialogs, const ReplaceOptions& run, FileSaveResult& result)
 {
-    FileSaveResult result;
     try {
         // The backup stands beside the file that is written, which is not the link's folder.
         const auto target = header.Part ? header.Part->path() : ResolveLinks(header.FilePath);
@@ -232,10 +229,9 @@ FileSaveResult FileSave(HeaderData& header, std::string newHeader, bool makeBack
         options.lockWait = run.lockWait;
         options.home = run.home;
         options.afterStep = run.afterStep;
-        if (!replaceAsked(header, SavedPieces(header, newHeader), options, dialogs, result))
-            return result;
+        if (!replaceAsked(header, text, options, dialogs, result))
+            return false;
         header.ReadStamp = header.Part ? std::optional(header.Part->stamp()) : std::nullopt;
-        header.HeaderAtOpenOrSave = std::move(newHeader);
         header.BodyChanged = false;
         header.FileChanged = false;
         result.saved = true;
@@ -245,5 +241,25 @@ FileSaveResult FileSave(HeaderData& header, std::string newHeader, bool makeBack
         else
             ReportError(dialogs, error, FileSaveProcedure);
     }
+    return result.saved;
+}
+
+} // namespace
+
+FileSaveResult FileSave(HeaderData& header, std::string newHeader, bool makeBackup, const Clock& clock,
+                        Dialogs& dialogs, const ReplaceOptions& run)
+{
+    FileSaveResult result;
+    const auto pieces = SavedPieces(header, newHeader);
+    if (saveText(header, {pieces[0], pieces[1], pieces[2], pieces[3]}, makeBackup, clock, dialogs, run, result))
+        header.HeaderAtOpenOrSave = std::move(newHeader);
+    return result;
+}
+
+FileSaveResult FileSaveText(HeaderData& header, std::string_view text, bool makeBackup, const Clock& clock,
+                            Dialogs& dialogs, const ReplaceOptions& run)
+{
+    FileSaveResult result;
+    saveText(header, {text}, makeBackup, clock, dialogs, run, result);
     return result;
 }

@@ -52,6 +52,11 @@ struct FileSaveResult {
 FileSaveResult FileSave(HeaderData& header, std::string newHeader, bool makeBackup, const Clock& clock,
                         Dialogs& dialogs, const ReplaceOptions& run = {});
 
+// Writes text, the file's own bytes edited, over the part read as FileSave writes a header; the
+// record's header is not kept as saved.
+FileSaveResult FileSaveText(HeaderData& header, std::string_view text, bool makeBackup, const Clock& clock,
+                            Dialogs& dialogs, const ReplaceOptions& run = {});
+
 enum class RestoreOutcome { NothingToDo, Restored, CopyKept };
 
 // Undoes what a save killed in the middle of rewriting the part in place left there, and says so:

@@ -1,6 +1,8 @@
 // SPDX-License-Identifier: MIT
 #include "LanguageServer.h"
 
+#include <algorithm>
+
 #include "HeaderHelp.h"
 #include "LspRanges.h"
 
@@ -14,6 +16,28 @@ constexpr int InvalidParams = -32602;
 constexpr int ServerNotInitialized = -32002;
 constexpr int RequestCancelled = -32800;
 } // namespace ErrorCode
+
+constexpr const char* FixAllKind = "source.fixAll.quillmark";
+
+// Whether the client asks for actions of that kind: all when it names none, else those of a kind
+// it names or below one ("source" holds "source.fixAll.quillmark").
+bool kindWanted(const nlohmann::json& context, std::string_view kind)
+{
+    if (!context.contains("only"))
+        return true;
+    for (const auto& wanted : context["only"]) {
+        const auto& name = wanted.get_ref<const std::string&>();
+        if (kind == name || (kind.starts_with(name) && kind[name.size()] == '.'))
+            return true;
+    }
+    return false;
+}
+
+bool isRepaired(const std::string& id)
+{
+    const auto& fixes = TrackerFixes();
+    return std::any_of(fixes.begin(), fixes.end(), [&id](const TrackerFix& fix) { return id == fix.id; });
+}
 
 // A request's id is a number or a string.
 bool isId(const nlohmann::json& id) { return id.is_number_integer() || id.is_string(); }
@@ -145,24 +169,25 @@ void LanguageServer::request(const Request& request)
 std::optional<nlohmann::json> LanguageServer::answer(const Request& request)
 {
     const bool hover = request.method == "textDocument/hover";
-    if (!hover && request.method != "textDocument/completion") {
+    const bool actions = request.method == "textDocument/codeAction";
+    if (!hover && !actions && request.method != "textDocument/completion") {
         fail(request.id, ErrorCode::MethodNotFound, "The server has no method " + request.method + ".");
         return std::nullopt;
     }
     const auto& uri = uriOf(request.params);
     const auto* document = documents_.find(uri);
-    const auto position = PositionFromJson(request.params.at("position"));
-    if (document == nullptr || !position) {
+    const auto position = actions ? std::optional<TextPosition>() : PositionFromJson(request.params.at("position"));
+    if (document == nullptr || (!actions && !position)) {
         fail(request.id, ErrorCode::InvalidParams, "No open document at that position.");
         return std::nullopt;
     }
-    if (!hover)
+    if (!hover && !actions)
         return completion(*document, *position);
     if (currentFindings(*document) == nullptr) {
         waiting_[uri].push_back(request); // answered when the check of this version is done
         return std::nullopt;
     }
-    return this->hover(*document, *position);
+    return hover ? this->hover(*document, *position) : codeActions(*document, request.params);
 }
 
 nlohmann::json LanguageServer::initialize(const nlohmann::json& params)
@@ -176,6 +201,7 @@ nlohmann::json LanguageServer::initialize(const nlohmann::json& params)
              {{"positionEncoding", utf8 ? "utf-8" : "utf-16"},
               {"textDocumentSync", {{"openClose", true}, {"change", 2}, {"save", {{"includeText", false}}}}},
               {"hoverProvider", true},
+              {"codeActionProvider", {{"codeActionKinds", {"quickfix", FixAllKind}}}},
               {"completionProvider", {{"triggerCharacters", {" "}}}}}},
             {"serverInfo", {{"name", "quillmark"}, {"version", setup_.version}}}};
 }
@@ -302,4 +328,59 @@ nlohmann::json LanguageServer::completion(const Document& document, TextPosition
              {"kind", 12}, // Value
              {"textEdit", {{"range", {{"start", PositionJson(from)}, {"end", PositionJson(to)}}}, {"newText", text}}}});
     return items;
+}
+
+nlohmann::json LanguageServer::repairAction(const Document& document, const std::set<std::string>& chosen,
+                                            const char* kind, const std::string& title) const
+{
+    FileRepairs repairs;
+    try {
+        repairs = setup_.repair(document.text, document.path, chosen);
+    } catch (const std::exception&) {
+        return nullptr; // a text that cannot be read has no repairs
+    }
+    if (!repairs.left.empty() || repairs.edits.empty())
+        return nullptr;
+    const auto& lines = document.lines();
+    auto edits = nlohmann::json::array();
+    for (const auto& edit : repairs.edits)
+        edits.push_back({{"range",
+                          {{"start", PositionJson(lines.positionOf(document.text, edit.begin, encoding_))},
+                           {"end", PositionJson(lines.positionOf(document.text, edit.end, encoding_))}}},
+                         {"newText", edit.replacement}});
+    return {{"title", title}, {"kind", kind}, {"edit", {{"changes", {{document.uri, edits}}}}}};
+}
+
+nlohmann::json LanguageServer::codeActions(const Document& document, const nlohmann::json& params) const
+{
+    const auto& range = params.at("range");
+    const auto from = PositionFromJson(range.at("start")), to = PositionFromJson(range.at("end"));
+    if (!from || !to)
+        throw std::invalid_argument("the range is not a range");
+    const auto context = params.value("context", nlohmann::json::object());
+    auto actions = nlohmann::json::array();
+    if (kindWanted(context, "quickfix")) {
+        std::set<std::string> offered;
+        for (const auto& finding : *currentFindings(document)) {
+            auto diagnostic = DiagnosticJson(document, finding, encoding_);
+            const auto start = *PositionFromJson(diagnostic["range"]["start"]);
+            const auto end = *PositionFromJson(diagnostic["range"]["end"]);
+            // The findings on the range's lines (a cursor asks for its line), each id's repair once.
+            if (to->line < start.line || end.line < from->line || !isRepaired(finding.id) ||
+                !offered.insert(finding.id).second)
+                continue;
+            auto action = repairAction(document, {finding.id}, "quickfix", "Repair " + finding.id + " as fix does");
+            if (action.is_null())
+                continue;
+            action["diagnostics"] = {std::move(diagnostic)};
+            action["isPreferred"] = true;
+            actions.push_back(std::move(action));
+        }
+    }
+    if (kindWanted(context, FixAllKind)) {
+        auto all = repairAction(document, DefaultFixIds(), FixAllKind, "Repair every finding fix repairs");
+        if (!all.is_null())
+            actions.push_back(std::move(all));
+    }
+    return actions;
 }

@@ -6,18 +6,23 @@
 #include <map>
 #include <nlohmann/json.hpp>
 #include <optional>
+#include <set>
 #include <string>
 #include <vector>
 
 #include "Completion.h"
 #include "Documents.h"
 #include "FileFindings.h"
+#include "FileRepairs.h"
 
 // What the server works with, given by the program that starts it.
 struct ServerSetup {
     // The findings of check on a document's bytes, as if its path held them; throws when the
     // bytes cannot be read as a part (a binary text).
     std::function<std::vector<FileFinding>(const std::string& bytes, const std::string& path)> check;
+    // fix's repairs (those named) of a document's bytes, as if its path held them; throws as check.
+    std::function<FileRepairs(const std::string& bytes, const std::string& path, const std::set<std::string>& chosen)>
+        repair;
     CompletionLists lists;                     // historyStart is filled by the next
     std::function<std::string()> historyStart; // "YYYY-MM-DD [user] " of today
     std::chrono::milliseconds pause{150};      // after a change, before its check starts
@@ -71,6 +76,10 @@ private:
     void closed(const nlohmann::json& params);
     nlohmann::json hover(const Document& document, TextPosition position) const;
     nlohmann::json completion(const Document& document, TextPosition position) const;
+    nlohmann::json codeActions(const Document& document, const nlohmann::json& params) const;
+    // The action that makes the repairs of the document; null when they change nothing.
+    nlohmann::json repairAction(const Document& document, const std::set<std::string>& chosen, const char* kind,
+                                const std::string& title) const;
     void cancel(const nlohmann::json& id);
     void publish(const Document& document);
     // The findings of the document as it stands; null until its check is done.

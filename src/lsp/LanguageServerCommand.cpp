@@ -9,6 +9,7 @@
 #include "ColourSource.h"
 #include "Dates.h"
 #include "EditCommandLine.h"
+#include "ListFolder.h"
 #include "ServerLoop.h"
 #include "TextCheck.h"
 
@@ -38,6 +39,12 @@ int RunLanguageServer(const LanguageServerOptions& options, std::ostream& err)
     const CheckSetup checks{options.limitDescription, &categories, colours.get()};
     setup.check = [&checks](const std::string& bytes, const std::string& path) {
         return CheckPartText(bytes, path, checks);
+    };
+    // The repairs do not depend on the colour codes, as for fix: the built-in list serves the checks around them.
+    const auto builtIn = ReadBuiltInColours(DataFileOfThisProgram(ProgramFolder(), BuiltInColoursFile));
+    setup.repair = [&](const std::string& bytes, const std::string& path, const std::set<std::string>& chosen) {
+        const FixContext context{{categories, options.limitDescription, SystemClock().now()}, builtIn};
+        return RepairPartText(bytes, path, chosen, context);
     };
     setup.historyStart = historyStart;
     setup.version = QUILLMARK_VERSION;

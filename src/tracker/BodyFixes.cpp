@@ -54,11 +54,14 @@ public:
     std::string_view collapsed() const { return collapsed_; }
     std::string_view colour() const { return word(first_ + 1); }
 
-    void rewriteNumbers(const std::function<std::string(std::string_view)>& rewrite)
+    // How many numbers the rewrite changed.
+    int rewriteNumbers(const std::function<std::string(std::string_view)>& rewrite)
     {
+        int changed = 0;
         for (std::size_t k = first_ + 2; k < first_ + 2 + numberCountOf(shape_.type); ++k)
             if (IsTrackerNumber(word(k)))
-                words_[k].replacement = rewrite(word(k));
+                changed += (words_[k].replacement = rewrite(word(k))) != word(k) ? 1 : 0;
+        return changed;
     }
     void setColour(std::string colour) { words_[first_ + 1].replacement = std::move(colour); }
 
@@ -155,7 +158,10 @@ std::optional<std::string> geometryMadeBy(const LineWords& before, const std::st
     return std::nullopt;
 }
 
-std::string lineNote(int number, const std::string& why) { return "line " + std::to_string(number) + ": " + why; }
+std::string lineNote(std::size_t number, const std::string& why)
+{
+    return "line " + std::to_string(number) + ": " + why;
+}
 
 // Why a finding outlives the rewrite of the line's numbers: it is about a word that is no number.
 std::string whyLeft(const LineWords& line, std::string_view word)
@@ -169,27 +175,45 @@ std::string whyLeft(const LineWords& line, std::string_view word)
 
 } // namespace
 
+std::optional<std::string> FixLineNumbers(std::string_view text, NumberFix fix, std::size_t number, FixNote& note)
+{
+    LineWords line;
+    if (!line.read(text) || offendingWord(line.collapsed(), fix).empty())
+        return std::nullopt;
+    const auto numbers = line.rewriteNumbers(rewriteOf(fix));
+    auto rewritten = line.text();
+    if (fix == NumberFix::DecimalPrecision)
+        if (const auto made = geometryMadeBy(line, rewritten)) {
+            note.left.push_back(lineNote(number, "rounding would make it " + *made));
+            return std::nullopt;
+        }
+    LineWords after;
+    after.read(rewritten);
+    if (const auto word = offendingWord(after.collapsed(), fix); !word.empty())
+        note.left.push_back(lineNote(number, whyLeft(after, word)));
+    else
+        ++note.fixed;
+    note.numbers += numbers;
+    return rewritten == text ? std::nullopt : std::optional(std::move(rewritten));
+}
+
+std::optional<std::string> FixLineColour(std::string_view text, FixNote& note)
+{
+    LineWords line;
+    if (!line.read(text) || (line.shape().type != 2 && line.shape().type != 5) ||
+        (!line.shape().directColour && line.shape().colour == 24))
+        return std::nullopt;
+    line.setColour("24");
+    ++note.fixed;
+    ++note.numbers;
+    return line.text();
+}
+
 FixNote FixNumbers(std::string& body, NumberFix fix, int firstLine)
 {
     FixNote note;
-    LineWords line;
-    forEachLine(body, firstLine, [&](std::string_view text, int number) -> std::optional<std::string> {
-        if (!line.read(text) || offendingWord(line.collapsed(), fix).empty())
-            return std::nullopt;
-        line.rewriteNumbers(rewriteOf(fix));
-        auto rewritten = line.text();
-        if (fix == NumberFix::DecimalPrecision)
-            if (const auto made = geometryMadeBy(line, rewritten)) {
-                note.left.push_back(lineNote(number, "rounding would make it " + *made));
-                return std::nullopt;
-            }
-        LineWords after;
-        after.read(rewritten);
-        if (const auto word = offendingWord(after.collapsed(), fix); !word.empty())
-            note.left.push_back(lineNote(number, whyLeft(after, word)));
-        else
-            ++note.fixed;
-        return rewritten == text ? std::nullopt : std::optional(std::move(rewritten));
+    forEachLine(body, firstLine, [&](std::string_view text, int number) {
+        return FixLineNumbers(text, fix, static_cast<std::size_t>(number), note);
     });
     return note;
 }
@@ -197,14 +221,6 @@ FixNote FixNumbers(std::string& body, NumberFix fix, int firstLine)
 FixNote FixLineColours(std::string& body, int firstLine)
 {
     FixNote note;
-    LineWords line;
-    forEachLine(body, firstLine, [&](std::string_view text, int) -> std::optional<std::string> {
-        if (!line.read(text) || (line.shape().type != 2 && line.shape().type != 5) ||
-            (!line.shape().directColour && line.shape().colour == 24))
-            return std::nullopt;
-        line.setColour("24");
-        ++note.fixed;
-        return line.text();
-    });
+    forEachLine(body, firstLine, [&](std::string_view text, int) { return FixLineColour(text, note); });
     return note;
 }

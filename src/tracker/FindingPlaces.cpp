@@ -3,6 +3,7 @@
 
 #include <algorithm>
 #include <array>
+#include <cstring>
 #include <tuple>
 
 #include "LineEnds.h"
@@ -107,6 +108,19 @@ std::string_view offendingNumber(std::string_view id, std::string_view text)
 
 } // namespace
 
+std::string HeaderLineKey(std::string_view line, bool first)
+{
+    if (first)
+        return {};
+    const auto keyword = Words(line).word(2);
+    return keyword.empty() ? "#" : plainKeyword(keyword);
+}
+
+std::string_view HeaderLineValue(std::string_view line, bool first)
+{
+    return TrimTrackerLine(Words(line).joinedFrom(first ? 2 : 3));
+}
+
 FindingPlaces::FindingPlaces(std::string_view fileBytes, const HeaderData& header, const std::string& composedHeader)
     : bytes_(fileBytes), header_(header), composed_(composedHeader)
 {
@@ -122,13 +136,24 @@ const std::vector<std::size_t>& FindingPlaces::readerStarts() const
     const std::size_t first = bytes_.starts_with(Utf8ByteOrderMark) ? Utf8ByteOrderMark.size() : 0;
     const bool lineFeedsEnd = IsUnixLineEnd(bytes_.substr(first));
     readerStarts_.push_back(first);
-    for (std::size_t i = first; i < bytes_.size(); ++i) {
-        if (bytes_[i] == '\n')
-            lineFeeds_.push_back(i);
-        if (bytes_[i] == '\r')
-            readerStarts_.push_back(i + 1 < bytes_.size() && bytes_[i + 1] == '\n' ? i + 2 : i + 1);
-        else if (bytes_[i] == '\n' && lineFeedsEnd && (i == 0 || bytes_[i - 1] != '\r'))
-            readerStarts_.push_back(i + 1);
+    // CRs and LFs are looked for with memchr: the bytes between them are most of a file.
+    const auto next = [this](char c, std::size_t from) {
+        const auto* found = from < bytes_.size()
+                                ? static_cast<const char*>(std::memchr(bytes_.data() + from, c, bytes_.size() - from))
+                                : nullptr;
+        return found != nullptr ? static_cast<std::size_t>(found - bytes_.data()) : bytes_.size();
+    };
+    auto cr = next('\r', first), lf = next('\n', first);
+    while (cr < bytes_.size() || lf < bytes_.size()) {
+        if (cr < lf) {
+            readerStarts_.push_back(lf == cr + 1 ? cr + 2 : cr + 1);
+            cr = next('\r', cr + 1);
+            continue;
+        }
+        lineFeeds_.push_back(lf);
+        if (lineFeedsEnd && (lf == 0 || bytes_[lf - 1] != '\r'))
+            readerStarts_.push_back(lf + 1);
+        lf = next('\n', lf + 1);
     }
     return readerStarts_;
 }
@@ -148,6 +173,12 @@ std::pair<std::size_t, std::size_t> FindingPlaces::readerLine(std::size_t reader
     return {begin, end};
 }
 
+std::size_t FindingPlaces::readerLineAt(std::size_t offset) const
+{
+    const auto& starts = readerStarts();
+    return static_cast<std::size_t>(std::upper_bound(starts.begin(), starts.end(), offset) - starts.begin());
+}
+
 FindingPlace FindingPlaces::at(std::size_t begin, std::size_t end) const
 {
     readerStarts();
@@ -164,7 +195,7 @@ std::size_t FindingPlaces::readerLineOfKeyword(std::string_view keyword) const
     CrLfLines lines(header_.OldHeader);
     std::string_view line;
     for (std::size_t index = 0; lines.next(line); ++index)
-        if (index > 0 && plainKeyword(Words(line).word(2)) == wanted)
+        if (index > 0 && HeaderLineKey(line, false) == wanted)
             return header_.OldHeaderLines.fileLineOf(index);
     return 0;
 }
@@ -175,7 +206,7 @@ FindingPlace FindingPlaces::valueOf(std::size_t readerLineNumber, std::string_vi
         return {};
     const auto [begin, end] = readerLine(readerLineNumber);
     const auto line = bytes_.substr(begin, end - begin);
-    const auto value = TrimTrackerLine(Words(line).joinedFrom(keyword.empty() ? 2 : 3));
+    const auto value = HeaderLineValue(line, keyword.empty());
     if (value.empty())
         return at(begin, end);
     const auto valueBegin = begin + static_cast<std::size_t>(value.data() - line.data());

@@ -24,6 +24,14 @@ struct FindingPlace {
     std::size_t end = 0;    // the word, the header line's value, or the whole line without its end
 };
 
+// The key of a header line: "" for the description's (the header's first line), else its keyword
+// as the parser takes it ("LICENSE" for "!LICENSE", "NAME:", "LDRAW_ORG" for "!LDRAW"); "#" for
+// a blank line.
+std::string HeaderLineKey(std::string_view line, bool first);
+// What follows a header line's keyword (the "0" of the description's line), without the blanks
+// around it; a view into line, empty when nothing follows.
+std::string_view HeaderLineValue(std::string_view line, bool first);
+
 // The places of one file's findings. The checks read the text a save would write, whose header is
 // composed anew; a header line is placed where the same line, or else the first line with its
 // keyword, stands in the file.
@@ -46,6 +54,8 @@ public:
     // The byte range [begin, end) of the line the parser counts as readerLine (from 1), without its
     // line end; begin == end == size for a line past the end.
     std::pair<std::size_t, std::size_t> readerLine(std::size_t readerLine) const;
+    // The line the parser counts (from 1) that holds the byte at offset.
+    std::size_t readerLineAt(std::size_t offset) const;
     // The place of bytes [begin, end) of the file.
     FindingPlace at(std::size_t begin, std::size_t end) const;
 

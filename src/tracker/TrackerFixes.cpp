@@ -28,6 +28,17 @@ void fixLineColours(HeaderData& header, const HeaderFixContext&, FixNote& note)
     header.BodyChanged = header.BodyChanged || note.fixed > 0;
 }
 
+template <NumberFix Fix>
+std::optional<std::string> numbersOfLine(std::string_view line, std::size_t number, FixNote& note)
+{
+    return FixLineNumbers(line, Fix, number, note);
+}
+
+std::optional<std::string> colourOfLine(std::string_view line, std::size_t, FixNote& note)
+{
+    return FixLineColour(line, note);
+}
+
 std::set<std::string> idsFound(const HeaderData& header, const FixContext& context)
 {
     std::set<std::string> ids;
@@ -62,11 +73,14 @@ const std::vector<TrackerFix>& TrackerFixes()
         {"warning.descriptionnumbers", true, true, FixDescriptionNumbers},
         {"description.patternword", true, true, FixPatternWord},
         {"warning.minifigcategory", true, true, FixRetiredCategory},
-        {"numbers.trailingzeros", true, false, fixNumbers<NumberFix::TrailingZeros>},
-        {"numbers.leadingzeros", true, false, fixNumbers<NumberFix::LeadingZeros>},
-        {"numbers.decimalprecision", true, false, fixNumbers<NumberFix::DecimalPrecision>},
+        {"numbers.trailingzeros", true, false, fixNumbers<NumberFix::TrailingZeros>,
+         numbersOfLine<NumberFix::TrailingZeros>},
+        {"numbers.leadingzeros", true, false, fixNumbers<NumberFix::LeadingZeros>,
+         numbersOfLine<NumberFix::LeadingZeros>},
+        {"numbers.decimalprecision", true, false, fixNumbers<NumberFix::DecimalPrecision>,
+         numbersOfLine<NumberFix::DecimalPrecision>},
         // Changes how the part looks, so only when asked for by name.
-        {"line.invalidcoloredlines", false, false, fixLineColours},
+        {"line.invalidcoloredlines", false, false, fixLineColours, colourOfLine},
     };
     return fixes;
 }
@@ -82,7 +96,13 @@ std::set<std::string> DefaultFixIds()
 
 std::vector<FixDone> FixForTracker(HeaderData& header, const std::set<std::string>& chosen, const FixContext& context)
 {
-    const auto before = idsFound(header, context);
+    return FixForTracker(header, chosen, context, idsFound(header, context), {});
+}
+
+std::vector<FixDone> FixForTracker(HeaderData& header, const std::set<std::string>& chosen, const FixContext& context,
+                                   const std::set<std::string>& before,
+                                   const std::function<void(const FixDone&, const HeaderData&)>& step)
+{
     std::vector<FixDone> done;
     for (const auto& fix : TrackerFixes()) {
         if (!chosen.contains(fix.id) || !before.contains(fix.id))
@@ -90,15 +110,17 @@ std::vector<FixDone> FixForTracker(HeaderData& header, const std::set<std::strin
         auto& [id, note] = done.emplace_back(FixDone{fix.id, {}});
         auto fields = fix.checkedAfter ? headerFields(header) : HeaderData{};
         fix.apply(header, context.header, note);
-        if (!fix.checkedAfter || note.fixed == 0)
-            continue;
-        const auto after = idsFound(header, context);
-        const auto brought =
-            std::find_if(after.begin(), after.end(), [&](const auto& a) { return !before.contains(a); });
-        if (brought != after.end()) {
-            restoreHeaderFields(header, std::move(fields));
-            note = {0, {"fixing it would bring " + *brought}};
+        if (fix.checkedAfter && note.fixed > 0) {
+            const auto after = idsFound(header, context);
+            const auto brought =
+                std::find_if(after.begin(), after.end(), [&](const auto& a) { return !before.contains(a); });
+            if (brought != after.end()) {
+                restoreHeaderFields(header, std::move(fields));
+                note = {0, 0, {"fixing it would bring " + *brought}};
+            }
         }
+        if (step)
+            step(done.back(), header);
     }
     return done;
 }

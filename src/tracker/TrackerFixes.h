@@ -1,8 +1,12 @@
 // SPDX-License-Identifier: MIT
 #pragma once
 
+#include <cstddef>
+#include <functional>
+#include <optional>
 #include <set>
 #include <string>
+#include <string_view>
 #include <vector>
 
 #include "ColourCodes.h"
@@ -19,6 +23,9 @@ struct TrackerFix {
     // change is undone when it brings a finding the file did not have.
     bool checkedAfter;
     void (*apply)(HeaderData& header, const HeaderFixContext& context, FixNote& note);
+    // The same for one line of the body, number being its line on disk, for the repairs that change
+    // body lines only (the others: null): the line rewritten, or nothing when it stays.
+    std::optional<std::string> (*repairLine)(std::string_view line, std::size_t number, FixNote& note) = nullptr;
 };
 
 const std::vector<TrackerFix>& TrackerFixes();
@@ -39,3 +46,9 @@ struct FixDone {
 // Runs the repairs named in chosen on the record, in the table's order; each repair that found its
 // finding tells what it did.
 std::vector<FixDone> FixForTracker(HeaderData& header, const std::set<std::string>& chosen, const FixContext& context);
+
+// The same, found being the ids of the findings the record has; step sees the record after each
+// repair that ran.
+std::vector<FixDone> FixForTracker(HeaderData& header, const std::set<std::string>& chosen, const FixContext& context,
+                                   const std::set<std::string>& found,
+                                   const std::function<void(const FixDone&, const HeaderData&)>& step);

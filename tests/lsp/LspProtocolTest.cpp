@@ -266,6 +266,98 @@ TEST(LspProtocol, CountsColumnsAsAgreed)
     }
 }
 
+namespace {
+
+// The text with a workspace edit of it made, for an ASCII text (where UTF-16 columns are bytes).
+std::string applied(std::string text, const Json& edit, const std::string& uri)
+{
+    std::vector<std::size_t> starts{0};
+    for (std::size_t at = 0; at < text.size(); ++at)
+        if (text[at] == '\n' || (text[at] == '\r' && (at + 1 == text.size() || text[at + 1] != '\n')))
+            starts.push_back(at + 1);
+    const auto offset = [&starts](const Json& position) {
+        return starts.at(position["line"].get<std::size_t>()) + position["character"].get<std::size_t>();
+    };
+    auto edits = edit["changes"][uri];
+    std::sort(edits.begin(), edits.end(),
+              [&](const Json& a, const Json& b) { return offset(a["range"]["start"]) > offset(b["range"]["start"]); });
+    for (const auto& change : edits) {
+        const auto from = offset(change["range"]["start"]);
+        text.replace(from, offset(change["range"]["end"]) - from, change["newText"].get<std::string>());
+    }
+    return text;
+}
+
+Json codeActions(LspClient& client, const std::string& uri, std::size_t fromLine, std::size_t toLine, Json only)
+{
+    Json context = {{"diagnostics", Json::array()}};
+    if (!only.is_null())
+        context["only"] = only;
+    return client.responseTo(
+        client.request("textDocument/codeAction", {{"textDocument", textDocument(uri)},
+                                                   {"range", {{"start", at(fromLine, 0)}, {"end", at(toLine, 0)}}},
+                                                   {"context", context}}))["result"];
+}
+
+// What fix writes for a file of these bytes, run with the arguments on a copy named name.
+std::string fixedBytes(const std::string& name, const std::string& bytes, std::vector<std::string> arguments)
+{
+    const TempDir folder;
+    const auto path = folder.write(name, bytes);
+    arguments.insert(arguments.begin(), "fix");
+    arguments.push_back(path);
+    RunCliWith(arguments);
+    return ReadBytes(path);
+}
+
+} // namespace
+
+TEST(LspProtocol, QuickFixesMakeFixsRepairs)
+{
+    const auto parts = CorpusPartFiles();
+    if (parts.empty())
+        GTEST_SKIP() << "the shared corpus is absent";
+    const TempDir folder;
+    const auto uri = UriOf(folder.file("3004.dat"));
+    LspClient client;
+    EXPECT_EQ(client.initialize()["codeActionProvider"]["codeActionKinds"],
+              Json({"quickfix", "source.fixAll.quillmark"}));
+    client.open(uri, SmallPart);
+    // On the licence line: its repair, and the repair of everything.
+    const auto actions = codeActions(client, uri, 4, 4, nullptr);
+    ASSERT_EQ(actions.size(), 2u) << actions.dump();
+    EXPECT_EQ(actions[0]["kind"], "quickfix");
+    EXPECT_EQ(actions[0]["diagnostics"][0]["code"], "license.approved");
+    EXPECT_EQ(applied(SmallPart, actions[0]["edit"], uri),
+              fixedBytes("3004.dat", SmallPart, {"--only", "license.approved"}));
+    EXPECT_NE(applied(SmallPart, actions[0]["edit"], uri), SmallPart);
+    EXPECT_EQ(actions[1]["kind"], "source.fixAll.quillmark");
+    // None on a line without a finding fix repairs; only what the client asks for.
+    EXPECT_EQ(codeActions(client, uri, 8, 8, {"quickfix"}), Json::array());
+    EXPECT_EQ(codeActions(client, uri, 4, 4, {"source"}).size(), 1u);
+
+    // source.fixAll on corpus parts: the bytes fix writes.
+    std::size_t repaired = 0;
+    for (std::size_t k = 0; k < parts.size() && repaired < 5; k += 37) {
+        const auto bytes = ReadBytes(parts[k].string());
+        if (!IsValidUtf8(bytes))
+            continue;
+        const auto name = parts[k].filename().string();
+        const auto partUri = UriOf(folder.file(name));
+        client.open(partUri, bytes);
+        const auto fixAll = codeActions(client, partUri, 0, 0, {"source.fixAll"});
+        const auto expected = fixedBytes(name, bytes, {});
+        if (expected == bytes) {
+            EXPECT_EQ(fixAll, Json::array()) << name;
+            continue;
+        }
+        ASSERT_EQ(fixAll.size(), 1u) << name;
+        EXPECT_EQ(applied(bytes, fixAll[0]["edit"], partUri), expected) << name;
+        ++repaired;
+    }
+    EXPECT_EQ(repaired, 5u);
+}
+
 TEST(LspProtocol, AnswersBrokenMessagesAndGoesOn)
 {
     LspClient client;

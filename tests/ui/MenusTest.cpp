@@ -367,7 +367,7 @@ TEST_F(WindowTest, RelativePathsFromTheCommandLineAndDropsAreMadeFull)
 namespace {
 
 // Fix on a row and Fix All in the Tracker dialog change the open document only, the body too;
-// saved, it holds what quillmark-cli fix writes into a copy of the file.
+// saved, it holds what quillmark-cli fix --recompose writes into a copy of the file.
 TEST_F(WindowTest, FixAllInTheTrackerDialogThenSaveWritesWhatFixWrites)
 {
     auto old = GoodPart + "3 16 1.0 0 0 0 1 0 0 0 1.1234567\r\n";
@@ -395,7 +395,8 @@ TEST_F(WindowTest, FixAllInTheTrackerDialogThenSaveWritesWhatFixWrites)
     child<QAction>("MTrackerCheck")->trigger();
     EXPECT_EQ(ReadBytes(path), old) << "nothing saved before Save";
     window->MDateiSpeichern_Click();
-    const auto fix = QUILLMARK_PROGRAM_FOLDER "/quillmark-cli fix --no-backup --quiet '" + copy + "' >/dev/null";
+    const auto fix =
+        QUILLMARK_PROGRAM_FOLDER "/quillmark-cli fix --recompose --no-backup --quiet '" + copy + "' >/dev/null";
     ASSERT_EQ(std::system(fix.c_str()), 0);
     EXPECT_EQ(ReadBytes(path), ReadBytes(copy));
 }
