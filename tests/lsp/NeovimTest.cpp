@@ -14,7 +14,8 @@
 namespace {
 
 // Neovim as the language client: opens the part, starts the server as its documentation says,
-// and writes what vim.diagnostic.get gives, one "line:column code message" per finding.
+// writes what vim.diagnostic.get gives, one "line:column code message" per finding, applies the
+// quick fix offered on the fifth line and saves the file.
 constexpr const char* ClientScript = R"lua(
 local part, out = os.getenv('QM_PART'), os.getenv('QM_OUT')
 vim.cmd('edit ' .. vim.fn.fnameescape(part))
@@ -29,6 +30,16 @@ for _, d in ipairs(vim.diagnostic.get(buffer)) do
   table.insert(lines, string.format('%d:%d %s %s', d.lnum + 1, d.col + 1, d.code, d.message))
 end
 vim.fn.writefile(lines, out)
+vim.api.nvim_win_set_cursor(0, { 5, 0 })
+local params = vim.lsp.util.make_range_params(0, 'utf-16')
+params.context = { diagnostics = {}, only = { 'quickfix' } }
+local answers = vim.lsp.buf_request_sync(buffer, 'textDocument/codeAction', params, 30000)
+for _, answer in pairs(answers or {}) do
+  for _, action in ipairs(answer.result or {}) do
+    vim.lsp.util.apply_workspace_edit(action.edit, 'utf-16')
+  end
+end
+vim.cmd('silent write')
 vim.lsp.stop_client(client)
 vim.cmd('qall!')
 )lua";
@@ -79,12 +90,14 @@ TEST(Neovim, ShowsTheFindingsOfCheckTracker)
                                  "0 BFC CERTIFY CCW\r\n"
                                  "\r\n"
                                  "1 16 0 0 0 1 0 0 0 1 0 0 0 1 stud.dat\r\n");
-    ASSERT_TRUE(runNeovim(folder, part)) << "Neovim did not end within two minutes";
-    // What check --tracker says of the same file, line for line, the column of the value it names.
+    // What check --tracker says of the same bytes, line for line, the column of the value it names.
+    const auto original = ReadBytes(part);
     std::vector<std::string> expected;
-    std::istringstream checked(RunCliWith({"check", "--tracker", "--quiet", part}).out);
+    const TempDir before;
+    const auto copy = before.write("3004.dat", original);
+    std::istringstream checked(RunCliWith({"check", "--tracker", "--quiet", copy}).out);
     for (std::string line; std::getline(checked, line);) {
-        const auto rest = line.substr(part.size() + 1);
+        const auto rest = line.substr(copy.size() + 1);
         const auto number = rest.substr(0, rest.find(':'));
         const auto afterLevel = rest.substr(rest.find(' ', rest.find(' ') + 1) + 1);
         const auto colon = afterLevel.find(": ");
@@ -92,6 +105,7 @@ TEST(Neovim, ShowsTheFindingsOfCheckTracker)
                            afterLevel.substr(0, colon) + " " + afterLevel.substr(colon + 2));
     }
     ASSERT_FALSE(expected.empty());
+    ASSERT_TRUE(runNeovim(folder, part)) << "Neovim did not end within two minutes";
     std::vector<std::string> shown;
     std::istringstream out(ReadBytes(folder.file("out.txt")));
     for (std::string line; std::getline(out, line);)
@@ -99,4 +113,8 @@ TEST(Neovim, ShowsTheFindingsOfCheckTracker)
     std::sort(shown.begin(), shown.end());
     std::sort(expected.begin(), expected.end());
     EXPECT_EQ(shown, expected);
+    // The quick fix applied and saved: the bytes fix --only writes.
+    RunCliWith({"fix", "--only", "license.approved", copy});
+    EXPECT_EQ(ReadBytes(part), ReadBytes(copy));
+    EXPECT_NE(ReadBytes(part), original);
 }
