@@ -1,11 +1,10 @@
 # SPDX-License-Identifier: MIT
 # quillmark_releases(FILE VERSION): reads the release list FILE and sets, in the caller,
-# releases_xml (AppStream <release> elements) and releases_changelog (a Debian changelog), both
-# signed by QUILLMARK_MAINTAINER, and releases_newest_date. Stops when the newest release is not
-# VERSION.
+# releases_xml (AppStream <release> elements) and releases_newest_date. Stops when the newest
+# release is not VERSION.
 
 function(_quillmark_add_release version date notes)
-  # The notes' lines joined for AppStream, kept as they are for the changelog's one item.
+  # The notes' lines joined into one paragraph.
   string(REPLACE "\n" " " paragraph "${notes}")
   string(REPLACE "&" "&amp;" paragraph "${paragraph}")
   string(REPLACE "<" "&lt;" paragraph "${paragraph}")
@@ -13,21 +12,13 @@ function(_quillmark_add_release version date notes)
   string(APPEND releases_xml
     "    <release version=\"${version}\" date=\"${date}\">\n"
     "      <description>\n        <p>${paragraph}</p>\n      </description>\n    </release>\n")
-  string(REPLACE "\n" "\n    " item "${notes}")
-  execute_process(COMMAND date -u -R -d "${date} 12:00" OUTPUT_VARIABLE rfc_date
-                  OUTPUT_STRIP_TRAILING_WHITESPACE COMMAND_ERROR_IS_FATAL ANY)
-  string(APPEND releases_changelog
-    "quillmark (${version}) unstable; urgency=medium\n\n  * ${item}\n\n"
-    " -- ${QUILLMARK_MAINTAINER}  ${rfc_date}\n\n")
   set(releases_xml "${releases_xml}" PARENT_SCOPE)
-  set(releases_changelog "${releases_changelog}" PARENT_SCOPE)
 endfunction()
 
 function(quillmark_releases file version)
   set_property(DIRECTORY APPEND PROPERTY CMAKE_CONFIGURE_DEPENDS ${file})
   file(STRINGS ${file} lines)
   set(releases_xml "")
-  set(releases_changelog "")
   set(current "")
   foreach(line IN LISTS lines)
     if(line MATCHES "^#")
@@ -55,5 +46,4 @@ function(quillmark_releases file version)
   endif()
   _quillmark_add_release(${current} ${current_date} "${notes}")
   set(releases_xml "${releases_xml}" PARENT_SCOPE)
-  set(releases_changelog "${releases_changelog}" PARENT_SCOPE)
 endfunction()

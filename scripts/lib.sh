@@ -5,7 +5,7 @@
 QUILLMARK_ROOT="$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd)"
 
 # The packages every build needs; scripts add their own.
-QUILLMARK_PACKAGES=(cmake ninja-build g++ qt6-base-dev libcli11-dev nlohmann-json3-dev libgtest-dev libgmock-dev
+QUILLMARK_PACKAGES=(cmake ninja-build g++ qt6-base-dev qt6-tools-dev qt6-l10n-tools libcli11-dev nlohmann-json3-dev libtomlplusplus-dev libgtest-dev libgmock-dev
                     libgl-dev fonts-dejavu-core desktop-file-utils libxml2-utils appstream clang-format
                     shared-mime-info libglib2.0-bin xdg-utils weston qt6-wayland xvfb x11-utils)
 

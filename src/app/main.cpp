@@ -13,6 +13,7 @@
 #include "ListFolder.h"
 #include "QtDialogs.h"
 #include "WindowFont.h"
+#include "WindowLanguage.h"
 #include "frmMain.h"
 
 namespace {
@@ -51,6 +52,7 @@ int main(int argc, char** argv)
     UseWindowFont();
     AppState app;
     const auto programFolder = QCoreApplication::applicationDirPath().toStdString();
+    InstallWindowTranslation(WindowLocale(QLocale::system()), programFolder);
     app.ProgramFolder = ListFolderOfThisProgram(programFolder);
     app.FirstOpenFolder = FirstOpenFolder(programFolder, app.ProgramFolder);
     IniSettingsStore store;

@@ -11,6 +11,7 @@
 #include <unistd.h>
 
 #include "Batch.h"
+#include "CheckConfig.h"
 #include "CheckOutput.h"
 #include "CliFiles.h"
 #include "Clock.h"
@@ -26,6 +27,8 @@
 #include "NewFile.h"
 #include "PartFile.h"
 #include "PartFileList.h"
+#include "PartSettings.h"
+#include "Paths.h"
 #include "QmError.h"
 #include "SarifLog.h"
 #include "Summary.h"
@@ -137,8 +140,10 @@ std::string outputClosedText(int error)
     return std::string("standard output closed (") + (name != nullptr ? name : "error") + ")";
 }
 
+// writeOut, when given, writes each file's standard output instead of out.
 int runBatch(const std::vector<std::string>& arguments, const BatchOptions& batch, std::ostream& out, std::ostream& err,
-             const std::function<FileReport(const PartFileEntry&)>& work)
+             const std::function<FileReport(const PartFileEntry&)>& work,
+             const std::function<void(const std::string&)>& writeOut = {})
 {
     const auto found = ExpandPartFiles(arguments);
     const auto& files = found.files;
@@ -154,7 +159,10 @@ int runBatch(const std::vector<std::string>& arguments, const BatchOptions& batc
     const bool whole = RunInOrder(
         files.size(), ThreadsFor(batch.threads), [&](std::size_t index) { return work(files[index]); },
         [&](FileReport& report) {
-            out << report.out;
+            if (writeOut)
+                writeOut(report.out);
+            else
+                out << report.out;
             err << report.err;
             summary.add(report);
             status = std::max(status, report.status);
@@ -211,36 +219,64 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
 {
     StringList categories;
     std::unique_ptr<ColourSource> colours;
-    if (options.tracker &&
-        (!ReadStandardList(ListKind::Category, categories, err) || !(colours = ColourSourceFor(options.ldconfig, err))))
+    if (options.tracker && (!ReadStandardList(ListKind::Category, categories, err) ||
+                            !(colours = ColourSourceFor(options.settings.ldconfig, err))))
         return ExitStatus::Unreadable;
-    const CheckSetup setup{batch.limitDescription, options.tracker ? &categories : nullptr, colours.get()};
+    CheckConfigs configs(options.config, !options.isolated);
+    // A wrong config named on the command line is a wrong command line: no file is read.
+    if (const auto named = options.config.empty() ? CheckConfigs::Found{} : configs.forPart(options.config);
+        named.error != nullptr) {
+        err << "quillmark-cli: " << *named.error << '\n';
+        return ExitStatus::Usage;
+    }
+    std::error_code noFolder;
+    const OutputForm form{options.format, options.format == OutputFormat::Github
+                                              ? GithubBaseFolder()
+                                              : std::filesystem::current_path(noFolder).string()};
+    std::optional<SarifLogWriter> sarif;
+    if (options.format == OutputFormat::Sarif)
+        sarif.emplace(out, form.base);
     MemoryClaims memory;
-    // A SARIF log is one document: its results are gathered and written at the end.
-    const bool sarif = options.format == OutputFormat::Sarif;
-    std::ostringstream sarifResults;
-    const auto status = runBatch(arguments, batch, sarif ? sarifResults : out, err, [&](const PartFileEntry& entry) {
-        // A check never writes, not even to undo what a killed save left: the next save does that.
-        return reportOn(entry, batch.quiet, {}, nullptr, memory,
-                        [&](const HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
-                            const auto check = CheckRecord(header, setup, dialogs);
-                            // The file is read again for the places of its findings only when it has any.
-                            const auto bytes = HasFindings(check) ? FileBytes(*header.Part).takeBytes() : std::string();
-                            report.out = CheckOutput(options.format, header, check, bytes, options.tracker);
-                            const auto& findings = check.save;
-                            noteFindings(report, findings);
-                            bool trackerRefuses = false;
-                            for (const auto& finding : check.tracker) {
-                                report.trackerIds.push_back(finding.id);
-                                trackerRefuses = trackerRefuses || finding.level == FindingLevel::Error;
-                            }
-                            report.refused = trackerRefuses;
-                            report.status =
-                                findings.refusals.empty() && !trackerRefuses ? ExitStatus::Ok : ExitStatus::Refused;
-                        });
-    });
+    const auto checkOne = [&](const HeaderData& header, const PartSettings& settings, ConsoleDialogs& dialogs,
+                              FileReport& report) {
+        const auto check =
+            CheckRecord(header, settings, {options.tracker ? &categories : nullptr, colours.get()}, dialogs);
+        const auto& file = check.file;
+        // The file is read again only for findings with a place in it.
+        const auto bytes = HasPlacedFindings(file) ? FileBytes(*header.Part).takeBytes() : std::string();
+        const auto findings = PlacedFindings(check, header, bytes);
+        report.out = CheckOutput(form, header, file, findings);
+        noteFindings(report, file.save);
+        for (const auto& finding : file.tracker)
+            report.trackerIds.push_back(finding.id);
+        report.refused = std::any_of(findings.begin(), findings.end(), [&](const FileFinding& finding) {
+            return settings.choice.fails(finding.severity);
+        });
+        report.status = report.refused ? ExitStatus::Refused : ExitStatus::Ok;
+    };
+    const auto status = runBatch(
+        arguments, batch, out, err,
+        [&](const PartFileEntry& entry) {
+            const auto partPath = AbsolutePath(entry.path);
+            const auto config = configs.forPart(partPath);
+            if (config.error != nullptr) {
+                FileReport report;
+                report.status = ExitStatus::Usage;
+                report.unreadable = true;
+                if (config.firstTold)
+                    report.err = "quillmark-cli: " + *config.error + '\n';
+                return report;
+            }
+            const auto settings = SettingsForPart(options.settings, config.config, partPath);
+            // A check never writes, not even to undo what a killed save left: the next save does that.
+            return reportOn(entry, batch.quiet, {}, nullptr, memory,
+                            [&](const HeaderData& header, ConsoleDialogs& dialogs, FileReport& report) {
+                                checkOne(header, settings, dialogs, report);
+                            });
+        },
+        sarif ? [&sarif](const std::string& text) { sarif->write(text); } : std::function<void(const std::string&)>{});
     if (sarif)
-        WriteSarifLog(sarifResults.view(), out);
+        sarif->finish();
     return status;
 }
 
@@ -327,7 +363,7 @@ int RunEdit(const std::vector<std::string>& arguments, const SaveOptions& option
             const auto notes = edit.afterEdits ? edit.afterEdits(header) : std::vector<std::string>{};
             if (edit.json) {
                 const auto findings = EvaluateSaveChecks(header, batch.limitDescription);
-                auto json = CheckJson(header, findings, nullptr);
+                auto json = CheckJson(header, findings);
                 json["old_header"] = HeaderTextForJson(header.OldHeader, header.Encoding);
                 json["new_header"] = HeaderTextForJson(ComposeHeader(header), header.Encoding);
                 if (edit.afterEdits) {

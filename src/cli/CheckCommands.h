@@ -9,6 +9,7 @@
 #include "FileRepairs.h"
 #include "FindingLines.h"
 #include "HeaderEdits.h"
+#include "PartSettings.h"
 
 // How check and save work through many files.
 struct BatchOptions {
@@ -20,8 +21,10 @@ struct BatchOptions {
 
 struct CheckOptions {
     OutputFormat format = OutputFormat::Text;
-    bool tracker = false; // the Parts Tracker's rules too
-    std::string ldconfig; // the LDConfig.ldr for the Tracker's colour codes; empty: search above each file
+    bool tracker = false;         // the Parts Tracker's rules too
+    CommandLineSettings settings; // each given one stands over the config file's
+    std::string config;           // the config file of every part; empty: the nearest quillmark.toml
+    bool isolated = false;        // no config file at all
 };
 
 // check: every save check on every file (folders searched for part files), without writing.

@@ -1,11 +1,45 @@
 // SPDX-License-Identifier: MIT
 #include "CheckOutput.h"
 
+#include <algorithm>
+
 #include "FieldsJson.h"
 #include "SarifLog.h"
 
-nlohmann::ordered_json CheckJson(const HeaderData& header, const SaveFindings& save,
-                                 const std::vector<FileFinding>* tracker)
+namespace {
+
+// The findings one by one into the JSON text of the file, without a tree of them all.
+std::string jsonText(const HeaderData& header, const CheckedFile& file, const std::vector<FileFinding>& findings)
+{
+    auto text = CheckJson(header, file.save).dump();
+    const auto list = [&](const char* key, auto&& belongs) {
+        text.pop_back(); // the closing brace, written again after the list
+        text.append(",\"").append(key).append("\":[");
+        bool first = true;
+        for (const auto& finding : findings) {
+            if (!belongs(finding))
+                continue;
+            nlohmann::ordered_json entry{
+                {"id", finding.id}, {"level", SeverityText(finding.severity)}, {"text", finding.message}};
+            if (!finding.place.wholeFile) {
+                entry["line"] = finding.place.line;
+                entry["column"] = finding.place.column;
+            }
+            text.append(first ? "" : ",").append(entry.dump());
+            first = false;
+        }
+        text.append("]}");
+    };
+    if (file.lengthWarning)
+        list("warnings", [](const FileFinding& finding) { return finding.id == SaveCheckIds::DescriptionLength; });
+    if (file.trackerChecked)
+        list("tracker", [](const FileFinding& finding) { return !finding.id.starts_with("save."); });
+    return text + '\n';
+}
+
+} // namespace
+
+nlohmann::ordered_json CheckJson(const HeaderData& header, const SaveFindings& save)
 {
     nlohmann::ordered_json json;
     json["FilePath"] = TextForJson(header.FilePath);
@@ -15,34 +49,17 @@ nlohmann::ordered_json CheckJson(const HeaderData& header, const SaveFindings& s
                       {"rotation", save.fixups.rotation},
                       {"write", save.fixups.write},
                       {"color", save.fixups.color}};
-    if (tracker != nullptr) {
-        json["tracker"] = nlohmann::ordered_json::array();
-        for (const auto& finding : *tracker) {
-            auto& entry = json["tracker"].emplace_back(nlohmann::ordered_json{
-                {"id", finding.id}, {"level", SeverityText(finding.severity)}, {"text", finding.message}});
-            if (!finding.place.wholeFile) {
-                entry["line"] = finding.place.line;
-                entry["column"] = finding.place.column;
-            }
-        }
-    }
     return json;
 }
 
-std::string CheckOutput(OutputFormat format, const HeaderData& header, const RecordCheck& check,
-                        std::string_view fileBytes, bool tracker)
+std::string CheckOutput(const OutputForm& form, const HeaderData& header, const CheckedFile& file,
+                        const std::vector<FileFinding>& findings)
 {
-    if (format == OutputFormat::Json) {
-        const auto trackerFindings =
-            TrackerFileFindings(check.tracker, FindingPlaces(fileBytes, header, check.composed));
-        return CheckJson(header, check.save, tracker ? &trackerFindings : nullptr).dump() + '\n';
-    }
-    const auto findings = FindingsOfRecord(header, check, fileBytes, tracker);
-    switch (format) {
-    case OutputFormat::Sarif: return SarifResultLines(header.FilePath, findings);
-    case OutputFormat::Github: return GithubFindingLines(header.FilePath, findings);
-    case OutputFormat::Text:
-    case OutputFormat::Json: break;
+    switch (form.format) {
+    case OutputFormat::Json: return jsonText(header, file, findings);
+    case OutputFormat::Sarif: return SarifResultLines(header.FilePath, findings, form.base);
+    case OutputFormat::Github: return GithubFindingLines(header.FilePath, findings, form.base);
+    case OutputFormat::Text: break;
     }
     return TextFindingLines(header.FilePath, findings);
 }

@@ -9,11 +9,16 @@
 #include "FindingLines.h"
 #include "TextCheck.h"
 
-// One file's output of check in the chosen form; tracker tells whether the Parts Tracker's rules
-// were checked. fileBytes is the file as read.
-std::string CheckOutput(OutputFormat format, const HeaderData& header, const RecordCheck& check,
-                        std::string_view fileBytes, bool tracker);
+// The forms check writes, and the folder their paths are relative to (the working folder, for
+// GitHub $GITHUB_WORKSPACE when set).
+struct OutputForm {
+    OutputFormat format = OutputFormat::Text;
+    std::string base;
+};
 
-// The JSON object of a file's save checks, and of its Tracker findings when given.
-nlohmann::ordered_json CheckJson(const HeaderData& header, const SaveFindings& save,
-                                 const std::vector<FileFinding>* tracker);
+// One file's output of check in the chosen form.
+std::string CheckOutput(const OutputForm& form, const HeaderData& header, const CheckedFile& file,
+                        const std::vector<FileFinding>& findings);
+
+// The JSON object of a file's save checks, without its Tracker findings.
+nlohmann::ordered_json CheckJson(const HeaderData& header, const SaveFindings& save);

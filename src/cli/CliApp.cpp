@@ -12,8 +12,10 @@
 #include "ClosestWord.h"
 #include "ConsoleDialogs.h"
 #include "EditCommandLine.h"
+#include "ExplainCommand.h"
 #include "FixCommand.h"
 #include "PrintCommands.h"
+#include "RuleChoice.h"
 
 namespace {
 
@@ -46,6 +48,7 @@ public:
         batch_.errIsTerminal = errIsTerminal;
         addReadCommands();
         addCheck();
+        addExplain();
         addSaveAndEdit();
         if (languageServer_)
             addLsp();
@@ -66,13 +69,15 @@ public:
         if (*fields_)
             return RunFields(files_, dialogs, out, err);
         if (*check_)
-            return RunCheck(files_, checkOptions_, batch_, out, err);
+            return runCheck(out, err);
+        if (*explain_)
+            return RunExplain(explainId_, explainMarkdown_, out, err);
         if (*save_)
             return RunSave(files_, saveOptions_, batch_, out, err);
         if (*edit_)
             return RunEdit(files_, saveOptions_, editOptions(), batch_, out, err);
         if (lsp_ != nullptr && *lsp_)
-            return languageServer_(checkOptions_.ldconfig, !noLengthLimit_);
+            return languageServer_(checkOptions_.settings.ldconfig, !noLengthLimit_);
         if (*fix_) {
             auto options = saveOptions_;
             options.backup = fixOptions_.recompose ? !noBackup_ : backup_;
@@ -140,9 +145,9 @@ private:
         auto* format =
             check_
                 ->add_option("--format", checkOptions_.format,
-                             "text: \"path:line: level id: message\" per finding, as compilers write them; json: one "
-                             "object per file and line; sarif: one SARIF 2.1.0 log for code scanning; github: GitHub "
-                             "Actions annotations")
+                             "text: \"path:line:column: severity: message [id]\" per finding, as compilers write "
+                             "them; json: one object per file and line; sarif: one SARIF 2.1.0 log for code scanning; "
+                             "github: GitHub Actions annotations")
                 ->transform(CLI::CheckedTransformer(formats, CLI::ignore_case))
                 ->option_text("text|json|sarif|github");
         check_
@@ -154,10 +159,27 @@ private:
                          "Rules that need the Tracker's database (registered authors, duplicates, held subfiles) are "
                          "not checked.");
         check_
-            ->add_option("--ldconfig", checkOptions_.ldconfig,
+            ->add_option("--ldconfig", checkOptions_.settings.ldconfig,
                          "The LDConfig.ldr whose colour codes --tracker accepts (default: the first LDConfig.ldr in "
                          "the file's folder or above it, else the built-in list)")
             ->check(ReadableFile);
+        check_
+            ->add_option("--select", select_,
+                         "Report only these rules, by id (a,b); an id ending in \".\" names a group: numbers., save.")
+            ->delimiter(',');
+        check_->add_option("--ignore", ignore_, "Do not report these rules, by id or group as for --select")
+            ->delimiter(',');
+        check_
+            ->add_option("--fail-on", failOn_,
+                         "The findings that make the exit status 1: error (the default), "
+                         "warning (warnings too) or never")
+            ->check(CLI::IsMember({"error", "warning", "never"}));
+        auto* config = check_
+                           ->add_option("--config", checkOptions_.config,
+                                        "The quillmark.toml for every file (default: the nearest one in the file's "
+                                        "folder or above it)")
+                           ->check(ReadableFile);
+        check_->add_flag("--isolated", checkOptions_.isolated, "Read no quillmark.toml")->excludes(config);
         addBatchOptions(check_);
         check_->add_option("FILE", files_, "Part files or folders to check")->required();
     }
@@ -170,13 +192,42 @@ private:
                    "completion of header values. Nothing is written to disk.");
         lsp_->footer("Exit status:\n  0  the editor shut the server down\n  1  the input ended or exit came "
                      "without shutdown\n  2  a list file cannot be read, or the command line is wrong\n");
-        lsp_->add_option("--ldconfig", checkOptions_.ldconfig,
+        lsp_->add_option("--ldconfig", checkOptions_.settings.ldconfig,
                          "The LDConfig.ldr whose colour codes are accepted (default: the first LDConfig.ldr in the "
                          "document's folder or above it, else the built-in list)")
             ->check(ReadableFile);
         lsp_->add_flag("--no-length-limit", noLengthLimit_, "Allow part descriptions of any length");
         // Editors' set-ups often name the transport; standard input and output is the only one.
         lsp_->add_flag("--stdio")->description("Talk over standard input and output (the default and only way)");
+    }
+
+    void addExplain()
+    {
+        explain_ = app_.add_subcommand("explain", "Print what the rule ID checks, why the library has it, whether "
+                                                  "and how a command repairs it, and an example.");
+        explain_->footer("Exit status:\n  0  the rule was explained\n  2  no check reports ID, or the command "
+                         "line is wrong\n");
+        auto* markdown =
+            explain_->add_flag("--markdown", explainMarkdown_, "Print every rule as the Markdown page docs/rules.md");
+        explain_->add_option("ID", explainId_, "The id of a finding, as check prints it")->excludes(markdown);
+    }
+
+    int runCheck(std::ostream& out, std::ostream& err)
+    {
+        for (const auto* patterns : {&select_, &ignore_})
+            if (const auto unknown = UnknownRulePattern(*patterns)) {
+                err << "quillmark-cli: " << (patterns == &select_ ? "--select " : "--ignore ") << *unknown << '\n';
+                return ExitStatus::Usage;
+            }
+        auto& given = checkOptions_.settings;
+        if (check_->count("--select") > 0)
+            given.select = select_;
+        if (check_->count("--ignore") > 0)
+            given.ignore = ignore_;
+        if (!failOn_.empty())
+            given.failOn = FailOnNamed(failOn_);
+        given.noLengthLimit = noLengthLimit_;
+        return RunCheck(files_, checkOptions_, batch_, out, err);
     }
 
     void addSaveOptions(CLI::App* command)
@@ -211,8 +262,8 @@ private:
             "decimals and zeros of numbers), after edit's changes. Each repair edits the file as it stands: line "
             "ends, blanks and every line without a repaired finding stay byte for byte, and the file is "
             "written through the same safe save as edit's, without a backup unless --backup. Per file, each "
-            "repair is named with the lines it changed, and each finding left with why. Exit statuses as for "
-            "edit.");
+            "repair is named with the lines it changed, and each finding left with why.");
+        fix_->footer(SaveExitStatuses);
         fix_->add_option("--only", fixOptions_.only,
                          "Run only these repairs, by the Tracker's ids (a,b); "
                          "line.invalidcoloredlines runs only when named here")
@@ -237,9 +288,11 @@ private:
 
     CLI::App app_{"quillmark-cli: reads LDraw part files (*.dat) the way the Quillmark editor opens them."};
     CLI::App *fields_ = nullptr, *check_ = nullptr, *save_ = nullptr, *edit_ = nullptr, *fix_ = nullptr,
-             *lsp_ = nullptr;
+             *explain_ = nullptr, *lsp_ = nullptr;
     LanguageServerStart languageServer_;
-    std::vector<std::string> files_;
+    std::vector<std::string> files_, select_, ignore_;
+    std::string failOn_, explainId_;
+    bool explainMarkdown_ = false;
     std::string printFile_;
     BatchOptions batch_;
     bool noLengthLimit_ = false, noBackup_ = false, noCategory_ = false, backup_ = false;

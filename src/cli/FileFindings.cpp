@@ -1,7 +1,10 @@
 // SPDX-License-Identifier: MIT
 #include "FileFindings.h"
 
+#include <algorithm>
+
 #include "FileReport.h"
+#include "Text.h"
 
 namespace {
 
@@ -50,6 +53,22 @@ std::vector<FileFinding> SaveCheckFindings(const SaveFindings& save, const Findi
                 {id, Severity::Note, std::string("A save would offer a fix-up: ") + what + ".",
                  std::string_view(id) == "save.fixup.color" ? places.ofHeaderKeyword("COLOR") : FindingPlace{}});
     return findings;
+}
+
+void SortByPlace(std::vector<FileFinding>& findings)
+{
+    const auto place = [](const FileFinding& finding) { return std::pair(finding.place.line, finding.place.column); };
+    std::stable_sort(findings.begin(), findings.end(),
+                     [&place](const FileFinding& a, const FileFinding& b) { return place(a) < place(b); });
+}
+
+FileFinding DescriptionLengthWarning(const HeaderData& header, const FindingPlaces& places)
+{
+    return {SaveCheckIds::DescriptionLength, Severity::Warning,
+            "The description has " + std::to_string(CharacterCount(header.PartDescription, header.Encoding)) +
+                " characters, more than " + std::to_string(DescriptionLimit) +
+                "; older tools may cut it, the Parts Tracker takes it.",
+            places.ofHeaderKeyword("")};
 }
 
 std::vector<FileFinding> TrackerFileFindings(const std::vector<TrackerFinding>& tracker, const FindingPlaces& places)

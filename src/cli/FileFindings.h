@@ -21,9 +21,16 @@ struct FileFinding {
     FindingPlace place;
 };
 
+// Findings in the order of their places in the file, line by line and column by column; a
+// finding about the file as a whole stands on line 1, column 1.
+void SortByPlace(std::vector<FileFinding>& findings);
+
 // What the save checks say about a file, in their order: a refusal is an error, a missing user
 // name a warning, a fix-up a save would offer a note.
 std::vector<FileFinding> SaveCheckFindings(const SaveFindings& save, const FindingPlaces& places);
+
+// Under the Parts Tracker's rules, a description over the limit only warns: the Tracker takes it.
+FileFinding DescriptionLengthWarning(const HeaderData& header, const FindingPlaces& places);
 
 // The findings of the Parts Tracker's rules, placed on the file's lines.
 std::vector<FileFinding> TrackerFileFindings(const std::vector<TrackerFinding>& tracker, const FindingPlaces& places);

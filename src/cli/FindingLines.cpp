@@ -1,6 +1,9 @@
 // SPDX-License-Identifier: MIT
 #include "FindingLines.h"
 
+#include <cstdlib>
+#include <filesystem>
+
 #include "ConsoleDialogs.h"
 #include "PathFromHere.h"
 
@@ -42,24 +45,32 @@ std::string TextFindingLines(const std::string& path, const std::vector<FileFind
         return shownPath + ": ok\n";
     std::string lines;
     for (const auto& finding : findings) {
-        lines += shownPath + ':';
-        if (!finding.place.wholeFile)
-            lines += std::to_string(finding.place.line) + ':';
-        lines += ' ';
+        lines +=
+            shownPath + ':' + std::to_string(finding.place.line) + ':' + std::to_string(finding.place.column) + ": ";
         lines += SeverityText(finding.severity);
-        lines += ' ' + ShownText(finding.id) + ": " + ShownText(finding.message) + '\n';
+        lines += ": " + ShownText(finding.message) + " [" + ShownText(finding.id) + "]\n";
     }
     return lines;
 }
 
-std::string GithubFindingLines(const std::string& path, const std::vector<FileFinding>& findings)
+std::string GithubBaseFolder()
 {
-    const auto file = workflowEscaped(ShownText(SavedPathFromHere(path).path), true);
+    const char* workspace = std::getenv("GITHUB_WORKSPACE");
+    if (workspace != nullptr && *workspace != '\0')
+        return workspace;
+    std::error_code error;
+    return std::filesystem::current_path(error).string();
+}
+
+std::string GithubFindingLines(const std::string& path, const std::vector<FileFinding>& findings,
+                               const std::string& base)
+{
+    const auto file = workflowEscaped(ShownText(SavedPathFrom(path, base).path), true);
     std::string lines;
     for (const auto& finding : findings) {
         lines += std::string("::") + workflowCommand(finding.severity) + " file=" + file;
         if (!finding.place.wholeFile)
-            lines += ",line=" + std::to_string(finding.place.line);
+            lines += ",line=" + std::to_string(finding.place.line) + ",col=" + std::to_string(finding.place.column);
         lines += ",title=" + workflowEscaped(finding.id, true) +
                  "::" + workflowEscaped(ShownText(finding.message), false) + '\n';
     }

@@ -11,3 +11,6 @@ struct PathFromHere {
 };
 
 PathFromHere SavedPathFromHere(const std::string& path);
+
+// The same from folder instead of the current folder.
+PathFromHere SavedPathFrom(const std::string& path, const std::string& folder);

@@ -9,41 +9,56 @@
 #include "FileFindings.h"
 #include "FileRepairs.h"
 #include "HeaderData.h"
+#include "PartSettings.h"
+#include "RuleChoice.h"
 #include "SaveChecks.h"
 #include "TrackerCheck.h"
 
 class ColourSource;
 class Dialogs;
 
-// What check weighs a part by: the save checks, and the Parts Tracker's rules when their lists are given.
-struct CheckSetup {
-    bool limitDescription = true;           // the description's 64 characters
+// What check reports of one file: the save checks and, when asked for, the Parts Tracker's rules,
+// the findings a rule choice leaves out already taken out.
+struct CheckedFile {
+    SaveFindings save;
+    bool lengthWarning = false; // under the Tracker's rules a long description is a warning, not a refusal
+    bool trackerChecked = false;
+    std::vector<TrackerFinding> tracker;
+};
+
+// Takes out of file what choice does not report.
+void KeepReported(CheckedFile& file, const RuleChoice& choice);
+
+// What the Parts Tracker's rules read besides the part: without categories they are not checked.
+struct TrackerLists {
     const StringList* categories = nullptr; // the official categories; null: no Tracker rules
     ColourSource* colours = nullptr;        // where each part's colour codes come from
 };
 
-// What the checks say about one record.
+// What check says of one open record.
 struct RecordCheck {
-    SaveFindings save;
-    std::string composed;                // the header a save would write
-    std::vector<TrackerFinding> tracker; // empty unless the Tracker's rules were checked
+    CheckedFile file;
+    std::string composed; // the header a save would write
 };
 
-// The checks of check on an open record; dialogs hears of an unusable LDConfig.ldr.
-RecordCheck CheckRecord(const HeaderData& header, const CheckSetup& setup, Dialogs& dialogs);
+// The checks of check on an open record with its part's settings (rule choice, description limit,
+// LDConfig.ldr); dialogs hears of an unusable LDConfig.ldr. check and the language server both
+// check a part through this one function.
+RecordCheck CheckRecord(const HeaderData& header, const PartSettings& settings, const TrackerLists& lists,
+                        Dialogs& dialogs);
 
-// Whether the checks found anything to say (a finding of the Tracker's rules, a refusal, a missing
-// user name, a fix-up of the header's colour lines): only then are the file's bytes needed.
-bool HasFindings(const RecordCheck& check);
+// Whether a finding of file has a place in the file: only then are the file's bytes needed.
+bool HasPlacedFindings(const CheckedFile& file);
 
-// Every finding of check, save checks first, each at its place in fileBytes, the file as read.
-std::vector<FileFinding> FindingsOfRecord(const HeaderData& header, const RecordCheck& check,
-                                          std::string_view fileBytes, bool tracker);
+// Every finding of check with its place in fileBytes (the file as read), in the order of the places.
+std::vector<FileFinding> PlacedFindings(const RecordCheck& check, const HeaderData& header, std::string_view fileBytes);
 
-// check on a part's text held in memory, as if path held these bytes: the same reading as a file's
-// (an LF-only text is read as CR LF), the same checks, the same findings. Files near path (the
-// colour list) are read, nothing is written. Throws what reading the text throws (a binary text).
-std::vector<FileFinding> CheckPartText(const std::string& bytes, const std::string& path, const CheckSetup& setup);
+// check on a part's text held in memory, as if path held these bytes, with the settings of that part:
+// the same reading as a file's (an LF-only text is read as CR LF), the same checks, the same findings.
+// Files near path (the colour list) are read, nothing is written. Throws what reading the text throws
+// (a binary text).
+std::vector<FileFinding> CheckPartText(const std::string& bytes, const std::string& path, const PartSettings& settings,
+                                       const TrackerLists& lists);
 
 // fix's repairs (those named in chosen) of a part's text held in memory: the edits fix would make
 // of a file with these bytes, without header edits.

@@ -14,6 +14,12 @@ enum class Answer { Ok, Yes, No, Cancel };
 
 inline constexpr const char* ProgramTitle = "Quillmark";
 
+// Marks a text, or a line of one, that the window shows in the user's language: Qt's translation
+// tools collect the texts so marked under their context ("Messages" for what goes through this
+// seam), and the window looks each line up there. The programs keep the English text, which the
+// command line shows as it is.
+#define Translatable(context, text) text
+
 struct MessageBox {
     std::string text;
     std::string title = ProgramTitle;

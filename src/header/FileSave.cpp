@@ -51,9 +51,8 @@ std::string_view withoutCopyNumber(std::string_view base)
 
 MessageBox changedOnDiskBox(const std::string& path)
 {
-    return {"The file " + path +
-                " was changed by another program after it was opened.\r\n"
-                "Save anyway and overwrite those changes?",
+    return {"The file " + path + " was changed by another program after it was opened.\r\n" +
+                Translatable("Messages", "Save anyway and overwrite those changes?"),
             ChangedOnDiskTitle, Buttons::YesNo, Icon::Exclamation, Answer::No};
 }
 

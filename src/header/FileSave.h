@@ -6,6 +6,7 @@
 #include <string_view>
 
 #include "Clock.h"
+#include "Dialogs.h"
 #include "HeaderData.h"
 
 #include "SafeReplace.h"
@@ -22,11 +23,11 @@ std::string MakeBackupName(const std::string& path, const LocalDateTime& stamp);
 bool IsBackupName(std::string_view fileName);
 
 // The title of the question asked before overwriting a file that changed since it was read.
-inline constexpr const char* ChangedOnDiskTitle = "File Changed on Disk";
+inline constexpr const char* ChangedOnDiskTitle = Translatable("Messages", "File Changed on Disk");
 // The titles of the boxes that say why a save or an open stopped short.
-inline constexpr const char* FileLockedTitle = "File Locked";
-inline constexpr const char* InterruptedTitle = "Interrupted";
-inline constexpr const char* KeptCopyTitle = "Interrupted Save";
+inline constexpr const char* FileLockedTitle = Translatable("Messages", "File Locked");
+inline constexpr const char* InterruptedTitle = Translatable("Messages", "Interrupted");
+inline constexpr const char* KeptCopyTitle = Translatable("Messages", "Interrupted Save");
 
 // What a save writes, piece by piece: what stood before the header, the new header, the body
 // and one CR LF.

@@ -14,6 +14,3 @@ public:
     // Called before lines 1, 11, 21, ... with the number of lines read so far.
     virtual void lineProgress(std::size_t /*linesRead*/) {}
 };
-
-// "Parsing file. Line N. Please wait..."
-std::string ProgressCaption(std::size_t linesRead);

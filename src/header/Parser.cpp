@@ -306,11 +306,6 @@ bool mayOpenAsPart(std::string_view content, const std::string& path, Dialogs& d
 
 } // namespace
 
-std::string ProgressCaption(std::size_t linesRead)
-{
-    return "Parsing file. Line " + std::to_string(linesRead) + ". Please wait...";
-}
-
 void ParseHeaderText(HeaderData& header, std::string text, ParseProgress& progress)
 {
     clearParsedContent(header);

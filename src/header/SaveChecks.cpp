@@ -25,16 +25,19 @@ struct Check {
 
 // The checks in the one order in which a save makes them and a check lists them.
 const Check Checks[] = {
-    {SaveCheckIds::DescriptionLength, "Length of the part description is limited to 64 character!", descriptionTooLong,
+    {SaveCheckIds::DescriptionLength,
+     Translatable("Messages", "Length of the part description is limited to 64 characters!"), descriptionTooLong,
      SaveOutcome::DescriptionTooLong},
-    {SaveCheckIds::Author, "You need to mention the Author!",
+    {SaveCheckIds::Author, Translatable("Messages", "You need to mention the Author!"),
      [](const HeaderData& h) { return h.AuthorRealName.empty(); }},
     {SaveCheckIds::UserName, nullptr, missingUserName},
-    {SaveCheckIds::Bfc, "You need to set the BFC type!", [](const HeaderData& h) { return h.Bfc.empty(); }},
-    {SaveCheckIds::License, "You need to set the Liscense type!",
+    {SaveCheckIds::Bfc, Translatable("Messages", "You need to set the BFC type!"),
+     [](const HeaderData& h) { return h.Bfc.empty(); }},
+    {SaveCheckIds::License, Translatable("Messages", "You need to set the License type!"),
      [](const HeaderData& h) { return h.License.empty(); }},
-    {SaveCheckIds::PartType, "You need to set the Part type!", [](const HeaderData& h) { return h.PartType.empty(); }},
-    {SaveCheckIds::NeedsWork, "Parts with 'needs work' in title needs a proper comment!",
+    {SaveCheckIds::PartType, Translatable("Messages", "You need to set the Part type!"),
+     [](const HeaderData& h) { return h.PartType.empty(); }},
+    {SaveCheckIds::NeedsWork, Translatable("Messages", "Parts with 'needs work' in title needs a proper comment!"),
      [](const HeaderData& h) { return h.NeedsWork && h.Comments.empty(); }},
 };
 
@@ -52,14 +55,19 @@ bool askedYes(Dialogs& dialogs, const char* text, const char* title)
 void offerFixUps(HeaderData& h, const SaveContext& context)
 {
     auto& dialogs = context.dialogs;
-    if (HasCertifyInvertNext(h.Body) && askedYes(dialogs, "Should this be corrected?", "BFC CERTIFY INVERTNEXT"))
+    if (HasCertifyInvertNext(h.Body) &&
+        askedYes(dialogs, Translatable("Messages", "Should this be corrected?"), "BFC CERTIFY INVERTNEXT"))
         FixCertifyInvertNext(h.Body);
     if (HasRotationLines(h.Body) &&
-        askedYes(dialogs, "Should the \"0 ROTATION\" entries being deleted?", "ROTATION in file"))
+        askedYes(dialogs, Translatable("Messages", "Should the \"0 ROTATION\" entries being deleted?"),
+                 Translatable("Messages", "ROTATION in file")))
         DeleteRotationLines(h.Body);
-    if (HasWriteLines(h.Body) && askedYes(dialogs, "Should the \"0 WRITE\" entries being deleted?", "ROTATION in file"))
+    if (HasWriteLines(h.Body) &&
+        askedYes(dialogs, Translatable("Messages", "Should the \"0 WRITE\" entries being deleted?"),
+                 Translatable("Messages", "ROTATION in file")))
         RemoveWriteKeywords(h.Body);
-    if (HasColorLines(h) && askedYes(dialogs, "Should the COLOR Entry be deleted?", "COLOR Entry")) {
+    if (HasColorLines(h) && askedYes(dialogs, Translatable("Messages", "Should the COLOR Entry be deleted?"),
+                                     Translatable("Messages", "COLOR Entry"))) {
         ClearColorLines(h);
         context.recompose();
     }
@@ -67,7 +75,10 @@ void offerFixUps(HeaderData& h, const SaveContext& context)
 
 } // namespace
 
-std::string RefusalText(const std::string& sentence) { return sentence + "\r\nSaving the file is not possible"; }
+std::string RefusalText(const std::string& sentence)
+{
+    return sentence + "\r\n" + Translatable("Messages", "Saving the file is not possible");
+}
 
 SaveFindings EvaluateSaveChecks(const HeaderData& h, bool limitDescription)
 {
@@ -99,7 +110,8 @@ SaveResult CheckHeaderAndSave(HeaderData& h, const SaveContext& context)
             dialogs.message(StopBox(refusal));
             return {check.outcome, {}};
         }
-        if (!askedYes(dialogs, "You have not set your username. Do you want to save anyway?", MissingUserNameTitle))
+        if (!askedYes(dialogs, Translatable("Messages", "You have not set your username. Do you want to save anyway?"),
+                      MissingUserNameTitle))
             return {SaveOutcome::Declined, {}};
     }
     offerFixUps(h, context);

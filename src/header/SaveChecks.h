@@ -7,6 +7,7 @@
 #include <string_view>
 #include <vector>
 
+#include "Dialogs.h"
 #include "HeaderData.h"
 #include "SafeReplace.h"
 
@@ -16,7 +17,7 @@ class Dialogs;
 inline constexpr std::size_t DescriptionLimit = 64;
 
 // The title of the question asked when the author line has no user name.
-inline constexpr const char* MissingUserNameTitle = "Missing Username";
+inline constexpr const char* MissingUserNameTitle = Translatable("Messages", "Missing Username");
 
 // A stop text as the box shows it: the sentence, CR LF, "Saving the file is not possible".
 std::string RefusalText(const std::string& sentence);

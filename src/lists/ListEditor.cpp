@@ -51,7 +51,8 @@ void ListEditor::add()
 
 void ListEditor::deleteSelected()
 {
-    if (!selected_ || refuseNone("Delete Entry", "delete"))
+    if (!selected_ || refuseNone(Translatable("Messages", "Delete Entry"),
+                                 Translatable("Messages", "The entry '<none>' is not allowed to delete.")))
         return;
     entries_.erase(entries_.begin() + static_cast<std::ptrdiff_t>(*selected_));
     selected_.reset();
@@ -61,7 +62,8 @@ void ListEditor::deleteSelected()
 
 void ListEditor::updateSelected()
 {
-    if (!selected_ || refuseNone("Update Entry", "change"))
+    if (!selected_ || refuseNone(Translatable("Messages", "Update Entry"),
+                                 Translatable("Messages", "The entry '<none>' is not allowed to change.")))
         return;
     const auto typed = std::string(TrimBlanks(updateText_));
     if (typed.empty())
@@ -79,8 +81,9 @@ bool ListEditor::close()
 {
     if (!changed_)
         return true;
-    const auto answer = dialogs_.message({"Do you want to save the changes to the list?", "Changed Categories",
-                                          Buttons::YesNoCancel, Icon::Question, Answer::Cancel});
+    const auto answer = dialogs_.message({Translatable("Messages", "Do you want to save the changes to the list?"),
+                                          Translatable("Messages", "Changed Categories"), Buttons::YesNoCancel,
+                                          Icon::Question, Answer::Cancel});
     if (answer == Answer::Cancel)
         return false;
     if (answer == Answer::No)
@@ -107,11 +110,10 @@ bool ListEditor::contains(const std::string& entry) const
     return std::find(entries_.begin(), entries_.end(), entry) != entries_.end();
 }
 
-bool ListEditor::refuseNone(const char* title, const char* verb) const
+bool ListEditor::refuseNone(const char* title, const char* refusal) const
 {
     if (entries_[*selected_] != NoneEntry)
         return false;
-    dialogs_.message({std::string("The entry '<none>' is not allowd to ") + verb + ".", title, Buttons::Ok,
-                      Icon::Critical, Answer::Ok});
+    dialogs_.message({refusal, title, Buttons::Ok, Icon::Critical, Answer::Ok});
     return true;
 }

@@ -34,8 +34,8 @@ public:
 private:
     std::size_t insertSorted(const std::string& entry); // returns its row
     bool contains(const std::string& entry) const;
-    // Tells the user that "<none>" cannot be changed or deleted (verb) when it is the selected entry.
-    bool refuseNone(const char* title, const char* verb) const;
+    // Tells the user that "<none>" cannot be changed or deleted (refusal) when it is the selected entry.
+    bool refuseNone(const char* title, const char* refusal) const;
 
     ListKind kind_;
     StringList entries_;

@@ -3,15 +3,21 @@
 
 #include <iterator>
 
+#include "Dialogs.h"
 #include "Text.h"
 
 namespace {
 
 const ListKindInfo Infos[] = {
-    {"category.txt", " Category", "Please enter the new category", "New Category", "LoadCategories"},
-    {"parttype.txt", " Part Types", "Please enter the new part type", "New Part Type", "LoadPartTypes"},
-    {"bfc.txt", " BFC", "Please enter the new BFC Statement", "New BFC Statement", "LoadBFC"},
-    {"licenses.txt", " License Types", "Please enter the new license type", "New License Type", "LoadLicense"},
+    {"category.txt", Translatable("frmList", " Category"), Translatable("Messages", "Please enter the new category"),
+     Translatable("Messages", "New Category"), "LoadCategories"},
+    {"parttype.txt", Translatable("frmList", " Part Types"), Translatable("Messages", "Please enter the new part type"),
+     Translatable("Messages", "New Part Type"), "LoadPartTypes"},
+    {"bfc.txt", Translatable("frmList", " BFC"), Translatable("Messages", "Please enter the new BFC Statement"),
+     Translatable("Messages", "New BFC Statement"), "LoadBFC"},
+    {"licenses.txt", Translatable("frmList", " License Types"),
+     Translatable("Messages", "Please enter the new license type"), Translatable("Messages", "New License Type"),
+     "LoadLicense"},
 };
 
 // "technic BEAM" becomes "Technic Beam": official categories have a capital on every word.

@@ -5,6 +5,7 @@
 
 #include "HeaderHelp.h"
 #include "LspRanges.h"
+#include "RuleTexts.h"
 
 namespace {
 
@@ -302,6 +303,8 @@ nlohmann::json LanguageServer::hover(const Document& document, TextPosition posi
             if (!text.empty())
                 text += "\n\n";
             text += std::string(SeverityText(finding.severity)) + " " + finding.id + ": " + finding.message;
+            if (const auto* rule = FindRuleText(finding.id))
+                text += "\n" + RuleDescription(*rule);
         }
     if (text.empty())
         return nullptr;

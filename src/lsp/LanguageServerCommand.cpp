@@ -4,12 +4,14 @@
 #include <algorithm>
 #include <unistd.h>
 
+#include "CheckConfig.h"
 #include "CliFiles.h"
 #include "Clock.h"
 #include "ColourSource.h"
 #include "Dates.h"
 #include "EditCommandLine.h"
 #include "ListFolder.h"
+#include "PartSettings.h"
 #include "ServerLoop.h"
 #include "TextCheck.h"
 
@@ -36,9 +38,18 @@ int RunLanguageServer(const LanguageServerOptions& options, std::ostream& err)
         !ReadStandardList(ListKind::Bfc, lists.bfcStatements, err))
         return ExitStatus::Unreadable;
     lists.categories = CategoriesInForce(categories);
-    const CheckSetup checks{options.limitDescription, &categories, colours.get()};
-    setup.check = [&checks](const std::string& bytes, const std::string& path) {
-        return CheckPartText(bytes, path, checks);
+    const TrackerLists tracker{&categories, colours.get()};
+    CommandLineSettings given;
+    given.ldconfig = options.ldconfig;
+    given.noLengthLimit = !options.limitDescription;
+    setup.check = [&](const std::string& bytes, const std::string& path) {
+        // As check: the quillmark.toml nearest the document's folder. Read for each check, so that
+        // an edit of it counts from the next change on; a wrong one is told and not used.
+        CheckConfigs configs({}, true);
+        const auto config = configs.forPart(path);
+        if (config.error != nullptr)
+            err << "quillmark-cli: " << *config.error << '\n';
+        return CheckPartText(bytes, path, SettingsForPart(given, config.config, path), tracker);
     };
     // The repairs do not depend on the colour codes, as for fix: the built-in list serves the checks around them.
     const auto builtIn = ReadBuiltInColours(DataFileOfThisProgram(ProgramFolder(), BuiltInColoursFile));

@@ -1,6 +1,9 @@
 // SPDX-License-Identifier: MIT
 #include "LspRanges.h"
 
+#include "RuleTexts.h"
+#include "SarifLog.h"
+
 namespace {
 
 // The protocol's DiagnosticSeverity.
@@ -55,9 +58,12 @@ nlohmann::json FindingRangeJson(const Document& document, const FileFinding& fin
 
 nlohmann::json DiagnosticJson(const Document& document, const FileFinding& finding, PositionEncoding encoding)
 {
-    return {{"range", FindingRangeJson(document, finding, encoding)},
-            {"severity", severityNumber(finding.severity)},
-            {"code", finding.id},
-            {"source", "quillmark"},
-            {"message", finding.message}};
+    nlohmann::json diagnostic{{"range", FindingRangeJson(document, finding, encoding)},
+                              {"severity", severityNumber(finding.severity)},
+                              {"code", finding.id},
+                              {"source", "quillmark"},
+                              {"message", finding.message}};
+    if (const auto* rule = FindRuleText(finding.id))
+        diagnostic["codeDescription"] = {{"href", RuleHelpUri(*rule)}};
+    return diagnostic;
 }

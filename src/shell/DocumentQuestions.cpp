@@ -11,8 +11,9 @@ bool MayCloseWindow(AppState& app, Services& services, const std::string& newHea
 {
     if (!app.Header.FileChanged)
         return true;
-    const auto answer = services.dialogs.message({"Do you want to save the changes to the file?", "File Changed",
-                                                  Buttons::YesNoCancel, Icon::Question, Answer::Yes});
+    const auto answer = services.dialogs.message(
+        {Translatable("Messages", "Do you want to save the changes to the file?"),
+         Translatable("Messages", "File Changed"), Buttons::YesNoCancel, Icon::Question, Answer::Yes});
     if (answer != Answer::Yes)
         return answer == Answer::No;
     return FileSave(app.Header, newHeader, app.Prefs.MakeBackup, services.clock, services.dialogs).saved;
@@ -22,9 +23,9 @@ bool MayOpenAnotherFile(const AppState& app, Dialogs& dialogs, const std::functi
 {
     if (!app.Header.FileChanged)
         return true;
-    const auto answer =
-        dialogs.message({"The current file has been changed. Do you want to save the changes?",
-                         "Current File has changed", Buttons::YesNoCancel, Icon::Question, Answer::Yes});
+    const auto answer = dialogs.message(
+        {Translatable("Messages", "The current file has been changed. Do you want to save the changes?"),
+         Translatable("Messages", "Current File has changed"), Buttons::YesNoCancel, Icon::Question, Answer::Yes});
     if (answer != Answer::Yes)
         return answer == Answer::No;
     return saveWithChecks(); // a refused save keeps the edits and the file
@@ -34,22 +35,28 @@ bool MayEditList(ListKind kind, Dialogs& dialogs)
 {
     if (kind != ListKind::Category)
         return true;
-    return dialogs.message({"To change the category can result in an non LDraw conform part. Please change the "
-                            "category only if there is an official statement from LSC.\r\nDo you want to proceed?",
-                            "Category Change", Buttons::YesNo, Icon::Exclamation, Answer::No}) == Answer::Yes;
+    return dialogs.message(
+               {Translatable("Messages",
+                             "To change the category can result in an non LDraw conform part. Please "
+                             "change the category only if there is an official "
+                             "statement from LSC.") "\r\n" Translatable("Messages", "Do you want to proceed?"),
+                Translatable("Messages", "Category Change"), Buttons::YesNo, Icon::Exclamation, Answer::No}) ==
+           Answer::Yes;
 }
 
 bool TakePreferencesIntoRecord(AppState& app, Services& services, const ToFileText& toFile)
 {
     if (PreferencesHoldNoName(services.store)) {
-        services.dialogs.message(InformationBox("Your preferences hold no name yet, so the names in this file stay "
-                                                "as they are. Enter yours in Option › Preferences."));
+        services.dialogs.message(
+            InformationBox(Translatable("Messages", "Your preferences hold no name yet, so the names in this "
+                                                    "file stay as they are. Enter yours in Option › "
+                                                    "Preferences.")));
         return false;
     }
     const auto answer = services.dialogs.message(QuestionBox(
-        "Are you sure to subsitute the existing Real Name, Username and License Type with your values set in the "
-        "preferences?",
-        "Default Values"));
+        Translatable("Messages", "Are you sure to substitute the existing Real Name, Username and License Type with "
+                                 "your values set in the preferences?"),
+        Translatable("Messages", "Default Values")));
     if (answer != Answer::Yes)
         return false;
     LadeDefaults(app.Prefs, services.store);

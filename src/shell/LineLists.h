@@ -5,6 +5,7 @@
 #include <string>
 
 #include "Clock.h"
+#include "Dialogs.h"
 #include "HeaderData.h"
 
 // The keyword, comment and history lists as the window edits them: entries are stored trimmed,
@@ -20,4 +21,5 @@ void DeleteLineEntry(EntryList& list, std::size_t row);
 std::string HistoryStub(const LocalDateTime& today, const std::string& userName);
 
 inline constexpr const char* HistoryPrompt =
-    "Please enter !History string in the following format:\r\n'YYYY-MM-DD [Username] what's new/changed'";
+    Translatable("Messages", "Please enter !History string in the following format:") "\r\n" Translatable(
+        "Messages", "'YYYY-MM-DD [Username] what's new/changed'");

@@ -48,6 +48,12 @@ const ColourCodes& ColourSource::forPart(const std::string& partPath, const Repo
     return *found;
 }
 
+const ColourCodes& ColourSource::ofLDConfig(const std::string& path, const Report& report)
+{
+    const std::lock_guard lock(mutex_);
+    return readLDConfig(path, report);
+}
+
 const ColourCodes& ColourSource::readLDConfig(const std::string& path, const Report& report)
 {
     auto& codes = byFile_[path];

@@ -21,6 +21,8 @@ public:
 
     // report tells of an LDConfig.ldr found for this part that is unusable and was not told before.
     const ColourCodes& forPart(const std::string& partPath, const Report& report);
+    // The codes of the LDConfig.ldr at path, read once.
+    const ColourCodes& ofLDConfig(const std::string& path, const Report& report);
 
 private:
     const ColourCodes& readLDConfig(const std::string& path, const Report& report);

@@ -2,9 +2,11 @@
 #pragma once
 
 #include <QString>
+#include <cassert>
 #include <string>
 #include <vector>
 
+#include "RuleTexts.h"
 #include "TrackerCheck.h"
 
 // Collects the findings of one file in the order the rules run.
@@ -25,6 +27,8 @@ public:
 private:
     void add(const char* id, FindingLevel level, std::string text, int line)
     {
+        // Every id is explained (quillmark-cli explain, SARIF, docs/rules.md): a new rule brings its text.
+        assert(FindRuleText(id) != nullptr);
         list_.push_back({id, level, std::move(text), line});
     }
     std::vector<TrackerFinding> list_;

@@ -333,5 +333,8 @@ std::vector<TrackerFinding> CheckRecordForTracker(const HeaderData& header, cons
 {
     const auto slash = header.FilePath.rfind('/');
     const auto fileName = slash == std::string::npos ? header.FilePath : header.FilePath.substr(slash + 1);
-    return CheckForTracker(composedHeader + header.Body + "\r\n", fileName, categories, colours);
+    std::string text; // built in one piece: the body may be megabytes
+    text.reserve(composedHeader.size() + header.Body.size() + 2);
+    text.append(composedHeader).append(header.Body).append("\r\n");
+    return CheckForTracker(text, fileName, categories, colours);
 }

@@ -4,6 +4,10 @@
 #include <QChar>
 #include <algorithm>
 #include <array>
+#include <bit>
+#ifdef __SSE2__
+#include <emmintrin.h>
+#endif
 
 namespace {
 
@@ -28,8 +32,41 @@ bool isLineEmptiedByTheTracker(std::string_view line)
         return true;
     if (line.size() < 4 || line[0] != '0' || (line[1] != ' ' && line[1] != '\t'))
         return false;
-    const auto slashes = line.find_first_not_of(" \t", 1);
-    return line.substr(slashes, 2) == "//" && line.find_first_not_of(" \t", slashes + 2) == std::string_view::npos;
+    const auto slashes = line.find_first_not_of(" \t", 1); // none in "0" and blanks, a line the Tracker keeps
+    return slashes != std::string_view::npos && line.substr(slashes, 2) == "//" &&
+           line.find_first_not_of(" \t", slashes + 2) == std::string_view::npos;
+}
+
+constexpr std::size_t Block = 16;
+
+struct PlainRun {
+    std::size_t length = 0;   // the bytes from the start that are neither controls nor above 127
+    bool doubleSpace = false; // two spaces in a row among them (or the last and the byte after it)
+};
+
+// The run of ordinary bytes among the 16 at p, which neither end a line nor make it other than
+// plain but by two spaces in a row. Reads 17 bytes.
+PlainRun plainRunIn(const char* p)
+{
+    PlainRun run;
+#ifdef __SSE2__
+    const auto here = _mm_loadu_si128(reinterpret_cast<const __m128i*>(p));
+    const auto next = _mm_loadu_si128(reinterpret_cast<const __m128i*>(p + 1));
+    // As signed bytes, those above 127 are negative: below 14 are both them and the controls.
+    const auto stops = static_cast<unsigned>(_mm_movemask_epi8(_mm_cmplt_epi8(here, _mm_set1_epi8(14))));
+    const auto space = _mm_set1_epi8(' ');
+    const auto pairs = static_cast<unsigned>(
+        _mm_movemask_epi8(_mm_and_si128(_mm_cmpeq_epi8(here, space), _mm_cmpeq_epi8(next, space))));
+    run.length = stops == 0 ? Block : static_cast<std::size_t>(std::countr_zero(stops));
+    run.doubleSpace = (pairs & ((1u << run.length) - 1)) != 0;
+#else
+    while (run.length < Block && static_cast<unsigned char>(p[run.length]) >= 14 &&
+           static_cast<unsigned char>(p[run.length]) < 0x80) {
+        run.doubleSpace = run.doubleSpace || (p[run.length] == ' ' && p[run.length + 1] == ' ');
+        ++run.length;
+    }
+#endif
+    return run;
 }
 
 } // namespace
@@ -152,13 +189,29 @@ bool TrackerLines::next(TrackerLine& line)
     }();
     const auto* bytes = reinterpret_cast<const unsigned char*>(text_.data());
     unsigned char seen = 0, previous = 0;
-    for (const auto size = text_.size(); pos_ < size; ++pos_) {
-        const auto kind = kinds[bytes[pos_]];
-        if ((kind & MayBreak) != 0 && (breakLength = BreakLength(text_.substr(pos_))) != 0)
+    auto pos = pos_;
+    for (const auto size = text_.size(); pos < size; ++pos) {
+        // Most bytes are ordinary ones, passed over sixteen at a time.
+        while (pos + Block + 1 <= size) {
+            const auto run = plainRunIn(text_.data() + pos);
+            if (run.length == 0)
+                break;
+            // A run never starts after a space it could pair with: a run of 16 that ends in one has
+            // had the byte after it compared.
+            if (run.doubleSpace)
+                seen |= NotPlain;
+            previous = kinds[bytes[pos + run.length - 1]];
+            pos += run.length;
+        }
+        if (pos >= size)
+            break;
+        const auto kind = kinds[bytes[pos]];
+        if ((kind & MayBreak) != 0 && (breakLength = BreakLength(text_.substr(pos))) != 0)
             break;
         seen |= kind | ((kind & previous & Space) != 0 ? NotPlain : 0);
         previous = kind;
     }
+    pos_ = pos;
     line.plain = (seen & NotPlain) == 0;
     const auto end = pos_;
     pos_ += breakLength;

@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 #include "FileText.h"
 
+#include "Dialogs.h"
 #include "Text.h"
 
 namespace {
@@ -40,6 +41,10 @@ QString ListEntryToWidget(const std::string& bytes) { return ToWidget(bytes, Enc
 
 std::string UnencodableMessage()
 {
-    return "This file is written in ISO-8859-1, which cannot hold a character you typed.\r\n"
-           "The text was not changed.";
+    return Translatable(
+        "Messages",
+        "This file is written in ISO-8859-1, which cannot hold a character you typed.") "\r\n" Translatable("Messages",
+                                                                                                            "The text "
+                                                                                                            "was not "
+                                                                                                            "changed.");
 }

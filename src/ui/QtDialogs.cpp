@@ -1,6 +1,7 @@
 // SPDX-License-Identifier: MIT
 #include "QtDialogs.h"
 
+#include <QCoreApplication>
 #include <QEvent>
 #include <QFileDialog>
 #include <QInputDialog>
@@ -10,6 +11,17 @@
 namespace {
 
 QString text(const std::string& utf8) { return QString::fromUtf8(utf8.data(), static_cast<qsizetype>(utf8.size())); }
+
+// The text in the window's language, line by line: a message is often a sentence of its own
+// followed by another ("... \r\nSaving the file is not possible"). Lines naming a file or a value
+// stay as they are.
+QString shown(const std::string& utf8)
+{
+    auto lines = text(utf8).split("\r\n");
+    for (auto& line : lines)
+        line = QCoreApplication::translate("Messages", line.toUtf8().constData());
+    return lines.join("\r\n");
+}
 
 QMessageBox::StandardButton qtButton(Answer answer)
 {
@@ -102,7 +114,7 @@ private:
 
 Answer QtDialogs::message(const MessageBox& box)
 {
-    QMessageBox dialog(qtIcon(box.icon), text(box.title), text(box.text), qtButtons(box.buttons), parent_);
+    QMessageBox dialog(qtIcon(box.icon), shown(box.title), shown(box.text), qtButtons(box.buttons), parent_);
     dialog.setDefaultButton(qtButton(box.defaultButton));
     new PlacedOnShow(dialog, parent_); // owned by the dialog
     return answerOf(dialog.exec(), box.buttons);
@@ -111,8 +123,8 @@ Answer QtDialogs::message(const MessageBox& box)
 std::string QtDialogs::input(const std::string& prompt, const std::string& title, const std::string& defaultText)
 {
     QInputDialog dialog(parent_);
-    dialog.setWindowTitle(text(title));
-    dialog.setLabelText(text(prompt));
+    dialog.setWindowTitle(shown(title));
+    dialog.setLabelText(shown(prompt));
     dialog.setTextValue(text(defaultText));
     new PlacedOnShow(dialog, parent_); // owned by the dialog
     return dialog.exec() == QDialog::Accepted ? dialog.textValue().toStdString() : std::string();
@@ -120,7 +132,7 @@ std::string QtDialogs::input(const std::string& prompt, const std::string& title
 
 std::optional<std::string> QtDialogs::openFile(const OpenFileRequest& request)
 {
-    QFileDialog dialog(parent_, text(request.title), text(request.startFolder), text(request.filter));
+    QFileDialog dialog(parent_, shown(request.title), text(request.startFolder), shown(request.filter));
     // Qt's own dialog works with every event loop and desktop.
     dialog.setOption(QFileDialog::DontUseNativeDialog);
     dialog.setFileMode(QFileDialog::ExistingFile);

@@ -39,8 +39,8 @@ void WidenToShowCaption(QWidget& control, int rightEdge = -1);
 
 // The same for a control that shows a caption (label, button, check box, frame).
 template <typename Widget>
-Widget* PlaceCaptioned(QWidget* parent, const char* name, const char* caption, int left, int top, int width, int height,
-                       double scale = 1)
+Widget* PlaceCaptioned(QWidget* parent, const char* name, const QString& caption, int left, int top, int width,
+                       int height, double scale = 1)
 {
     auto* widget = PlaceChild<Widget>(parent, name, left, top, width, height, scale);
     if constexpr (requires { widget->setTitle(caption); })
@@ -52,7 +52,8 @@ Widget* PlaceCaptioned(QWidget* parent, const char* name, const char* caption, i
 }
 
 // One control of a window's table: the member that holds it (its type says which control it
-// is), its name, its caption (nullptr for controls without one) and its place in twips.
+// is), its name, its caption (nullptr for controls without one; marked with QT_TR_NOOP, shown in
+// the window's language) and its place in twips.
 template <typename Window, typename... Widgets>
 struct ControlRow {
     std::variant<Widgets * Window::*...> member;
@@ -75,8 +76,8 @@ void BuildControls(Window& window, QWidget* parent, const Rows& rows)
                 || requires(Widget * w) { w->setTitle(QString()); };
                 if constexpr (captioned) {
                     if (row.caption != nullptr) {
-                        window.*member = PlaceCaptioned<Widget>(parent, row.name, row.caption, row.left, row.top,
-                                                                row.width, row.height, scale);
+                        window.*member = PlaceCaptioned<Widget>(parent, row.name, Window::tr(row.caption), row.left,
+                                                                row.top, row.width, row.height, scale);
                         return;
                     }
                 }

@@ -33,6 +33,7 @@ void WindowProgress::lineProgress(std::size_t linesRead)
 {
     if (linesRead != 0 && sinceLastPaint_.isValid() && sinceLastPaint_.elapsed() < FrameMilliseconds)
         return;
-    statusLine_.setText(QString::fromStdString(ProgressCaption(linesRead)));
+    statusLine_.setText(QCoreApplication::translate("WindowProgress", "Parsing file. Line %1. Please wait...")
+                            .arg(static_cast<qulonglong>(linesRead)));
     sinceLastPaint_.start();
 }

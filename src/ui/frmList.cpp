@@ -16,20 +16,20 @@ frmList::frmList(ListKind kind, const StringList& entries, const std::string& pr
     : QDialog(parent), editor_(kind, entries, programFolder, dialogs)
 {
     setObjectName("frmList");
-    setWindowTitle(QString("List") + InfoOf(kind).captionSuffix);
+    setWindowTitle(tr("List") + tr(InfoOf(kind).captionSuffix));
     setModal(true);
     const double scale = LayoutScale(font());
     setMinimumSize(Pixels(6645, scale), Pixels(4155, scale));
     resize(minimumSize());
     using Row = ControlRow<frmList, QGroupBox, QListWidget, QPushButton, QLineEdit>;
     static const Row rows[] = {
-        {&frmList::Frame1, "Frame1", "Current Values", 120, 840, 4935, 3255},
+        {&frmList::Frame1, "Frame1", QT_TR_NOOP("Current Values"), 120, 840, 4935, 3255},
         {&frmList::lsValues, "lsValues", nullptr, 120, 240, 4695, 2790}, // inside Frame1
-        {&frmList::cmdChange, "cmdChange", "Update", 5160, 480, 1335, 375},
-        {&frmList::cmdAdd, "cmdAdd", "Add", 5160, 1200, 1335, 375},
-        {&frmList::cmdClose, "cmdClose", "Close", 5160, 2160, 1335, 375},
+        {&frmList::cmdChange, "cmdChange", QT_TR_NOOP("Update"), 5160, 480, 1335, 375},
+        {&frmList::cmdAdd, "cmdAdd", QT_TR_NOOP("Add"), 5160, 1200, 1335, 375},
+        {&frmList::cmdClose, "cmdClose", QT_TR_NOOP("Close"), 5160, 2160, 1335, 375},
         {&frmList::txUpdate, "txUpdate", nullptr, 240, 480, 4695, 285},
-        {&frmList::cmdDelete, "cmdDelete", "Delete", 5160, 1680, 1335, 375},
+        {&frmList::cmdDelete, "cmdDelete", QT_TR_NOOP("Delete"), 5160, 1680, 1335, 375},
     };
     BuildControls(*this, this, rows);
     lsValues->setParent(Frame1); // its place is inside the frame

@@ -83,43 +83,43 @@ void frmMain::createControls()
 {
     using Row = ControlRow<frmMain, QLabel, QLineEdit, QComboBox, QListWidget, QPushButton, QPlainTextEdit, QFrame>;
     static const Row rows[] = {
-        {&frmMain::Label1, "Label1", "Part Description:", 120, 120, 1335, 255},
+        {&frmMain::Label1, "Label1", QT_TR_NOOP("Part Description:"), 120, 120, 1335, 255},
         {&frmMain::txPartDescription, "txPartDescription", nullptr, 1560, 120, 6375, 285},
-        {&frmMain::lblLength, "lblLength", "Length:", 8160, 120, 975, 255},
-        {&frmMain::Label2_0, "Label2_0", "File Name:", 120, 480, 1335, 255},
+        {&frmMain::lblLength, "lblLength", QT_TR_NOOP("Length:"), 8160, 120, 975, 255},
+        {&frmMain::Label2_0, "Label2_0", QT_TR_NOOP("File Name:"), 120, 480, 1335, 255},
         {&frmMain::txFileName, "txFileName", nullptr, 1560, 480, 7575, 285},
-        {&frmMain::Label2_1, "Label2_1", "Author:", 120, 840, 1335, 255},
-        {&frmMain::Label4, "Label4", "Real Name", 1560, 840, 855, 255},
+        {&frmMain::Label2_1, "Label2_1", QT_TR_NOOP("Author:"), 120, 840, 1335, 255},
+        {&frmMain::Label4, "Label4", QT_TR_NOOP("Real Name"), 1560, 840, 855, 255},
         {&frmMain::txAuthorRealName, "txAuthorRealName", nullptr, 2520, 840, 3015, 285},
-        {&frmMain::Label3, "Label3", "Username:", 5640, 840, 855, 255},
+        {&frmMain::Label3, "Label3", QT_TR_NOOP("Username:"), 5640, 840, 855, 255},
         {&frmMain::txAuthorUserName, "txAuthorUserName", nullptr, 6600, 840, 2535, 285},
-        {&frmMain::Label2_2, "Label2_2", "Part Type:", 120, 1200, 1335, 255},
+        {&frmMain::Label2_2, "Label2_2", QT_TR_NOOP("Part Type:"), 120, 1200, 1335, 255},
         {&frmMain::cbPartTypes, "cbPartTypes", nullptr, 1560, 1200, 7575, 315},
-        {&frmMain::Label2_3, "Label2_3", "Liscense Type:", 120, 1560, 1335, 255},
+        {&frmMain::Label2_3, "Label2_3", QT_TR_NOOP("License Type:"), 120, 1560, 1335, 255},
         {&frmMain::cbLicenses, "cbLicenses", nullptr, 1560, 1560, 6135, 315},
-        {&frmMain::cmdSetPreferences, "cmdSetPreferences", "Set Preferences", 7800, 1560, 1335, 255},
-        {&frmMain::Label6, "Label6", "BFC Statement", 120, 1920, 1335, 255},
+        {&frmMain::cmdSetPreferences, "cmdSetPreferences", QT_TR_NOOP("Set Preferences"), 7800, 1560, 1335, 255},
+        {&frmMain::Label6, "Label6", QT_TR_NOOP("BFC Statement"), 120, 1920, 1335, 255},
         {&frmMain::cbBFCStatement, "cbBFCStatement", nullptr, 1560, 1920, 7575, 315},
-        {&frmMain::Label8, "Label8", "Category", 120, 2280, 1335, 255},
+        {&frmMain::Label8, "Label8", QT_TR_NOOP("Category"), 120, 2280, 1335, 255},
         {&frmMain::cbCategory, "cbCategory", nullptr, 1560, 2280, 7575, 315},
-        {&frmMain::Label9, "Label9", "Keywords", 120, 2640, 1335, 255},
+        {&frmMain::Label9, "Label9", QT_TR_NOOP("Keywords"), 120, 2640, 1335, 255},
         {&frmMain::lsKeyWords, "lsKeyWords", nullptr, 1560, 2640, 3855, 840},
-        {&frmMain::cmdEdit, "cmdEdit", "Edit", 5520, 2640, 735, 255},
-        {&frmMain::cmdAdd, "cmdAdd", "Add", 5520, 2880, 735, 255},
-        {&frmMain::cmdDelete, "cmdDelete", "Delete", 5520, 3240, 735, 255},
-        {&frmMain::Label11, "Label11", "Comments", 6600, 2640, 2415, 255},
+        {&frmMain::cmdEdit, "cmdEdit", QT_TR_NOOP("Edit"), 5520, 2640, 735, 255},
+        {&frmMain::cmdAdd, "cmdAdd", QT_TR_NOOP("Add"), 5520, 2880, 735, 255},
+        {&frmMain::cmdDelete, "cmdDelete", QT_TR_NOOP("Delete"), 5520, 3240, 735, 255},
+        {&frmMain::Label11, "Label11", QT_TR_NOOP("Comments"), 6600, 2640, 2415, 255},
         {&frmMain::lsComments, "lsComments", nullptr, 6480, 2880, 2655, 1035},
-        {&frmMain::Label10, "Label10", "History", 120, 3600, 1335, 255},
+        {&frmMain::Label10, "Label10", QT_TR_NOOP("History"), 120, 3600, 1335, 255},
         {&frmMain::lsHistory, "lsHistory", nullptr, 1560, 3600, 3855, 840},
-        {&frmMain::cmdHistoryEdit, "cmdHistoryEdit", "Edit", 5520, 3600, 735, 255},
-        {&frmMain::cmdHistoryAdd, "cmdHistoryAdd", "Add", 5520, 3840, 735, 255},
-        {&frmMain::cmdHistoryDelete, "cmdHistoryDelete", "Delete", 5520, 4200, 735, 255},
-        {&frmMain::cmdCommentsEdit, "cmdCommentsEdit", "Edit", 6480, 4200, 735, 255},
-        {&frmMain::cmdCommentsAdd, "cmdCommentsAdd", "Add", 7440, 4200, 735, 255},
-        {&frmMain::cmdCommentsDelete, "cmdCommentsDelete", "Delete", 8400, 4200, 735, 255},
-        {&frmMain::Label7, "Label7", "New Header:", 120, 4680, 1335, 255},
+        {&frmMain::cmdHistoryEdit, "cmdHistoryEdit", QT_TR_NOOP("Edit"), 5520, 3600, 735, 255},
+        {&frmMain::cmdHistoryAdd, "cmdHistoryAdd", QT_TR_NOOP("Add"), 5520, 3840, 735, 255},
+        {&frmMain::cmdHistoryDelete, "cmdHistoryDelete", QT_TR_NOOP("Delete"), 5520, 4200, 735, 255},
+        {&frmMain::cmdCommentsEdit, "cmdCommentsEdit", QT_TR_NOOP("Edit"), 6480, 4200, 735, 255},
+        {&frmMain::cmdCommentsAdd, "cmdCommentsAdd", QT_TR_NOOP("Add"), 7440, 4200, 735, 255},
+        {&frmMain::cmdCommentsDelete, "cmdCommentsDelete", QT_TR_NOOP("Delete"), 8400, 4200, 735, 255},
+        {&frmMain::Label7, "Label7", QT_TR_NOOP("New Header:"), 120, 4680, 1335, 255},
         {&frmMain::txNewHeader, "txNewHeader", nullptr, 1560, 4560, 7575, 1815},
-        {&frmMain::Label5, "Label5", "Old Header:", 120, 6600, 1335, 255},
+        {&frmMain::Label5, "Label5", QT_TR_NOOP("Old Header:"), 120, 6600, 1335, 255},
         {&frmMain::txOldHeader, "txOldHeader", nullptr, 1560, 6480, 7575, 1695},
         {&frmMain::lblStatuszeile, "lblStatuszeile", "", 120, 8280, 6735, 255},
         {&frmMain::Line1, "Line1", nullptr, 0, 0, 9240, 15},
@@ -152,35 +152,35 @@ void frmMain::createMenus()
         QKeySequence ownShortcut = {};                                 // where no standard key fits
     };
     static const std::pair<const char*, const char*> menus[] = {
-        {"MDatei", "F&ile"}, {"MEdit", "&Edit"}, {"MEinstellungen", "&Option"}};
+        {"MDatei", QT_TR_NOOP("F&ile")}, {"MEdit", QT_TR_NOOP("&Edit")}, {"MEinstellungen", QT_TR_NOOP("&Option")}};
     static const MenuRow items[] = {
-        {"MDatei", &frmMain::MDateiOeffnen, "MDateiOeffnen", "O&pen", &frmMain::MDateiOeffnen_Click,
+        {"MDatei", &frmMain::MDateiOeffnen, "MDateiOeffnen", QT_TR_NOOP("O&pen"), &frmMain::MDateiOeffnen_Click,
          QKeySequence::Open},
-        {"MDatei", &frmMain::MDateiSpeichern, "MDateiSpeichern", "&Save", &frmMain::MDateiSpeichern_Click,
+        {"MDatei", &frmMain::MDateiSpeichern, "MDateiSpeichern", QT_TR_NOOP("&Save"), &frmMain::MDateiSpeichern_Click,
          QKeySequence::Save},
-        {"MDatei", &frmMain::MTrackerCheck, "MTrackerCheck", "Check for the Parts &Tracker",
+        {"MDatei", &frmMain::MTrackerCheck, "MTrackerCheck", QT_TR_NOOP("Check for the Parts &Tracker"),
          &frmMain::MTrackerCheck_Click, QKeySequence::UnknownKey, QKeySequence(Qt::CTRL | Qt::Key_T)},
         {"MDatei", nullptr, "MDateiTrenner2", nullptr, nullptr},
-        {"MDatei", &frmMain::MDateiBeenden, "MDateiBeenden", "E&xit", &frmMain::MDateiBeenden_Click,
+        {"MDatei", &frmMain::MDateiBeenden, "MDateiBeenden", QT_TR_NOOP("E&xit"), &frmMain::MDateiBeenden_Click,
          QKeySequence::Quit},
-        {"MEdit", &frmMain::MEditCategory, "MEditCategory", "&Category", &frmMain::MEditCategory_Click},
-        {"MEdit", &frmMain::MEditPartTyps, "MEditPartTyps", "&Part Types", &frmMain::MEditPartTyps_Click},
-        {"MEdit", &frmMain::MEditBFCStatement, "MEditBFCStatement", "&BFC Statements",
+        {"MEdit", &frmMain::MEditCategory, "MEditCategory", QT_TR_NOOP("&Category"), &frmMain::MEditCategory_Click},
+        {"MEdit", &frmMain::MEditPartTyps, "MEditPartTyps", QT_TR_NOOP("&Part Types"), &frmMain::MEditPartTyps_Click},
+        {"MEdit", &frmMain::MEditBFCStatement, "MEditBFCStatement", QT_TR_NOOP("&BFC Statements"),
          &frmMain::MEditBFCStatement_Click},
-        {"MEdit", &frmMain::MEditLicense, "MEditLicense", "&License Types", &frmMain::MEditLicense_Click},
-        {"MEinstellungen", &frmMain::MEinstellDefault, "MEinstellDefault", "Preferences",
+        {"MEdit", &frmMain::MEditLicense, "MEditLicense", QT_TR_NOOP("&License Types"), &frmMain::MEditLicense_Click},
+        {"MEinstellungen", &frmMain::MEinstellDefault, "MEinstellDefault", QT_TR_NOOP("Preferences"),
          &frmMain::MEinstellDefault_Click},
         {nullptr, &frmMain::MInfo, "MInfo", "?", &frmMain::MInfo_Click, QKeySequence::HelpContents},
     };
     for (const auto& [name, caption] : menus)
-        menuBar()->addMenu(caption)->setObjectName(name);
+        menuBar()->addMenu(tr(caption))->setObjectName(name);
     for (const auto& item : items) {
         auto* menu = item.menu ? menuBar()->findChild<QMenu*>(item.menu) : nullptr;
         if (item.member == nullptr) {
             menu->addSeparator()->setObjectName(item.name);
             continue;
         }
-        auto* action = menu ? menu->addAction(item.caption) : menuBar()->addAction(item.caption);
+        auto* action = menu ? menu->addAction(tr(item.caption)) : menuBar()->addAction(tr(item.caption));
         action->setObjectName(item.name);
         auto keys = shortcutsFor(item.shortcut);
         if (!item.ownShortcut.isEmpty())
@@ -332,7 +332,7 @@ void frmMain::StartUp(const QStringList& arguments)
     fillComboBoxes();
     baseTitle_ = "Quillmark " + versionText();
     setWindowTitle(QString::fromStdString(baseTitle_));
-    lblStatuszeile->setText("Welcome to Quillmark programm.");
+    lblStatuszeile->setText(tr("Welcome to the Quillmark program."));
     // The shell hands the arguments over already split: the first one is the path, blanks and all.
     // It is remembered in full, so that the recent files still find it from another folder.
     app_.PendingFile =
@@ -345,6 +345,7 @@ void frmMain::StartUp(const QStringList& arguments)
 
 void frmMain::MInfo_Click()
 {
-    services_.dialogs.message(InformationBox("Quillmark Version: " + versionText() + "\r\n" + "Copyright " +
-                                             QUILLMARK_COPYRIGHT_YEARS + " " + QUILLMARK_COPYRIGHT_HOLDER));
+    const auto version = tr("Quillmark Version: %1").arg(QString::fromStdString(versionText()));
+    const auto copyright = tr("Copyright %1 %2").arg(QUILLMARK_COPYRIGHT_YEARS, QUILLMARK_COPYRIGHT_HOLDER);
+    services_.dialogs.message(InformationBox((version + "\r\n" + copyright).toStdString()));
 }

@@ -57,11 +57,15 @@ void frmMain::connectHandlers()
             if (index >= 0)
                 updateComboField(*combo, app_.Header.*field);
         });
-    static const LineForm keywordAdd{"Please enter your Keyword with comma separated.", "Keywords"};
-    static const LineForm keywordEdit{"Please change your Keywords like you wish.", "Keywords"};
-    static const LineForm commentAdd{"Please enter your Comment", "Comment"};
-    static const LineForm commentEdit{"Please enter Comments", "Comments"};
-    static const LineForm history{HistoryPrompt, "History", true};
+    static const LineForm keywordAdd{Translatable("Messages", "Please enter your Keyword with comma separated."),
+                                     Translatable("Messages", "Keywords")};
+    static const LineForm keywordEdit{Translatable("Messages", "Please change your Keywords like you wish."),
+                                      Translatable("Messages", "Keywords")};
+    static const LineForm commentAdd{Translatable("Messages", "Please enter your Comment"),
+                                     Translatable("Messages", "Comment")};
+    static const LineForm commentEdit{Translatable("Messages", "Please enter Comments"),
+                                      Translatable("Messages", "Comments")};
+    static const LineForm history{HistoryPrompt, Translatable("Messages", "History"), true};
     connect(cmdAdd, &QPushButton::clicked, this, [this] { addLine(app_.Header.Keywords, keywordAdd, ""); });
     connect(cmdEdit, &QPushButton::clicked, this, [this] { editLine(app_.Header.Keywords, *lsKeyWords, keywordEdit); });
     connect(cmdDelete, &QPushButton::clicked, this, [this] { deleteLine(app_.Header.Keywords, *lsKeyWords); });
@@ -168,7 +172,7 @@ void frmMain::MakeNewHeader()
 void frmMain::showLength()
 {
     const auto length = txPartDescription->text().toUcs4().size();
-    lblLength->setText(QString("Length: %1").arg(length));
+    lblLength->setText(tr("Length: %1").arg(length));
     const bool tooLong = app_.Prefs.LimitDescription && static_cast<std::size_t>(length) > DescriptionLimit;
     lblLength->setStyleSheet(tooLong ? "background-color: rgb(255, 0, 0);" : "background-color: rgb(0, 255, 0);");
 }

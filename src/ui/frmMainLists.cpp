@@ -46,10 +46,10 @@ std::string frmMain::askForLine(const LineForm& form, const std::string& default
         if (!form.history || TrimBlanks(typed).empty() || inTrackerHistoryForm(typed))
             return typed;
         const auto keep = services_.dialogs.message(
-            {"The Parts Tracker takes history lines only as \"YYYY-MM-DD [user] what changed\" (or {Real Name} "
-             "in place of [user]), and would refuse\r\n" +
-                 typed + "\r\nKeep it as it is?",
-             "History", Buttons::YesNo, Icon::Exclamation, Answer::No});
+            {Translatable("Messages", "The Parts Tracker takes history lines only as \"YYYY-MM-DD [user] what "
+                                      "changed\" (or {Real Name} in place of [user]), and would refuse") "\r\n" +
+                 typed + "\r\n" + Translatable("Messages", "Keep it as it is?"),
+             Translatable("Messages", "History"), Buttons::YesNo, Icon::Exclamation, Answer::No});
         if (keep == Answer::Yes)
             return typed;
     }

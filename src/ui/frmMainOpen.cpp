@@ -48,8 +48,9 @@ void frmMain::MDateiOeffnen_Click()
     std::string path = app_.PendingFile;
     app_.PendingFile.clear();
     if (path.empty()) {
-        const auto chosen =
-            services_.dialogs.openFile({"Load DAT-File", "LDraw DAT-File (*.dat)", "dat", app_.Header.FileFolder});
+        const auto chosen = services_.dialogs.openFile({Translatable("Messages", "Load DAT-File"),
+                                                        Translatable("Messages", "LDraw DAT-File (*.dat)"), "dat",
+                                                        app_.Header.FileFolder});
         if (!chosen)
             return; // Cancel: the file the user was working on stays open
         path = *chosen;
@@ -90,7 +91,7 @@ void frmMain::readChosenFile(const std::string& path, OpenRoad road)
 {
     const bool firstFile = !app_.Header.FileLoaded;
     app_.Header.Loading = true;
-    lblStatuszeile->setText("Parsing file. Please wait...");
+    lblStatuszeile->setText(tr("Parsing file. Please wait..."));
     const bool opened = LadeDATDateiCommandLine(app_, path, road, services_, *progress_);
     lblStatuszeile->setText("");
     if (!opened) { // the document that was open stays, untouched
@@ -253,10 +254,12 @@ SaveResult frmMain::checkHeaderAndSave()
 
 void frmMain::showSaved(const std::string& backupPath)
 {
-    std::string status = "Saved " + app_.Header.FilePath;
+    const auto name = [](const std::string& path) { return QFile::decodeName(QByteArray::fromStdString(path)); };
+    auto status = tr("Saved %1").arg(name(app_.Header.FilePath));
     if (!backupPath.empty())
-        status += " (backup " + DateiNurName(backupPath, services_.dialogs) + ")";
-    lblStatuszeile->setText(QFile::decodeName(QByteArray::fromStdString(status)) + "; " + trackerSummary());
+        status = tr("Saved %1 (backup %2)")
+                     .arg(name(app_.Header.FilePath), name(DateiNurName(backupPath, services_.dialogs)));
+    lblStatuszeile->setText(status + "; " + trackerSummary());
     showModified();
 }
 
@@ -270,7 +273,7 @@ void frmMain::showDescriptionTooLong()
     for (std::size_t character = 0; character < DescriptionLimit && start < text.size(); ++character)
         start += text.at(start).isHighSurrogate() && start + 1 < text.size() ? 2 : 1;
     txPartDescription->setSelection(start, static_cast<int>(text.size()) - start);
-    lblLength->setText(QString("Length: %1").arg(text.toUcs4().size()));
+    lblLength->setText(tr("Length: %1").arg(text.toUcs4().size()));
 }
 
 void frmMain::closeEvent(QCloseEvent* event)

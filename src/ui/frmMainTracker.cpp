@@ -17,9 +17,10 @@
 
 namespace {
 
-QString counted(long long count, const char* thing)
+// "1 error", "2 errors": one form for one thing, the other for any other number.
+QString counted(long long count, const QString& one, const QString& many)
 {
-    return QString("%1 %2%3").arg(count).arg(thing).arg(count == 1 ? "" : "s");
+    return (count == 1 ? one : many).arg(count);
 }
 
 } // namespace
@@ -102,17 +103,17 @@ QString frmMain::trackerSummary()
     try {
         findings = trackerFindings([](const std::string&) {});
     } catch (const std::exception&) { // the file is saved all the same; the dialog tells what failed
-        return "Parts Tracker: not checked (" + MTrackerCheck->shortcut().toString() + ")";
+        return tr("Parts Tracker: not checked (%1)").arg(MTrackerCheck->shortcut().toString());
     }
     if (findings.empty())
-        return "Parts Tracker: no findings";
+        return tr("Parts Tracker: no findings");
     const auto errors = std::count_if(findings.begin(), findings.end(),
                                       [](const TrackerFinding& f) { return f.level == FindingLevel::Error; });
     const auto warnings = static_cast<long long>(findings.size()) - errors;
     QStringList counts;
     if (errors > 0)
-        counts << counted(errors, "error");
+        counts << counted(errors, tr("%1 error"), tr("%1 errors"));
     if (warnings > 0)
-        counts << counted(warnings, "warning");
-    return "Parts Tracker: " + counts.join(", ") + " (" + MTrackerCheck->shortcut().toString() + ")";
+        counts << counted(warnings, tr("%1 warning"), tr("%1 warnings"));
+    return tr("Parts Tracker: %1 (%2)").arg(counts.join(", "), MTrackerCheck->shortcut().toString());
 }

@@ -12,21 +12,21 @@
 frmOption::frmOption(const PreferencesForm& form, const QStringList& sortedLicenses, QWidget* parent) : QDialog(parent)
 {
     setObjectName("frmOption");
-    setWindowTitle("Preferences");
+    setWindowTitle(tr("Preferences"));
     setModal(true);
     const double scale = LayoutScale(font());
     setFixedSize(Pixels(7455, scale), Pixels(2250, scale));
     using Row = ControlRow<frmOption, QLabel, QLineEdit, QPushButton, QComboBox, QCheckBox>;
     static const Row rows[] = {
-        {&frmOption::Label1, "Label1", "Your Real Name", 120, 240, 1215, 255},
+        {&frmOption::Label1, "Label1", QT_TR_NOOP("Your Real Name"), 120, 240, 1215, 255},
         {&frmOption::txRealName, "txRealName", nullptr, 1560, 240, 4455, 285},
-        {&frmOption::Label2_0, "Label2_0", "Your Username", 120, 600, 1215, 255},
+        {&frmOption::Label2_0, "Label2_0", QT_TR_NOOP("Your Username"), 120, 600, 1215, 255},
         {&frmOption::txUserName, "txUserName", nullptr, 1560, 600, 4455, 285},
-        {&frmOption::cmdSave, "cmdSave", "&Save", 6240, 240, 1095, 375},
-        {&frmOption::cmdCancel, "cmdCancel", "&Cancel", 6240, 720, 1095, 375},
+        {&frmOption::cmdSave, "cmdSave", QT_TR_NOOP("&Save"), 6240, 240, 1095, 375},
+        {&frmOption::cmdCancel, "cmdCancel", QT_TR_NOOP("&Cancel"), 6240, 720, 1095, 375},
         {&frmOption::cbLicenses, "cbLicenses", nullptr, 1560, 960, 4455, 315},
-        {&frmOption::Label2_3, "Label2_3", "Liscense Type:", 120, 960, 1335, 255},
-        {&frmOption::chkBackup, "chkBackup", "Backup file", 120, 1440, 1695, 255},
+        {&frmOption::Label2_3, "Label2_3", QT_TR_NOOP("License Type:"), 120, 960, 1335, 255},
+        {&frmOption::chkBackup, "chkBackup", QT_TR_NOOP("Backup file"), 120, 1440, 1695, 255},
         {&frmOption::chkDescriptionLimit, "chkDescriptionLimit", DescriptionLimitCaption, 120, 1800, 4455, 255},
     };
     BuildControls(*this, this, rows);
@@ -58,7 +58,7 @@ void frmOption::explainNames()
 {
     const double scale = LayoutScale(font());
     PlaceCaptioned<QLabel>(this, "lblNamesUse",
-                           "Your names go into the Author line of the parts you save and into new History lines.", 120,
-                           2160, 7215, 255, scale);
+                           tr("Your names go into the Author line of the parts you save and into new History lines."),
+                           120, 2160, 7215, 255, scale);
     setFixedSize(width(), Pixels(2520, scale));
 }

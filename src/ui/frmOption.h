@@ -12,7 +12,8 @@ class QLineEdit;
 class QPushButton;
 
 // The check box that limits the description, named where a refusal tells how to lift the limit.
-inline constexpr const char* DescriptionLimitCaption = "Limit Part Description to 64 characters";
+inline constexpr const char* DescriptionLimitCaption =
+    QT_TRANSLATE_NOOP("frmOption", "Limit Part Description to 64 characters");
 
 // The preferences window: the author's names, default licence, backup and description-limit choices.
 class frmOption : public QDialog {

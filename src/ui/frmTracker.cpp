@@ -30,9 +30,9 @@ QString verdict(const std::vector<TrackerFinding>& findings)
     const auto errors = std::count_if(findings.begin(), findings.end(),
                                       [](const TrackerFinding& f) { return f.level == FindingLevel::Error; });
     if (findings.empty())
-        return "Nothing to fix: the Parts Tracker's rules find nothing.";
-    return errors == 0 ? "The Parts Tracker would accept this file, with the warnings below."
-                       : QString("The Parts Tracker would refuse this file: %1 error(s) to fix.").arg(errors);
+        return frmTracker::tr("Nothing to fix: the Parts Tracker's rules find nothing.");
+    return errors == 0 ? frmTracker::tr("The Parts Tracker would accept this file, with the warnings below.")
+                       : frmTracker::tr("The Parts Tracker would refuse this file: %1 error(s) to fix.").arg(errors);
 }
 
 // Errors before warnings, then by id, then by line.
@@ -61,7 +61,7 @@ frmTracker::frmTracker(const std::vector<TrackerFinding>& findings, const QStrin
     : QDialog(parent), filePath_(filePath), repair_(std::move(repair))
 {
     setObjectName("frmTracker");
-    setWindowTitle("Check for the Parts Tracker");
+    setWindowTitle(tr("Check for the Parts Tracker"));
     setModal(true);
     resize(Pixels(9240), Pixels(4200));
     lblVerdict = new QLabel(verdict(findings), this);
@@ -69,9 +69,9 @@ frmTracker::frmTracker(const std::vector<TrackerFinding>& findings, const QStrin
     lblVerdict->setWordWrap(true);
     tbFindings = new QTableWidget(this);
     tbFindings->setObjectName("tbFindings");
-    cmdCopy = new QPushButton("Copy", this);
+    cmdCopy = new QPushButton(tr("Copy"), this);
     cmdCopy->setObjectName("cmdCopy");
-    cmdClose = new QPushButton("Close", this);
+    cmdClose = new QPushButton(tr("Close"), this);
     cmdClose->setObjectName("cmdClose");
     cmdClose->setDefault(true);
     auto* buttons = new QHBoxLayout;
@@ -129,7 +129,7 @@ void frmTracker::fillTable(std::vector<TrackerFinding> findings)
     findings_ = findings;
     tbFindings->setSortingEnabled(false); // rows filled again stay where they are put
     tbFindings->setColumnCount(5);
-    tbFindings->setHorizontalHeaderLabels({"Level", "Id", "Line", "Fix", "Message"});
+    tbFindings->setHorizontalHeaderLabels({tr("Level"), tr("Id"), tr("Line"), tr("Fix"), tr("Message")});
     tbFindings->setRowCount(static_cast<int>(findings.size()));
     tbFindings->setEditTriggers(QAbstractItemView::NoEditTriggers);
     tbFindings->setSelectionBehavior(QAbstractItemView::SelectRows);
@@ -139,7 +139,7 @@ void frmTracker::fillTable(std::vector<TrackerFinding> findings)
     tbFindings->horizontalHeader()->setStretchLastSection(true);
     for (int row = 0; row < tbFindings->rowCount(); ++row) {
         const auto& finding = findings[static_cast<std::size_t>(row)];
-        auto* level = new QTableWidgetItem(LevelText(finding.level));
+        auto* level = new QTableWidgetItem(finding.level == FindingLevel::Error ? tr("error") : tr("warning"));
         level->setData(Qt::UserRole, row); // the row's finding, wherever sorting moves the row
         tbFindings->setItem(row, LevelColumn, level);
         tbFindings->setItem(row, IdColumn, new QTableWidgetItem(QString::fromStdString(finding.id)));
@@ -169,8 +169,8 @@ QString frmTracker::rowsText(const QList<int>& rows) const
     for (const int row : rows) {
         const auto line = tbFindings->item(row, LineColumn)->text();
         text += tbFindings->item(row, LevelColumn)->text() + ' ' + tbFindings->item(row, IdColumn)->text() + ": " +
-                (line.isEmpty() ? QString() : "line " + line + ": ") + tbFindings->item(row, MessageColumn)->text() +
-                '\n';
+                (line.isEmpty() ? QString() : tr("line %1: ").arg(line)) +
+                tbFindings->item(row, MessageColumn)->text() + '\n';
     }
     return text;
 }
@@ -179,9 +179,9 @@ void frmTracker::addFixButtons(QHBoxLayout& buttons)
 {
     if (!repair_)
         return;
-    cmdFix = new QPushButton("Fix", this);
+    cmdFix = new QPushButton(tr("Fix"), this);
     cmdFix->setObjectName("cmdFix");
-    cmdFixAll = new QPushButton("Fix All", this);
+    cmdFixAll = new QPushButton(tr("Fix All"), this);
     cmdFixAll->setObjectName("cmdFixAll");
     buttons.addWidget(cmdFix);
     buttons.addWidget(cmdFixAll);
@@ -194,7 +194,7 @@ void frmTracker::markFixableRows()
 {
     for (int row = 0; row < tbFindings->rowCount(); ++row) {
         const bool fixable = repair_ && hasRepair(tbFindings->item(row, IdColumn)->text());
-        tbFindings->setItem(row, FixColumn, new QTableWidgetItem(fixable ? "yes" : ""));
+        tbFindings->setItem(row, FixColumn, new QTableWidgetItem(fixable ? tr("yes") : QString()));
     }
 }
 

@@ -6,6 +6,7 @@
 #include <filesystem>
 
 #include "CliRun.h"
+#include "LineEndText.h"
 #include "TempDir.h"
 
 namespace fs = std::filesystem;
@@ -27,20 +28,6 @@ std::string replaced(std::string text, const std::string& what, const std::strin
     return text.replace(text.find(what), what.size(), with);
 }
 
-// The part with one line end in place of each CR LF.
-std::string withEnds(const std::string& text, const std::string& end)
-{
-    std::string result;
-    for (std::size_t at = 0; at < text.size();) {
-        const auto crLf = std::min(text.find("\r\n", at), text.size());
-        result += text.substr(at, crLf - at);
-        if (crLf < text.size())
-            result += end;
-        at = crLf + 2;
-    }
-    return result;
-}
-
 const std::string NewLicence = "Licensed under CC BY 2.0 and CC BY 4.0 : see CAreadme.txt";
 
 std::string repaired(const std::string& part)
@@ -55,7 +42,7 @@ TEST(CliFix, OnlyTheRepairedLinesChangeWhateverTheLineEnds)
     // The mixed file: CR LF, then LF at the end of the comment lines and a lone CR inside one.
     const auto mixed = replaced(OldPart, "0 // end\r\n", "0 // a\n0 // e\rnd\n");
     const std::vector<std::pair<std::string, std::string>> parts = {
-        {"crlf.dat", OldPart}, {"lf.dat", withEnds(OldPart, "\n")}, {"mixed.dat", mixed}};
+        {"crlf.dat", OldPart}, {"lf.dat", WithLineEnds(OldPart, "\n")}, {"mixed.dat", mixed}};
     std::vector<std::string> args = {"fix", "--allow-missing-username"};
     for (const auto& [name, bytes] : parts) {
         dir.write(name, bytes);
@@ -79,7 +66,7 @@ TEST(CliFix, OnlyTheRepairedLinesChangeWhateverTheLineEnds)
 TEST(CliFix, AddedLinesGoWhereTheHeaderOrderPutsThemWithTheFilesLineEnd)
 {
     TempDir dir;
-    const auto lf = withEnds(OldPart, "\n");
+    const auto lf = WithLineEnds(OldPart, "\n");
     dir.write("a.dat", lf);
     dir.write("b.dat", replaced(lf, "0 !HISTORY 2004-01-01 [jdoe] Made\n\n", ""));
     const auto run = RunCliWith({"fix", "--only", "license.approved", "--add-history", "Licence", "--as", "ann",

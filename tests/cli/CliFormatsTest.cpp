@@ -2,6 +2,7 @@
 // Where quillmark-cli's findings, JSON texts and diffs end up: the forms editors, CI and patch read.
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <filesystem>
 #include <nlohmann/json.hpp>
 #include <regex>
@@ -40,22 +41,25 @@ TEST(CliFormats, TextFindingsNameTheLineOnDiskAndJsonTheSame)
     const auto path = dir.write("3001.dat", Part);
     const auto text = RunCliWith({"check", "--tracker", "--quiet", path});
     const auto expect = [&](std::size_t line, const std::string& rest) {
-        EXPECT_NE(text.out.find(path + ":" + std::to_string(line) + ": " + rest), std::string::npos)
+        EXPECT_TRUE(std::regex_search(text.out, std::regex(path + ":" + std::to_string(line) + ":\\d+: " + rest)))
             << rest << " on line " << line << " in\n"
             << text.out;
     };
-    expect(editorLineOf(Part, "0 !LICENSE"), "error license.approved: The licence \"Redistributable");
-    expect(editorLineOf(Part, "by 100%"), "error line.invalid: Not a valid LDraw line: \"by 100% hand\"");
-    expect(editorLineOf(Part, "3 16"), "error numbers.trailingzeros: The number \"1.50\" ends in a needless zero.");
+    expect(editorLineOf(Part, "0 !LICENSE"), R"(error: The licence "Redistributable.*\[license\.approved\])");
+    expect(editorLineOf(Part, "by 100%"), R"(error: Not a valid LDraw line: "by 100% hand" \[line\.invalid\])");
+    expect(editorLineOf(Part, "3 16"),
+           R"(error: The number "1\.50" ends in a needless zero\. \[numbers\.trailingzeros\])");
     const auto json = nlohmann::json::parse(RunCliWith({"check", "--tracker", "--json", path}).out);
     for (const auto& finding : json["tracker"]) {
-        const auto line = finding.contains("line") ? ":" + std::to_string(finding["line"].get<int>()) : "";
+        const auto line = finding.contains("line") ? std::to_string(finding["line"].get<int>()) : "1";
         const auto level = finding["level"].get<std::string>(), id = finding["id"].get<std::string>();
-        EXPECT_NE(text.out.find(path + line + ": " + level + " " + id + ": "), std::string::npos) << finding.dump();
+        EXPECT_TRUE(
+            std::regex_search(text.out, std::regex(path + ":" + line + ":\\d+: " + level + ": .* \\[" + id + "\\]")))
+            << finding.dump();
     }
     const auto refused = RunCliWith({"check", "--quiet", dir.write("b.dat", "0 Brick\r\n\r\n0 BFC CERTIFY\r\n")});
-    EXPECT_NE(refused.out.find("b.dat: error save.author: You need to mention the Author!\n"), std::string::npos)
-        << "no author line, no line number: " << refused.out;
+    EXPECT_NE(refused.out.find("b.dat:1:1: error: You need to mention the Author! [save.author]\n"), std::string::npos)
+        << "no author line: the file as a whole, on line 1: " << refused.out;
     const auto escaped = RunCliWith({"check", "--tracker", "--quiet", dir.write("c.dat", "0 A\x1b[2J\r\n1 x\r\n")});
     EXPECT_EQ(escaped.out.find('\x1b'), std::string::npos) << escaped.out;
 }
@@ -91,7 +95,7 @@ TEST(CliFormats, SarifHasWhatTheFormatRequiresAndStablePrints)
         for (const auto& [key, print] : result["partialFingerprints"].items())
             prints.insert(key + print.get<std::string>());
     }
-    EXPECT_EQ(ruleIds, usedIds);
+    EXPECT_TRUE(std::includes(ruleIds.begin(), ruleIds.end(), usedIds.begin(), usedIds.end()));
     EXPECT_TRUE(usedIds.contains("save.license") && usedIds.contains("numbers.trailingzeros"));
     EXPECT_EQ(prints.size(), results.size()) << "each result its own print";
     const auto again = checkIn(dir, {"check", "--tracker", "--format", "sarif", "-j", "1", "my parts"});
@@ -103,13 +107,15 @@ TEST(CliFormats, GithubAnnotationsAreEscapedAsWorkflowCommands)
     TempDir dir;
     dir.write("a,b:c.dat", Part);
     const auto run = checkIn(dir, {"check", "--tracker", "--format", "github", "a,b:c.dat"});
-    EXPECT_NE(run.out.find("::error file=a%2Cb%3Ac.dat,line=" + std::to_string(editorLineOf(Part, "by 100%")) +
-                           ",title=line.invalid::Not a valid LDraw line: \"by 100%25 hand\"\n"),
-              std::string::npos)
-        << run.out;
-    EXPECT_NE(run.out.find("::error file=a%2Cb%3Ac.dat,line=" + std::to_string(editorLineOf(Part, "0 !LICENSE")) +
-                           ",title=license.approved::"),
-              std::string::npos);
+    const auto expect = [&](const std::string& what, const std::string& rest) {
+        EXPECT_TRUE(std::regex_search(
+            run.out, std::regex("::error file=a%2Cb%3Ac\\.dat,line=" + std::to_string(editorLineOf(Part, what)) +
+                                ",col=\\d+," + rest)))
+            << rest << " in\n"
+            << run.out;
+    };
+    expect("by 100%", R"(title=line\.invalid::Not a valid LDraw line: "by 100%25 hand"\n)");
+    expect("0 !LICENSE", R"(title=license\.approved::)");
 }
 
 // The window shows a file that is valid UTF-8 as UTF-8 and any other as ISO-8859-1: JSON too.

@@ -94,14 +94,15 @@ TEST(CliCheck, ListsEveryFindingInLinesOrJsonAndNeverWritesAndExitsWithTheWorst)
     const auto bad = dir.write("bad.dat", NoAuthorPart);
     const auto run = RunCliWith({"check", "--quiet", good, bad});
     EXPECT_EQ(run.status, 1);
-    EXPECT_EQ(run.out, good + ": ok\n" + bad + ": error save.author: You need to mention the Author!\n" + bad +
-                           ": error save.bfc: You need to set the BFC type!\n" + bad +
-                           ": error save.license: You need to set the Liscense type!\n" + bad +
-                           ": error save.type: You need to set the Part type!\n" + bad +
-                           ": warning save.username: The author line names no user.\n" + bad +
-                           ": note save.fixup.rotation: A save would offer a fix-up: 0 ROTATION lines in the body.\n" +
+    EXPECT_EQ(run.out, good + ": ok\n" + bad + ":1:1: error: You need to mention the Author! [save.author]\n" + bad +
+                           ":1:1: error: You need to set the BFC type! [save.bfc]\n" + bad +
+                           ":1:1: error: You need to set the License type! [save.license]\n" + bad +
+                           ":1:1: error: You need to set the Part type! [save.type]\n" + bad +
+                           ":1:1: warning: The author line names no user. [save.username]\n" + bad +
+                           ":1:1: note: A save would offer a fix-up: 0 ROTATION lines in the body. "
+                           "[save.fixup.rotation]\n" +
                            bad +
-                           ":2: note save.fixup.color: A save would offer a fix-up: COLOR lines in the header.\n");
+                           ":2:9: note: A save would offer a fix-up: COLOR lines in the header. [save.fixup.color]\n");
     const auto json = nlohmann::json::parse(RunCliWith({"check", "--json", bad}).out);
     EXPECT_EQ(json["FilePath"], bad);
     EXPECT_EQ(json["refusals"][0], "You need to mention the Author!\r\nSaving the file is not possible");
@@ -276,7 +277,7 @@ TEST(CliBatch, SummaryCountsEachFinding)
     EXPECT_EQ(run.status, 2);
     EXPECT_EQ(run.err.substr(run.err.find("4 files")),
               "4 files, 2 refused, 2 without user name, 1 unreadable\n"
-              "  refused (2): Length of the part description is limited to 64 character!\n"
+              "  refused (2): Length of the part description is limited to 64 characters!\n"
               "  fix-up offered (2): 0 WRITE lines in the body\n");
 }
 
@@ -292,7 +293,7 @@ TEST(CliTracker, ColoursComeFromTheLibrarysLDConfig)
                                "3 16 0 0 0 1 0 0 0 1 0\r\n3 4 0 0 0 1 0 0 0 1 0\r\n");
     const auto text = RunCliWith({"check", "--tracker", "--quiet", bad});
     EXPECT_EQ(text.status, 1);
-    EXPECT_EQ(text.out, bad + ":8: error line.invalidcolor: Colour 4 is not defined in LDConfig.ldr.\n");
+    EXPECT_EQ(text.out, bad + ":8:1: error: Colour 4 is not defined in LDConfig.ldr. [line.invalidcolor]\n");
     const auto malformed = dir.write("LDConfig.ldr", "0 !COLOUR Red CODE 4\r\n");
     const auto builtIn = RunCliWith({"check", "--tracker", "--quiet", "--ldconfig", malformed, bad, bad});
     EXPECT_EQ(builtIn.out.find("invalidcolor"), std::string::npos) << "the built-in list has 4";

@@ -76,15 +76,35 @@ TEST(CliValues, AMistypedCommandGetsTheClosestAndAnUnreadableLDConfigIsAnError)
     EXPECT_EQ(RunCliWith({"check", "--tracker", "--ldconfig", dir.path().string(), part}).status, 2) << "a folder";
 }
 
-// Every option that a command's --help lists is described in the manual page, and every
-// command's --help ends with its exit statuses.
-TEST(CliValues, TheManualPageDescribesEveryOptionOfEveryCommand)
+// The commands that quillmark-cli --help lists.
+std::vector<std::string> commandsOfTheHelp()
+{
+    std::vector<std::string> commands;
+    std::istringstream lines(RunCliWith({"--help"}).out);
+    bool inCommands = false;
+    for (std::string line; std::getline(lines, line);) {
+        if (line == "Subcommands:")
+            inCommands = true;
+        else if (std::smatch found; inCommands && std::regex_search(line, found, std::regex(R"(^  ([a-z]+) )")))
+            commands.push_back(found.str(1));
+    }
+    return commands;
+}
+
+// Every command and every option that the --help texts list is described in the manual page,
+// and every command's --help ends with its exit statuses.
+TEST(CliValues, TheManualPageDescribesEveryCommandAndItsOptions)
 {
     std::ifstream file(QUILLMARK_CLI_MAN_PAGE);
-    std::stringstream page;
-    page << file.rdbuf();
+    std::stringstream read;
+    read << file.rdbuf();
+    const auto page = read.str();
+    const auto commands = commandsOfTheHelp();
+    EXPECT_GE(commands.size(), 6u);
     const std::regex option(R"(^  (-\w,)?(--[a-z-]+))");
-    for (const auto* command : {"fields", "print", "check", "save", "edit"}) {
+    for (const auto& command : commands) {
+        EXPECT_NE(page.find("\n.B quillmark-cli " + command + "\n"), std::string::npos) << command << " in SYNOPSIS";
+        EXPECT_NE(page.find("\n.BI " + command + " \""), std::string::npos) << command << " in COMMANDS";
         const auto help = RunCliWith({command, "--help"}).out;
         EXPECT_NE(help.find("\nExit status:\n  0  "), std::string::npos) << command;
         std::istringstream lines(help);
@@ -93,12 +113,14 @@ TEST(CliValues, TheManualPageDescribesEveryOptionOfEveryCommand)
             if (!std::regex_search(line, found, option))
                 continue;
             const auto roff = std::regex_replace(found.str(0).substr(2), std::regex("-"), "\\-");
-            EXPECT_NE(page.str().find(roff), std::string::npos) << command << " " << found.str(0);
+            EXPECT_NE(page.find(roff), std::string::npos) << command << " " << found.str(0);
         }
     }
     for (const auto* section :
-         {"NAME", "SYNOPSIS", "DESCRIPTION", "OPTIONS", "EXIT STATUS", "FILES", "EXAMPLES", "SEE ALSO"})
-        EXPECT_NE(page.str().find(std::string("\n.SH ") + section + "\n"), std::string::npos) << section;
+         {"NAME", "SYNOPSIS", "DESCRIPTION", "COMMANDS", "OPTIONS", "EXIT STATUS", "FILES", "EXAMPLES", "SEE ALSO"})
+        EXPECT_NE(page.find(std::string("\n.SH ") + section + "\n"), std::string::npos) << section;
+    // The folder of the copies that saves in others' folders keep.
+    EXPECT_NE(page.find("\n.I ~/.local/state/Quillmark/keep/\n"), std::string::npos);
 }
 
 } // namespace

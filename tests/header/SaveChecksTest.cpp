@@ -80,10 +80,10 @@ TEST_F(SaveChecks, ChecksStopAtTheFirstFailureInTheirOneOrder)
     h.Bfc.clear();
     h.License.clear();
     h.PartType.clear();
-    const std::vector<std::string> order = {"Length of the part description is limited to 64 character!",
+    const std::vector<std::string> order = {"Length of the part description is limited to 64 characters!",
                                             "You need to mention the Author!",
                                             "You need to set the BFC type!",
-                                            "You need to set the Liscense type!",
+                                            "You need to set the License type!",
                                             "You need to set the Part type!",
                                             "Parts with 'needs work' in title needs a proper comment!"};
     std::vector<std::string> listed;

@@ -86,7 +86,7 @@ TEST_F(ListEditing, DeleteRemovesTheSelectedEntryButNeverNone)
         dialogs.expectMessage(Answer::Ok);
         list.deleteSelected();
         EXPECT_EQ(list.entries().size(), 3u);
-        EXPECT_EQ(dialogs.messages.back().text, "The entry '<none>' is not allowd to delete.");
+        EXPECT_EQ(dialogs.messages.back().text, "The entry '<none>' is not allowed to delete.");
         list.select(2);
         EXPECT_EQ(list.updateText(), "B");
         list.deleteSelected();
@@ -118,7 +118,7 @@ TEST_F(ListEditing, UpdateReplacesTheSelectedEntry)
     list.setUpdateText("Other");
     dialogs.expectMessage(Answer::Ok);
     list.updateSelected();
-    EXPECT_EQ(dialogs.messages.back().text, "The entry '<none>' is not allowd to change.");
+    EXPECT_EQ(dialogs.messages.back().text, "The entry '<none>' is not allowed to change.");
     EXPECT_EQ(list.entries().front(), "<none>");
 }
 

@@ -8,6 +8,7 @@
 #include "Corpus.h"
 #include "Dates.h"
 #include "LspClient.h"
+#include "RuleTexts.h"
 #include "TempDir.h"
 #include "Text.h"
 
@@ -34,8 +35,8 @@ std::size_t protocolLine(const std::string& bytes, std::size_t checkLine)
     return line;
 }
 
-// What check --tracker prints for the file, one finding per line: "path:line: level id: message",
-// or "path: level id: message" for the file as a whole (which the server shows on the first line).
+// What check --tracker prints for the file, one finding per line: "path:line:column: level: message [id]"
+// (line 1, column 1 for the file as a whole, which the server shows on the first line too).
 std::multiset<Finding> checkFindings(const std::string& path)
 {
     const auto bytes = ReadBytes(path);
@@ -47,16 +48,13 @@ std::multiset<Finding> checkFindings(const std::string& path)
             continue;
         EXPECT_TRUE(line.starts_with(path + ":")) << line;
         auto rest = line.substr(path.size() + 1);
-        std::size_t number = 1;
-        if (rest.front() != ' ') {
-            const auto colon = rest.find(':');
-            number = protocolLine(bytes, std::stoul(rest.substr(0, colon)));
-            rest.erase(0, colon + 1);
-        }
-        const auto level = rest.substr(1, rest.find(' ', 1) - 1);
+        const auto number = protocolLine(bytes, std::stoul(rest.substr(0, rest.find(':'))));
+        rest.erase(0, rest.find(": ") + 2); // line and column
+        const auto level = rest.substr(0, rest.find(':'));
         rest.erase(0, level.size() + 2);
-        const auto colon = rest.find(": ");
-        findings.insert({number, severityNumber(level), rest.substr(0, colon), rest.substr(colon + 2)});
+        const auto open = rest.rfind(" [");
+        findings.insert(
+            {number, severityNumber(level), rest.substr(open + 2, rest.size() - open - 3), rest.substr(0, open)});
     }
     return findings;
 }
@@ -66,6 +64,11 @@ std::multiset<Finding> serverFindings(const Json& diagnostics)
     std::multiset<Finding> findings;
     for (const auto& diagnostic : diagnostics) {
         EXPECT_EQ(diagnostic["source"], "quillmark");
+        // Every id is explained: the diagnostic links to its rule's section of docs/rules.md.
+        const auto code = diagnostic.value("code", "");
+        EXPECT_TRUE(
+            diagnostic.value("codeDescription", Json::object()).value("href", "").ends_with("/docs/rules.md#" + code))
+            << diagnostic.dump();
         findings.insert({diagnostic["range"]["start"]["line"].get<std::size_t>() + 1, diagnostic["severity"].get<int>(),
                          diagnostic.value("code", ""), diagnostic["message"].get<std::string>()});
     }
@@ -178,6 +181,26 @@ TEST(LspProtocol, PublishesCheckTrackersFindingsOfCorpusParts)
     EXPECT_GT(compared, 10u);
     // Nothing is written beside the documents.
     EXPECT_EQ(NamesIn(folder.path()), written);
+}
+
+// The document's folder decides the settings, as for check: the nearest quillmark.toml.
+TEST(LspProtocol, ChecksWithTheQuillmarkTomlAboveTheDocument)
+{
+    const TempDir folder;
+    folder.write("quillmark.toml", "ignore = [\"license.\"]\n");
+    std::filesystem::create_directory(folder.path() / "parts");
+    // A needless zero besides the licence: what the config ignores goes, the rest stays.
+    auto part = SmallPart;
+    part.replace(part.find("0 0 0 1 0 0 0 1 0 0 0 1 stud"), 7, "0 0 0 1.0");
+    const auto path = folder.write("parts/3004.dat", part);
+    const auto expected = checkFindings(path);
+    EXPECT_TRUE(std::none_of(expected.begin(), expected.end(),
+                             [](const Finding& finding) { return std::get<2>(finding).starts_with("license."); }));
+    EXPECT_FALSE(expected.empty());
+    LspClient client;
+    client.initialize();
+    client.open(UriOf(path), part);
+    EXPECT_EQ(serverFindings(client.diagnosticsOf(UriOf(path))), expected);
 }
 
 TEST(LspProtocol, FollowsIncrementalAndFullChanges)
@@ -408,6 +431,8 @@ TEST(LspProtocol, HoverTellsTheLinesMeaningAndItsFindings)
     const auto licence = hoverText(client, uri, 4);
     EXPECT_TRUE(licence.starts_with("!LICENSE: ")) << licence;
     EXPECT_NE(licence.find("license.approved"), std::string::npos) << licence;
+    // The finding's explanation, as explain gives it.
+    EXPECT_NE(licence.find(RuleDescription(*FindRuleText("license.approved"))), std::string::npos) << licence;
     EXPECT_TRUE(hoverText(client, uri, 1).starts_with("Name: "));
     EXPECT_EQ(hoverText(client, uri, 8), ""); // a type 1 line without a finding
 }

@@ -97,12 +97,14 @@ TEST(Neovim, ShowsTheFindingsOfCheckTracker)
     const auto copy = before.write("3004.dat", original);
     std::istringstream checked(RunCliWith({"check", "--tracker", "--quiet", copy}).out);
     for (std::string line; std::getline(checked, line);) {
+        // "path:line:column: level: message [id]"
         const auto rest = line.substr(copy.size() + 1);
         const auto number = rest.substr(0, rest.find(':'));
-        const auto afterLevel = rest.substr(rest.find(' ', rest.find(' ') + 1) + 1);
-        const auto colon = afterLevel.find(": ");
-        expected.push_back(number + ":" + (afterLevel.starts_with("license.") ? "12" : "1") + " " +
-                           afterLevel.substr(0, colon) + " " + afterLevel.substr(colon + 2));
+        const auto message = rest.substr(rest.find(": ", rest.find(": ") + 2) + 2);
+        const auto open = message.rfind(" [");
+        const auto id = message.substr(open + 2, message.size() - open - 3);
+        expected.push_back(number + ":" + (id.starts_with("license.") ? "12" : "1") + " " + id + " " +
+                           message.substr(0, open));
     }
     ASSERT_FALSE(expected.empty());
     ASSERT_TRUE(runNeovim(folder, part)) << "Neovim did not end within two minutes";

@@ -5,6 +5,7 @@
 
 #include "Composer.h"
 #include "FindingPlaces.h"
+#include "LineEndText.h"
 #include "ParseProgress.h"
 #include "Parser.h"
 #include "ScriptedDialogs.h"
@@ -46,24 +47,11 @@ const Placed& findingOf(const std::vector<Placed>& placed, const std::string& id
     return none;
 }
 
-std::string withLineEnds(std::string text, const std::string& end)
-{
-    std::string result;
-    for (std::size_t at = 0; at < text.size();) {
-        const auto crlf = std::min(text.find("\r\n", at), text.size());
-        result += text.substr(at, crlf - at);
-        if (crlf < text.size())
-            result += end;
-        at = crlf + 2;
-    }
-    return result;
-}
-
 TEST(FindingPlaces, ANumberIsPlacedOnItsLineAndColumnWhateverTheLineEnds)
 {
     const auto crLf = cleanPart("Brick  2 x  4", "3001.dat", "Part", "3 16  1.50 0 0 1 0 0 0 1 0\r\n");
     for (const auto& end : {"\r\n", "\n"}) {
-        const auto found = findingOf(placedFindings(withLineEnds(crLf, end)), "numbers.trailingzeros");
+        const auto found = findingOf(placedFindings(WithLineEnds(crLf, end)), "numbers.trailingzeros");
         EXPECT_FALSE(found.place.wholeFile);
         EXPECT_EQ(found.place.line, 9u) << "after the eight header lines and blank lines";
         EXPECT_EQ(found.place.column, 7u);
@@ -93,7 +81,7 @@ TEST(FindingPlaces, AHeaderFindingIsPlacedOnItsLinesValue)
 {
     auto text = cleanPart();
     text.replace(text.find("Licensed under CC BY 4.0"), 24, "Redistributable");
-    const auto placed = placedFindings(withLineEnds(text, "\n"));
+    const auto placed = placedFindings(WithLineEnds(text, "\n"));
     const auto licence = findingOf(placed, "license.approved");
     EXPECT_EQ(licence.place.line, 5u);
     EXPECT_EQ(licence.place.column, 12u);

@@ -260,7 +260,7 @@ TEST_F(WindowTest, SaveRefusesALongDescriptionAndSelectsItsTail)
     dialogs.expectMessage(Answer::Ok);
     window->MDateiSpeichern_Click();
     EXPECT_EQ(dialogs.messages.back().text,
-              "Length of the part description is limited to 64 character!\r\nSaving the file is not possible\r\n"
+              "Length of the part description is limited to 64 characters!\r\nSaving the file is not possible\r\n"
               "Option › Preferences › Limit Part Description to 64 characters lifts this limit when it is cleared.");
     EXPECT_EQ(description->selectedText(), QString(6, 'd'));
     EXPECT_EQ(text("lblLength"), "Length: 70");
