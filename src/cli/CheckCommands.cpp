@@ -37,32 +37,7 @@
 
 namespace {
 
-// Where the Tracker's colour codes come from; none when the built-in list cannot be read.
-std::unique_ptr<ColourSource> colourSource(const std::string& ldconfig, std::ostream& err)
-{
-    const auto path = DataFileOfThisProgram(ProgramFolder(), BuiltInColoursFile);
-    try {
-        return std::make_unique<ColourSource>(ReadBuiltInColours(path), ldconfig, [&err](const std::string& text) {
-            err << "quillmark-cli: " << text << '\n';
-        });
-    } catch (const QmError& failure) {
-        err << "quillmark-cli: cannot read the colour list " << path << ": " << failure.description() << '\n';
-        return nullptr;
-    }
-}
-
 std::string firstLine(const std::string& text) { return text.substr(0, text.find('\r')); }
-
-// Takes the refusal of the check id out of findings; whether there was one.
-bool takeRefusal(SaveFindings& findings, std::string_view id)
-{
-    const auto found = std::find(findings.refusalIds.begin(), findings.refusalIds.end(), id);
-    if (found == findings.refusalIds.end())
-        return false;
-    findings.refusals.erase(findings.refusals.begin() + (found - findings.refusalIds.begin()));
-    findings.refusalIds.erase(found);
-    return true;
-}
 
 void noteFindings(FileReport& report, const SaveFindings& findings)
 {
@@ -245,7 +220,7 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
     StringList categories;
     std::unique_ptr<ColourSource> colours;
     if (options.tracker && (!ReadStandardList(ListKind::Category, categories, err) ||
-                            !(colours = colourSource(options.settings.ldconfig, err))))
+                            !(colours = ColourSourceFor(options.settings.ldconfig, err))))
         return ExitStatus::Unreadable;
     CheckConfigs configs(options.config, !options.isolated);
     // A wrong config named on the command line is a wrong command line: no file is read.
@@ -264,21 +239,12 @@ int RunCheck(const std::vector<std::string>& arguments, const CheckOptions& opti
     RunReads reads;
     const auto checkOne = [&](const HeaderData& header, const PartSettings& settings, ConsoleDialogs& dialogs,
                               FileReport& report) {
-        CheckedFile file;
-        file.save = EvaluateSaveChecks(header, settings.limitDescription);
-        // The Tracker takes a long description: under its rules the length alone only warns.
-        if (options.tracker)
-            file.lengthWarning = takeRefusal(file.save, SaveCheckIds::DescriptionLength);
-        const auto composed = ComposeHeader(header);
-        if (options.tracker) {
-            const auto tell = [&dialogs](const std::string& text) { dialogs.message({text}); };
-            const auto& codes = settings.ldconfig.empty() ? colours->forPart(header.FilePath, tell)
-                                                          : colours->ofLDConfig(settings.ldconfig, tell);
-            file.tracker = CheckRecordForTracker(header, composed, categories, codes);
-            file.trackerChecked = true;
-        }
-        KeepReported(file, settings.choice);
-        const auto findings = PlacedFindings(file, header, composed);
+        const auto check =
+            CheckRecord(header, settings, {options.tracker ? &categories : nullptr, colours.get()}, dialogs);
+        const auto& file = check.file;
+        // The file is read again only for findings with a place in it.
+        const auto bytes = HasPlacedFindings(file) ? FileBytes(*header.Part).takeBytes() : std::string();
+        const auto findings = PlacedFindings(check, header, bytes);
         report.out = CheckOutput(form, header, file, findings);
         noteFindings(report, file.save);
         for (const auto& finding : file.tracker)

@@ -4,8 +4,6 @@
 #include <algorithm>
 
 #include "FieldsJson.h"
-#include "FileReport.h"
-#include "PartFile.h"
 #include "SarifLog.h"
 
 namespace {
@@ -52,42 +50,6 @@ nlohmann::ordered_json CheckJson(const HeaderData& header, const SaveFindings& s
                       {"write", save.fixups.write},
                       {"color", save.fixups.color}};
     return json;
-}
-
-void KeepReported(CheckedFile& file, const RuleChoice& choice)
-{
-    auto& save = file.save;
-    for (std::size_t k = save.refusals.size(); k-- > 0;)
-        if (!choice.reports(save.refusalIds[k])) {
-            save.refusals.erase(save.refusals.begin() + static_cast<std::ptrdiff_t>(k));
-            save.refusalIds.erase(save.refusalIds.begin() + static_cast<std::ptrdiff_t>(k));
-        }
-    save.missingUserName = save.missingUserName && choice.reports(SaveCheckIds::UserName);
-    auto& fixups = save.fixups;
-    const auto names = FixUpNames(fixups);
-    bool* const offered[] = {&fixups.certifyInvertNext, &fixups.rotation, &fixups.write, &fixups.color};
-    for (std::size_t k = 0; k < names.size(); ++k)
-        *offered[k] = *offered[k] && choice.reports(names[k].id);
-    file.lengthWarning = file.lengthWarning && choice.reports(SaveCheckIds::DescriptionLength);
-    std::erase_if(file.tracker, [&choice](const TrackerFinding& finding) { return !choice.reports(finding.id); });
-}
-
-std::vector<FileFinding> PlacedFindings(const CheckedFile& file, const HeaderData& header,
-                                        const std::string& composedHeader)
-{
-    // The file is read again only for findings with a place in it (the other fix-ups are about the whole body).
-    const auto& save = file.save;
-    const bool placed = !save.refusals.empty() || save.missingUserName || save.fixups.color || file.lengthWarning ||
-                        !file.tracker.empty();
-    const auto bytes = placed ? FileBytes(*header.Part).takeBytes() : std::string();
-    const FindingPlaces places(bytes, header, composedHeader);
-    auto findings = SaveCheckFindings(file.save, places);
-    if (file.lengthWarning)
-        findings.push_back(DescriptionLengthWarning(header, places));
-    auto tracker = TrackerFileFindings(file.tracker, places);
-    findings.insert(findings.end(), std::make_move_iterator(tracker.begin()), std::make_move_iterator(tracker.end()));
-    SortByPlace(findings);
-    return findings;
 }
 
 std::string CheckOutput(const OutputForm& form, const HeaderData& header, const CheckedFile& file,

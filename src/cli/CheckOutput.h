@@ -7,23 +7,7 @@
 
 #include "FileFindings.h"
 #include "FindingLines.h"
-#include "RuleChoice.h"
-
-// What check reports of one file: the save checks and, when asked for, the Parts Tracker's rules,
-// the findings a rule choice leaves out already taken out.
-struct CheckedFile {
-    SaveFindings save;
-    bool lengthWarning = false; // under the Tracker's rules a long description is a warning, not a refusal
-    bool trackerChecked = false;
-    std::vector<TrackerFinding> tracker;
-};
-
-// Takes out of file what choice does not report.
-void KeepReported(CheckedFile& file, const RuleChoice& choice);
-
-// Every finding of file with its place in the file on disk, in the order of the places.
-std::vector<FileFinding> PlacedFindings(const CheckedFile& file, const HeaderData& header,
-                                        const std::string& composedHeader);
+#include "TextCheck.h"
 
 // The forms check writes, and the folder their paths are relative to (the working folder, for
 // GitHub $GITHUB_WORKSPACE when set).

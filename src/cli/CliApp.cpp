@@ -40,7 +40,7 @@ const CLI::Validator ReadableFile(
 // The commands, their options and what the options fill.
 class CommandLine {
 public:
-    explicit CommandLine(bool errIsTerminal)
+    CommandLine(bool errIsTerminal, LanguageServerStart languageServer) : languageServer_(std::move(languageServer))
     {
         app_.name("quillmark-cli");
         app_.set_version_flag("--version", std::string("quillmark-cli ") + QUILLMARK_VERSION);
@@ -50,6 +50,8 @@ public:
         addCheck();
         addExplain();
         addSaveAndEdit();
+        if (languageServer_)
+            addLsp();
     }
 
     int run(int argc, const char* const* argv, std::ostream& out, std::ostream& err)
@@ -74,6 +76,8 @@ public:
             return RunSave(files_, saveOptions_, batch_, out, err);
         if (*edit_)
             return RunEdit(files_, saveOptions_, editOptions(), batch_, out, err);
+        if (lsp_ != nullptr && *lsp_)
+            return languageServer_(checkOptions_.settings.ldconfig, !noLengthLimit_);
         if (*fix_) {
             auto options = saveOptions_;
             options.backup = fixOptions_.recompose ? !noBackup_ : backup_;
@@ -180,6 +184,23 @@ private:
         check_->add_option("FILE", files_, "Part files or folders to check")->required();
     }
 
+    void addLsp()
+    {
+        lsp_ = app_.add_subcommand(
+            "lsp", "Serve an editor as a language server (LSP 3.17 on standard input and output): the findings of "
+                   "check --tracker on each open document while it is edited, hover help for header lines, and "
+                   "completion of header values. Nothing is written to disk.");
+        lsp_->footer("Exit status:\n  0  the editor shut the server down\n  1  the input ended or exit came "
+                     "without shutdown\n  2  a list file cannot be read, or the command line is wrong\n");
+        lsp_->add_option("--ldconfig", checkOptions_.settings.ldconfig,
+                         "The LDConfig.ldr whose colour codes are accepted (default: the first LDConfig.ldr in the "
+                         "document's folder or above it, else the built-in list)")
+            ->check(ReadableFile);
+        lsp_->add_flag("--no-length-limit", noLengthLimit_, "Allow part descriptions of any length");
+        // Editors' set-ups often name the transport; standard input and output is the only one.
+        lsp_->add_flag("--stdio")->description("Talk over standard input and output (the default and only way)");
+    }
+
     void addExplain()
     {
         explain_ = app_.add_subcommand("explain", "Print what the rule ID checks, why the library has it, whether "
@@ -267,7 +288,8 @@ private:
 
     CLI::App app_{"quillmark-cli: reads LDraw part files (*.dat) the way the Quillmark editor opens them."};
     CLI::App *fields_ = nullptr, *check_ = nullptr, *save_ = nullptr, *edit_ = nullptr, *fix_ = nullptr,
-             *explain_ = nullptr;
+             *explain_ = nullptr, *lsp_ = nullptr;
+    LanguageServerStart languageServer_;
     std::vector<std::string> files_, select_, ignore_;
     std::string failOn_, explainId_;
     bool explainMarkdown_ = false;
@@ -282,7 +304,8 @@ private:
 
 } // namespace
 
-int RunCli(int argc, const char* const* argv, std::ostream& out, std::ostream& err, bool errIsTerminal)
+int RunCli(int argc, const char* const* argv, std::ostream& out, std::ostream& err, bool errIsTerminal,
+           const LanguageServerStart& languageServer)
 {
-    return CommandLine(errIsTerminal).run(argc, argv, out, err);
+    return CommandLine(errIsTerminal, languageServer).run(argc, argv, out, err);
 }

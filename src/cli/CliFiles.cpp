@@ -4,6 +4,7 @@
 #include <algorithm>
 #include <filesystem>
 
+#include "ColourSource.h"
 #include "ConsoleDialogs.h"
 #include "FileSave.h"
 #include "KeepFile.h"
@@ -130,5 +131,18 @@ bool ReadStandardList(ListKind kind, StringList& entries, std::ostream& err)
     } catch (const QmError& failure) {
         err << "quillmark-cli: cannot read the list " << path << ": " << failure.description() << '\n';
         return false;
+    }
+}
+
+std::unique_ptr<ColourSource> ColourSourceFor(const std::string& ldconfig, std::ostream& err)
+{
+    const auto path = DataFileOfThisProgram(ProgramFolder(), BuiltInColoursFile);
+    try {
+        return std::make_unique<ColourSource>(ReadBuiltInColours(path), ldconfig, [&err](const std::string& text) {
+            err << "quillmark-cli: " << text << '\n';
+        });
+    } catch (const QmError& failure) {
+        err << "quillmark-cli: cannot read the colour list " << path << ": " << failure.description() << '\n';
+        return nullptr;
     }
 }

@@ -2,6 +2,7 @@
 #pragma once
 
 #include <functional>
+#include <memory>
 #include <optional>
 #include <ostream>
 #include <string>
@@ -15,6 +16,7 @@
 #include "PartFileList.h"
 #include "SafeReplace.h"
 
+class ColourSource;
 class ConsoleDialogs;
 
 // Exit statuses shared by the commands; a larger one wins when several apply.
@@ -57,6 +59,10 @@ std::string ProgramFolder();
 // A standard list, from the list file the window uses. When it cannot be read, says so on err
 // and returns false.
 bool ReadStandardList(ListKind kind, StringList& entries, std::ostream& err);
+
+// Where the Parts Tracker's colour codes come from, for check's --ldconfig (empty: search above
+// each part); what is unusable is said on err. Null when the built-in list cannot be read.
+std::unique_ptr<ColourSource> ColourSourceFor(const std::string& ldconfig, std::ostream& err);
 
 // Runs handle on every file that opens and returns the worst status: Unreadable for a file that
 // did not open, otherwise the largest that handle returned.

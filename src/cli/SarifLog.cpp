@@ -54,7 +54,7 @@ Json ruleJson(const RuleText& rule)
                 {"shortDescription", {{"text", rule.title}}},
                 {"fullDescription", {{"text", RuleDescription(rule)}}},
                 {"help", {{"text", help}, {"markdown", RuleMarkdown(rule)}}},
-                {"helpUri", std::string(QUILLMARK_HOMEPAGE) + "/blob/main/docs/rules.md#" + RuleAnchor(rule)},
+                {"helpUri", RuleHelpUri(rule)},
                 {"properties",
                  {{"source", std::string_view(rule.id).starts_with("save.") ? "save checks" : "Parts Tracker rules"}}}};
 }
@@ -86,6 +86,11 @@ std::string folderUri(const std::string& folder)
 }
 
 } // namespace
+
+std::string RuleHelpUri(const RuleText& rule)
+{
+    return std::string(QUILLMARK_HOMEPAGE) + "/blob/main/docs/rules.md#" + RuleAnchor(rule);
+}
 
 std::string SarifResultLines(const std::string& path, const std::vector<FileFinding>& findings, const std::string& base)
 {

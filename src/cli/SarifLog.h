@@ -8,9 +8,15 @@
 
 #include "FileFindings.h"
 
+struct RuleText;
+
 // SARIF 2.1.0, the form code-scanning services and editors read findings in. The log is written
 // as the run goes: its head with every rule, then each file's results as they come, then its
 // end, so that no more than one file's results are ever held.
+
+// Where the rule's explanation is read on the web (its section of docs/rules.md): SARIF's helpUri,
+// the language server's codeDescription.
+std::string RuleHelpUri(const RuleText& rule);
 
 // The findings of the file at path as SARIF results, one JSON object per line. The file's URI is
 // relative to %SRCROOT% (base, the working folder) where it lies below it, else an absolute file
