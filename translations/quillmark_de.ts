@@ -232,14 +232,6 @@
         <translation>Historie</translation>
     </message>
     <message>
-        <source>The Parts Tracker takes history lines only as &quot;YYYY-MM-DD [user] what changed&quot; (or {Real Name} in place of [user]), and would refuse</source>
-        <translation>Der Parts Tracker nimmt Historienzeilen nur in der Form „JJJJ-MM-TT [Benutzer] was sich geändert hat“ an (oder {Name} statt [Benutzer]) und würde diese ablehnen:</translation>
-    </message>
-    <message>
-        <source>Keep it as it is?</source>
-        <translation>So übernehmen?</translation>
-    </message>
-    <message>
         <source>Load DAT-File</source>
         <translation>DAT-Datei laden</translation>
     </message>
@@ -253,6 +245,17 @@
     <message>
         <source>Parsing file. Line %1. Please wait...</source>
         <translation>Datei wird gelesen. Zeile %1. Bitte warten …</translation>
+    </message>
+</context>
+<context>
+    <name>frmHelp</name>
+    <message>
+        <source>Quillmark Help</source>
+        <translation>Quillmark-Hilfe</translation>
+    </message>
+    <message>
+        <source>C&amp;lose</source>
+        <translation>Sch&amp;ließen</translation>
     </message>
 </context>
 <context>
@@ -445,32 +448,12 @@
         <translation>%1 gespeichert (Sicherung %2)</translation>
     </message>
     <message>
-        <source>Parts Tracker: not checked (%1)</source>
-        <translation>Parts Tracker: nicht geprüft (%1)</translation>
-    </message>
-    <message>
-        <source>Parts Tracker: no findings</source>
-        <translation>Parts Tracker: keine Befunde</translation>
-    </message>
-    <message>
-        <source>%1 error</source>
-        <translation>%1 Fehler</translation>
-    </message>
-    <message>
         <source>%1 errors</source>
         <translation>%1 Fehler</translation>
     </message>
     <message>
-        <source>%1 warning</source>
-        <translation>%1 Warnung</translation>
-    </message>
-    <message>
         <source>%1 warnings</source>
         <translation>%1 Warnungen</translation>
-    </message>
-    <message>
-        <source>Parts Tracker: %1 (%2)</source>
-        <translation>Parts Tracker: %1 (%2)</translation>
     </message>
     <message>
         <source>Quillmark Version: %1</source>
@@ -480,20 +463,60 @@
         <source>Copyright %1 %2</source>
         <translation>Copyright %1 %2</translation>
     </message>
+    <message>
+        <source>&amp;Help</source>
+        <translation>&amp;Hilfe</translation>
+    </message>
+    <message>
+        <source>Save &amp;As…</source>
+        <translation>Speichern &amp;unter…</translation>
+    </message>
+    <message>
+        <source>&amp;Contents</source>
+        <translation>&amp;Inhalt</translation>
+    </message>
+    <message>
+        <source>&amp;About Quillmark</source>
+        <translation>Ü&amp;ber Quillmark</translation>
+    </message>
+    <message>
+        <source> [read-only]</source>
+        <translation> [schreibgeschützt]</translation>
+    </message>
+    <message>
+        <source>Read-only (%1): Save As (%2) keeps your changes.</source>
+        <translation>Schreibgeschützt (%1): Speichern unter (%2) behält deine Änderungen.</translation>
+    </message>
+    <message>
+        <source>%1 in Option › Preferences</source>
+        <translation>%1 unter Optionen › Einstellungen</translation>
+    </message>
+    <message>
+        <source>Checks: not made (%1)</source>
+        <translation>Prüfungen: nicht gemacht (%1)</translation>
+    </message>
+    <message>
+        <source>Checks: nothing found</source>
+        <translation>Prüfungen: nichts gefunden</translation>
+    </message>
+    <message>
+        <source>1 error</source>
+        <translation>1 Fehler</translation>
+    </message>
+    <message>
+        <source>1 warning</source>
+        <translation>1 Warnung</translation>
+    </message>
+    <message>
+        <source>Checks: %1 (%2)</source>
+        <translation>Prüfungen: %1 (%2)</translation>
+    </message>
 </context>
 <context>
     <name>frmOption</name>
     <message>
         <source>Preferences</source>
         <translation>Einstellungen</translation>
-    </message>
-    <message>
-        <source>Your Real Name</source>
-        <translation>Dein Name</translation>
-    </message>
-    <message>
-        <source>Your Username</source>
-        <translation>Dein Benutzername</translation>
     </message>
     <message>
         <source>&amp;Save</source>
@@ -504,14 +527,6 @@
         <translation>&amp;Abbrechen</translation>
     </message>
     <message>
-        <source>License Type:</source>
-        <translation>Lizenz:</translation>
-    </message>
-    <message>
-        <source>Backup file</source>
-        <translation>Sicherungskopie</translation>
-    </message>
-    <message>
         <source>Your names go into the Author line of the parts you save and into new History lines.</source>
         <translation>Deine Namen kommen in die Autorzeile der Teile, die du speicherst, und in neue Historienzeilen.</translation>
     </message>
@@ -519,32 +534,32 @@
         <source>Limit Part Description to 64 characters</source>
         <translation>Teilbeschreibung auf 64 Zeichen begrenzen</translation>
     </message>
+    <message>
+        <source>Your &amp;Real Name</source>
+        <translation>Dein &amp;Name</translation>
+    </message>
+    <message>
+        <source>Your &amp;Username</source>
+        <translation>Dein &amp;Benutzername</translation>
+    </message>
+    <message>
+        <source>&amp;License Type:</source>
+        <translation>&amp;Lizenz:</translation>
+    </message>
+    <message>
+        <source>&amp;Backup file</source>
+        <translation>Sicherungs&amp;kopie</translation>
+    </message>
 </context>
 <context>
     <name>frmTracker</name>
-    <message>
-        <source>Nothing to fix: the Parts Tracker&apos;s rules find nothing.</source>
-        <translation>Nichts zu beheben: Die Regeln des Parts Trackers finden nichts.</translation>
-    </message>
     <message>
         <source>The Parts Tracker would accept this file, with the warnings below.</source>
         <translation>Der Parts Tracker würde diese Datei annehmen, mit den Warnungen unten.</translation>
     </message>
     <message>
-        <source>The Parts Tracker would refuse this file: %1 error(s) to fix.</source>
-        <translation>Der Parts Tracker würde diese Datei ablehnen: %1 Fehler zu beheben.</translation>
-    </message>
-    <message>
         <source>Check for the Parts Tracker</source>
         <translation>Für den Parts Tracker prüfen</translation>
-    </message>
-    <message>
-        <source>Copy</source>
-        <translation>Kopieren</translation>
-    </message>
-    <message>
-        <source>Close</source>
-        <translation>Schließen</translation>
     </message>
     <message>
         <source>Level</source>
@@ -579,12 +594,63 @@
         <translation>Zeile %1: </translation>
     </message>
     <message>
-        <source>Fix All</source>
-        <translation>Alle beheben</translation>
-    </message>
-    <message>
         <source>yes</source>
         <translation>ja</translation>
+    </message>
+    <message>
+        <source>This part can be saved, and the Parts Tracker&apos;s rules find nothing.</source>
+        <translation>Dieses Teil kann gespeichert werden, und die Regeln des Parts Trackers finden nichts.</translation>
+    </message>
+    <message>
+        <source>Save refuses this part: %1.</source>
+        <translation>Speichern lehnt dieses Teil ab: %1.</translation>
+    </message>
+    <message>
+        <source>1 error</source>
+        <translation>1 Fehler</translation>
+    </message>
+    <message>
+        <source>%1 errors</source>
+        <translation>%1 Fehler</translation>
+    </message>
+    <message>
+        <source>The Parts Tracker would refuse this file: %1.</source>
+        <translation>Der Parts Tracker würde diese Datei ablehnen: %1.</translation>
+    </message>
+    <message>
+        <source>The Parts Tracker&apos;s rules find nothing.</source>
+        <translation>Die Regeln des Parts Trackers finden nichts.</translation>
+    </message>
+    <message>
+        <source>Nothing to fix: no row has a repair that can be made here.</source>
+        <translation>Nichts zu beheben: Keine Zeile hat eine Reparatur, die hier möglich ist.</translation>
+    </message>
+    <message>
+        <source>&amp;Copy</source>
+        <translation>&amp;Kopieren</translation>
+    </message>
+    <message>
+        <source>C&amp;lose</source>
+        <translation>Sch&amp;ließen</translation>
+    </message>
+    <message>
+        <source>&amp;Fix</source>
+        <translation>&amp;Beheben</translation>
+    </message>
+    <message>
+        <source>Fix &amp;All</source>
+        <translation>&amp;Alle beheben</translation>
+    </message>
+</context>
+<context>
+    <name>std</name>
+    <message>
+        <source>Enter your real name: it goes into the Author line of the parts you save.</source>
+        <translation>Gib deinen Namen ein: Er kommt in die Author-Zeile der Teile, die du speicherst.</translation>
+    </message>
+    <message>
+        <source>Enter your username: it goes into the Author line and into new History lines.</source>
+        <translation>Gib deinen Benutzernamen ein: Er kommt in die Author-Zeile und in neue History-Zeilen.</translation>
     </message>
 </context>
 </TS>

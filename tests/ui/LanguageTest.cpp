@@ -42,7 +42,7 @@ TEST_F(LanguageTest, AGermanDesktopGetsTheGermanWindow)
     EXPECT_EQ(locale.language(), QLocale::German);
     ASSERT_TRUE(InstallWindowTranslation(locale, QUILLMARK_PROGRAM_FOLDER));
     startUp();
-    EXPECT_EQ(menuTitles(), QStringList({"&Datei", "&Bearbeiten", "&Optionen", "?"}));
+    EXPECT_EQ(menuTitles(), QStringList({"&Datei", "&Bearbeiten", "&Optionen", "&Hilfe"}));
     EXPECT_EQ(text("Label1"), "Teilbeschreibung:");
     EXPECT_EQ(text("Label2_3"), "Lizenz:");
     EXPECT_EQ(text("lblStatuszeile"), "Willkommen bei Quillmark.");
@@ -55,7 +55,7 @@ TEST_F(LanguageTest, QuillmarkLanguageEnForcesEnglishOnAGermanDesktop)
     EXPECT_EQ(locale.language(), QLocale::English);
     EXPECT_FALSE(InstallWindowTranslation(locale, QUILLMARK_PROGRAM_FOLDER));
     startUp();
-    EXPECT_EQ(menuTitles(), QStringList({"F&ile", "&Edit", "&Option", "?"}));
+    EXPECT_EQ(menuTitles(), QStringList({"F&ile", "&Edit", "&Option", "&Help"}));
 }
 
 // A refusal is the core's sentence and the core's "not possible" line, each translated.
