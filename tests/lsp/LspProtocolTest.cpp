@@ -105,16 +105,6 @@ std::vector<std::string> completionLabels(LspClient& client, const std::string& 
     return labels;
 }
 
-const std::string SmallPart = "0 Brick  1 x  2\r\n"
-                              "0 Name: 3004.dat\r\n"
-                              "0 Author: Ann Example [ann]\r\n"
-                              "0 !LDRAW_ORG Unofficial_Part\r\n"
-                              "0 !LICENSE Redistributable under CCAL version 2.0 : see CAreadme.txt\r\n"
-                              "\r\n"
-                              "0 BFC CERTIFY CCW\r\n"
-                              "\r\n"
-                              "1 16 0 0 0 1 0 0 0 1 0 0 0 1 stud.dat\r\n";
-
 } // namespace
 
 TEST(LspProtocol, LivesFromInitializeToExit)

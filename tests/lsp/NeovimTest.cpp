@@ -8,6 +8,7 @@
 #include <unistd.h>
 
 #include "CliRun.h"
+#include "LspClient.h"
 #include "Processes.h"
 #include "TempDir.h"
 
@@ -80,16 +81,7 @@ TEST(Neovim, ShowsTheFindingsOfCheckTracker)
     if (!haveNeovim())
         GTEST_SKIP() << "nvim is not installed (scripts/test installs Debian's neovim)";
     const TempDir folder;
-    const auto part =
-        folder.write("3004.dat", "0 Brick  1 x  2\r\n"
-                                 "0 Name: 3004.dat\r\n"
-                                 "0 Author: Ann Example [ann]\r\n"
-                                 "0 !LDRAW_ORG Unofficial_Part\r\n"
-                                 "0 !LICENSE Redistributable under CCAL version 2.0 : see CAreadme.txt\r\n"
-                                 "\r\n"
-                                 "0 BFC CERTIFY CCW\r\n"
-                                 "\r\n"
-                                 "1 16 0 0 0 1 0 0 0 1 0 0 0 1 stud.dat\r\n");
+    const auto part = folder.write("3004.dat", SmallPart);
     // What check --tracker says of the same bytes, line for line, the column of the value it names.
     const auto original = ReadBytes(part);
     std::vector<std::string> expected;
