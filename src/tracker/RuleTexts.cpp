@@ -188,8 +188,8 @@ constexpr std::array Rules{
              "Names starting with \"x\" were given to parts of unknown number and are no longer accepted.",
              "Not repaired: give the part its number.", "0 Name: x123.dat"},
     RuleText{"numbers.decimalprecision", "A number has more than 5 decimal places.",
-             "On a geometry line (or one inside \"0 !:\"), the first number with five or more decimals has no more "
-             "than five.",
+             "On a geometry line (or one inside \"0 !:\"), the first number with five or more decimals has exactly "
+             "five; the Parts Tracker looks no further along the line.",
              NumbersWhy,
              "quillmark-cli fix rounds the line's numbers to five decimals, keeping a line whose rounding would give "
              "it a geometry finding.",
